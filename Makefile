@@ -1,0 +1,39 @@
+# PYRALIS Calculs Topo: the usual commands.
+#   make demo    install what is missing, build in Release, run the main job on the bundled data
+#   make check   install what is missing, build with AddressSanitizer and UBSan, run every test
+#   make bench   build in Release and run the benchmarks
+#   make format  apply .clang-format to every source file
+
+JOBS ?= $(shell nproc)
+RELEASE_DIR := build/release
+CHECK_DIR := build/check
+DEMO_DIR := build/demo-out
+
+.PHONY: all deps release demo check bench format clean
+
+all: release
+
+deps:
+	@bash scripts/install-deps
+
+release: deps
+	cmake -S . -B $(RELEASE_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Release -DPYR_TESTS=OFF -DPYR_BENCH=ON
+	cmake --build $(RELEASE_DIR) -j $(JOBS)
+
+demo: release
+	@mkdir -p $(DEMO_DIR)
+	$(RELEASE_DIR)/apps/pyralis-geobase data/chantier-demo.geo $(DEMO_DIR)/chantier-demo-copie.geo
+
+check: deps
+	cmake -S . -B $(CHECK_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPYR_SANITIZE=ON -DPYR_WERROR=ON
+	cmake --build $(CHECK_DIR) -j $(JOBS)
+	cd $(CHECK_DIR) && ctest --output-on-failure -j $(JOBS)
+
+bench: release
+	$(RELEASE_DIR)/bench/pyr_bench --benchmark_counters_tabular=true
+
+format:
+	git ls-files '*.cpp' '*.h' | xargs clang-format -i
+
+clean:
+	rm -rf build

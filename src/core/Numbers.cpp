@@ -1,0 +1,128 @@
+#include "Numbers.h"
+
+#include "Undefined.h"
+
+#include <charconv>
+#include <climits>
+#include <cmath>
+#include <vector>
+
+namespace pyr {
+
+namespace {
+
+bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\f' || c == '\v'; }
+
+std::string_view TrimBlanks(std::string_view text) {
+    while (!text.empty() && IsBlank(text.front()))
+        text.remove_prefix(1);
+    while (!text.empty() && IsBlank(text.back()))
+        text.remove_suffix(1);
+    return text;
+}
+
+std::string ToChars(double value, std::chars_format format, int precision) {
+    // A fixed format of a huge value needs about 310 digits before the point.
+    std::vector<char> buffer(static_cast<size_t>(400 + (precision > 0 ? precision : 0)));
+    auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value, format, precision);
+    return std::string(buffer.data(), result.ptr);
+}
+
+} // namespace
+
+std::string FormatFixed(double value, int decimals) {
+    if (decimals < 0)
+        decimals = 6;
+    return ToChars(value, std::chars_format::fixed, decimals);
+}
+
+std::string FormatGeneral(double value) { return ToChars(value, std::chars_format::general, 6); }
+
+std::string FormatShortest(double value) {
+    char buffer[64];
+    auto result = std::to_chars(buffer, buffer + sizeof buffer, value);
+    return std::string(buffer, result.ptr);
+}
+
+double RoundToDecimals(double value, int decimals) {
+    if (IsUndefined(value) || !std::isfinite(value))
+        return value;
+    double rounded = value;
+    ParseDouble(FormatFixed(value, decimals), rounded);
+    return rounded;
+}
+
+bool ParseDouble(std::string_view text, double& value) {
+    text = TrimBlanks(text);
+    if (!text.empty() && text.front() == '+')
+        text.remove_prefix(1);
+    if (text.empty())
+        return false;
+    double parsed = 0;
+    auto [ptr, ec] = std::from_chars(text.data(), text.data() + text.size(), parsed);
+    if (ec != std::errc() || ptr != text.data() + text.size())
+        return false;
+    value = parsed;
+    return true;
+}
+
+bool ParseInt(std::string_view text, long long& value) {
+    text = TrimBlanks(text);
+    if (!text.empty() && text.front() == '+')
+        text.remove_prefix(1);
+    if (text.empty())
+        return false;
+    long long parsed = 0;
+    auto [ptr, ec] = std::from_chars(text.data(), text.data() + text.size(), parsed);
+    if (ec != std::errc() || ptr != text.data() + text.size())
+        return false;
+    value = parsed;
+    return true;
+}
+
+double LenientAtof(std::string_view text) {
+    while (!text.empty() && IsBlank(text.front()))
+        text.remove_prefix(1);
+    bool negative = false;
+    if (!text.empty() && (text.front() == '+' || text.front() == '-')) {
+        negative = text.front() == '-';
+        text.remove_prefix(1);
+    }
+    // from_chars would read a second sign; atof does not.
+    if (text.empty() || text.front() == '+' || text.front() == '-')
+        return 0.0;
+    double parsed = 0;
+    auto [ptr, ec] = std::from_chars(text.data(), text.data() + text.size(), parsed);
+    if (ec == std::errc::result_out_of_range)
+        parsed = HUGE_VAL; // the magnitude only matters to the clamping that follows
+    else if (ec != std::errc())
+        return 0.0;
+    return negative ? -parsed : parsed;
+}
+
+int LenientAtoi(std::string_view text) {
+    while (!text.empty() && IsBlank(text.front()))
+        text.remove_prefix(1);
+    bool negative = false;
+    if (!text.empty() && (text.front() == '+' || text.front() == '-')) {
+        negative = text.front() == '-';
+        text.remove_prefix(1);
+    }
+    long long parsed = 0;
+    for (char c : text) {
+        if (c < '0' || c > '9')
+            break;
+        parsed = parsed * 10 + (c - '0');
+        if (parsed > static_cast<long long>(INT_MAX) + 1)
+            break;
+    }
+    if (negative)
+        parsed = -parsed;
+    if (parsed > INT_MAX)
+        return INT_MAX;
+    if (parsed < INT_MIN)
+        return INT_MIN;
+    return static_cast<int>(parsed);
+}
+
+} // namespace pyr

@@ -1,0 +1,32 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+// Numbers written to and read from files, always with the decimal point '.', whatever the user's
+// locale: std::to_chars / std::from_chars never look at LC_NUMERIC.
+namespace pyr {
+
+// The value with that many decimals, as printf "%.*f" gives it in the C locale.
+std::string FormatFixed(double value, int decimals);
+
+// The value as printf "%g" gives it in the C locale (six significant digits, trailing zeros dropped).
+std::string FormatGeneral(double value);
+
+// The shortest text that reads back as exactly the same double.
+std::string FormatShortest(double value);
+
+// Rounds to n decimals the way the store does it: formatted with "%.*f", then read back.
+// The undefined value stays undefined.
+double RoundToDecimals(double value, int decimals);
+
+// Strict reading of a whole field: optional blanks around, an optional sign, the number, nothing else.
+bool ParseDouble(std::string_view text, double& value);
+bool ParseInt(std::string_view text, long long& value);
+
+// The lenient readings of the C library's atof and atoi, locale-free: leading blanks are skipped, the
+// longest prefix that is a number is read, and a text that does not start with a number reads as 0.
+double LenientAtof(std::string_view text);
+int LenientAtoi(std::string_view text);
+
+} // namespace pyr

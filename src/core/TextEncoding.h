@@ -1,0 +1,18 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+// Texts are UTF-8 in memory. Files written on Windows machines come in Windows-1252: a file that is
+// not valid UTF-8 is taken as Windows-1252 and converted, so that its accents survive.
+namespace pyr {
+
+bool IsValidUtf8(std::string_view bytes);
+
+std::string Windows1252ToUtf8(std::string_view bytes);
+
+// UTF-8 text out of a file's bytes: a leading UTF-8 byte-order mark is dropped; bytes that are not
+// valid UTF-8 are read as Windows-1252. `wasWindows1252`, when given, tells which reading was taken.
+std::string FileBytesToUtf8(std::string_view bytes, bool* wasWindows1252 = nullptr);
+
+} // namespace pyr

@@ -1,0 +1,46 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+
+// The one seam between the program and a person: message boxes, questions, file choices and the lines
+// of the text window. The console, the scripted test double and later a desktop front end implement it.
+// Printf-style texts use the C locale's decimal point: the host programs never change LC_NUMERIC.
+namespace pyr::ui {
+
+// Message box icons, with the values the messages of the program are specified with.
+enum Icon : int { kIconNone = 0, kIconError = 16, kIconQuestion = 32, kIconWarning = 48, kIconInformation = 64 };
+
+inline constexpr std::string_view kCaption = "PYRALIS";
+
+enum class Buttons { YesNo, YesNoCancel };
+enum class Answer { Yes, No, Cancel };
+
+struct FileChoice {
+    bool save = false;            // a save dialog (else open)
+    std::string title;            // "Sélectionnez le fichier carnet à traiter :"
+    std::string filter;           // "GéoBase PYRALIS (*.geo)|*.geo||"
+    std::string defaultExtension; // "geo", without the dot
+    std::string startPath;        // the file or folder offered first
+};
+
+class FrontEnd {
+public:
+    virtual ~FrontEnd() = default;
+
+    virtual void MessageBox(std::string_view text, std::string_view caption, int icon) = 0;
+    virtual Answer Ask(std::string_view text, std::string_view caption, Buttons buttons, Answer byDefault,
+                       int icon = kIconQuestion) = 0;
+    // The chosen path, or nothing when the person cancels.
+    virtual std::optional<std::string> ChooseFile(const FileChoice& choice) = 0;
+    // One line of the text window, without its end.
+    virtual void TextLine(std::string_view line) = 0;
+};
+
+// The application's own front end: what a message without a parent window goes to. The console until a
+// host installs another one; passing nullptr gives the console back.
+FrontEnd& ApplicationFrontEnd();
+void SetApplicationFrontEnd(FrontEnd* frontEnd);
+
+} // namespace pyr::ui
