@@ -1,0 +1,15 @@
+# pyr_library(<target> [DEPENDS <targets>...]): the library of one subsystem, made of every source
+# file of the current folder, with src/ on the include path of whoever links it.
+function(pyr_library target)
+    cmake_parse_arguments(ARG "" "" "DEPENDS" ${ARGN})
+    file(GLOB sources CONFIGURE_DEPENDS ${CMAKE_CURRENT_SOURCE_DIR}/*.cpp)
+    if(sources)
+        add_library(${target} STATIC ${sources})
+        target_include_directories(${target} PUBLIC ${PROJECT_SOURCE_DIR}/src)
+        target_link_libraries(${target} PUBLIC ${ARG_DEPENDS})
+    else()
+        add_library(${target} INTERFACE)
+        target_include_directories(${target} INTERFACE ${PROJECT_SOURCE_DIR}/src)
+        target_link_libraries(${target} INTERFACE ${ARG_DEPENDS})
+    endif()
+endfunction()
