@@ -22,7 +22,7 @@ release: deps
 
 demo: release
 	@mkdir -p $(DEMO_DIR)
-	$(RELEASE_DIR)/apps/pyralis-geobase data/chantier-demo.geo $(DEMO_DIR)/chantier-demo-copie.geo
+	$(RELEASE_DIR)/apps/pyralis data/chantier-demo.geo $(DEMO_DIR)/chantier-demo-copie.geo
 
 check: deps
 	cmake -S . -B $(CHECK_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPYR_SANITIZE=ON -DPYR_WERROR=ON

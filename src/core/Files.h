@@ -9,4 +9,11 @@ bool ReadWholeFile(const std::string& path, std::string& bytes);
 
 bool FileExists(const std::string& path);
 
+// A short French reason for a system error number ("fichier ou dossier inexistant").
+std::string SystemErrorText(int errnum);
+
+// The path with its extension (after the last '.' of the file name) replaced by `extension`, given
+// without its dot; added when the name has none. "C:/job/chantier.geo", "bak" gives ".../chantier.bak".
+std::string ReplaceExtension(const std::string& path, const std::string& extension);
+
 } // namespace pyr

@@ -17,8 +17,7 @@ void ForEachLine(std::string_view text, F&& f) {
         while (end < size && text[end] != '\n' && text[end] != '\r')
             ++end;
         f(text.substr(start, end - start), ++number);
-        if (end < size && text[end] == '\r' && end + 1 < size && text[end + 1] == '\n')
-            ++end;
+        if (end < size && text[end] == '\r' && end + 1 < size && text[end + 1] == '\n') ++end;
         start = end + 1;
     }
 }

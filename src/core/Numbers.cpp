@@ -11,7 +11,9 @@ namespace pyr {
 
 namespace {
 
-bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\f' || c == '\v'; }
+bool IsBlank(char c) {
+    return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\f' || c == '\v';
+}
 
 std::string_view TrimBlanks(std::string_view text) {
     while (!text.empty() && IsBlank(text.front()))
@@ -31,22 +33,28 @@ std::string ToChars(double value, std::chars_format format, int precision) {
 } // namespace
 
 std::string FormatFixed(double value, int decimals) {
-    if (decimals < 0)
-        decimals = 6;
+    if (decimals < 0) decimals = 6;
     return ToChars(value, std::chars_format::fixed, decimals);
 }
 
-std::string FormatGeneral(double value) { return ToChars(value, std::chars_format::general, 6); }
+std::string FormatGeneral(double value) {
+    return ToChars(value, std::chars_format::general, 6);
+}
 
 std::string FormatShortest(double value) {
-    char buffer[64];
-    auto result = std::to_chars(buffer, buffer + sizeof buffer, value);
-    return std::string(buffer, result.ptr);
+    std::string text;
+    AppendShortest(text, value);
+    return text;
+}
+
+void AppendShortest(std::string& out, double value) {
+    char buffer[512]; // room for the smallest subnormal written out in full
+    auto result = std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed);
+    out.append(buffer, result.ptr);
 }
 
 double RoundToDecimals(double value, int decimals) {
-    if (IsUndefined(value) || !std::isfinite(value))
-        return value;
+    if (IsUndefined(value) || !std::isfinite(value)) return value;
     double rounded = value;
     ParseDouble(FormatFixed(value, decimals), rounded);
     return rounded;
@@ -54,28 +62,22 @@ double RoundToDecimals(double value, int decimals) {
 
 bool ParseDouble(std::string_view text, double& value) {
     text = TrimBlanks(text);
-    if (!text.empty() && text.front() == '+')
-        text.remove_prefix(1);
-    if (text.empty())
-        return false;
+    if (!text.empty() && text.front() == '+') text.remove_prefix(1);
+    if (text.empty()) return false;
     double parsed = 0;
     auto [ptr, ec] = std::from_chars(text.data(), text.data() + text.size(), parsed);
-    if (ec != std::errc() || ptr != text.data() + text.size())
-        return false;
+    if (ec != std::errc() || ptr != text.data() + text.size()) return false;
     value = parsed;
     return true;
 }
 
 bool ParseInt(std::string_view text, long long& value) {
     text = TrimBlanks(text);
-    if (!text.empty() && text.front() == '+')
-        text.remove_prefix(1);
-    if (text.empty())
-        return false;
+    if (!text.empty() && text.front() == '+') text.remove_prefix(1);
+    if (text.empty()) return false;
     long long parsed = 0;
     auto [ptr, ec] = std::from_chars(text.data(), text.data() + text.size(), parsed);
-    if (ec != std::errc() || ptr != text.data() + text.size())
-        return false;
+    if (ec != std::errc() || ptr != text.data() + text.size()) return false;
     value = parsed;
     return true;
 }
@@ -89,8 +91,7 @@ double LenientAtof(std::string_view text) {
         text.remove_prefix(1);
     }
     // from_chars would read a second sign; atof does not.
-    if (text.empty() || text.front() == '+' || text.front() == '-')
-        return 0.0;
+    if (text.empty() || text.front() == '+' || text.front() == '-') return 0.0;
     double parsed = 0;
     auto [ptr, ec] = std::from_chars(text.data(), text.data() + text.size(), parsed);
     if (ec == std::errc::result_out_of_range)
@@ -110,18 +111,13 @@ int LenientAtoi(std::string_view text) {
     }
     long long parsed = 0;
     for (char c : text) {
-        if (c < '0' || c > '9')
-            break;
+        if (c < '0' || c > '9') break;
         parsed = parsed * 10 + (c - '0');
-        if (parsed > static_cast<long long>(INT_MAX) + 1)
-            break;
+        if (parsed > static_cast<long long>(INT_MAX) + 1) break;
     }
-    if (negative)
-        parsed = -parsed;
-    if (parsed > INT_MAX)
-        return INT_MAX;
-    if (parsed < INT_MIN)
-        return INT_MIN;
+    if (negative) parsed = -parsed;
+    if (parsed > INT_MAX) return INT_MAX;
+    if (parsed < INT_MIN) return INT_MIN;
     return static_cast<int>(parsed);
 }
 

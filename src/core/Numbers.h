@@ -13,8 +13,9 @@ std::string FormatFixed(double value, int decimals);
 // The value as printf "%g" gives it in the C locale (six significant digits, trailing zeros dropped).
 std::string FormatGeneral(double value);
 
-// The shortest text that reads back as exactly the same double.
+// The shortest text that reads back as exactly the same double, without an exponent ("0.0003").
 std::string FormatShortest(double value);
+void AppendShortest(std::string& out, double value);
 
 // Rounds to n decimals the way the store does it: formatted with "%.*f", then read back.
 // The undefined value stays undefined.

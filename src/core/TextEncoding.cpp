@@ -52,11 +52,9 @@ bool IsValidUtf8(std::string_view bytes) {
         } else {
             return false;
         }
-        if (end - p <= extra)
-            return false;
+        if (end - p <= extra) return false;
         for (int i = 1; i <= extra; ++i) {
-            if ((p[i] & 0xC0) != 0x80)
-                return false;
+            if ((p[i] & 0xC0) != 0x80) return false;
             cp = (cp << 6) | (p[i] & 0x3F);
         }
         // Overlong forms, surrogates and code points past U+10FFFF are not UTF-8.
@@ -84,12 +82,25 @@ std::string Windows1252ToUtf8(std::string_view bytes) {
 }
 
 std::string FileBytesToUtf8(std::string_view bytes, bool* wasWindows1252) {
-    if (bytes.substr(0, 3) == "\xEF\xBB\xBF")
-        bytes.remove_prefix(3);
+    if (bytes.substr(0, 3) == "\xEF\xBB\xBF") bytes.remove_prefix(3);
     bool ansi = !IsValidUtf8(bytes);
-    if (wasWindows1252)
-        *wasWindows1252 = ansi;
+    if (wasWindows1252) *wasWindows1252 = ansi;
     return ansi ? Windows1252ToUtf8(bytes) : std::string(bytes);
+}
+
+std::size_t Utf8Length(std::string_view text) {
+    std::size_t length = 0;
+    for (char c : text)
+        if ((static_cast<std::uint8_t>(c) & 0xC0) != 0x80) ++length;
+    return length;
+}
+
+std::string PadRight(std::string_view text, int width) {
+    std::string padded(text);
+    std::size_t length = Utf8Length(text);
+    if (width > 0 && length < static_cast<std::size_t>(width))
+        padded.append(static_cast<std::size_t>(width) - length, ' ');
+    return padded;
 }
 
 } // namespace pyr

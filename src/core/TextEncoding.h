@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
 #include <string_view>
 
@@ -14,5 +15,10 @@ std::string Windows1252ToUtf8(std::string_view bytes);
 // UTF-8 text out of a file's bytes: a leading UTF-8 byte-order mark is dropped; bytes that are not
 // valid UTF-8 are read as Windows-1252. `wasWindows1252`, when given, tells which reading was taken.
 std::string FileBytesToUtf8(std::string_view bytes, bool* wasWindows1252 = nullptr);
+
+// The number of characters of a UTF-8 text (not of its bytes).
+std::size_t Utf8Length(std::string_view text);
+// The text followed by blanks up to `width` characters, for columns of French words ("Référence").
+std::string PadRight(std::string_view text, int width);
 
 } // namespace pyr

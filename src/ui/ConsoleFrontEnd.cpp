@@ -39,8 +39,7 @@ std::string ReadLine(std::FILE* in) {
     int c;
     while ((c = std::fgetc(in)) != EOF && c != '\n')
         line += static_cast<char>(c);
-    if (c == EOF && line.empty())
-        return "\x04"; // end of input: the question takes its default
+    if (c == EOF && line.empty()) return "\x04"; // end of input: the question takes its default
     return line;
 }
 
@@ -51,20 +50,19 @@ ConsoleFrontEnd::ConsoleFrontEnd(std::FILE* in, std::FILE* out, std::FILE* err)
 
 void ConsoleFrontEnd::MessageBox(std::string_view text, std::string_view caption, int icon) {
     const char* word = IconWord(icon);
-    std::fprintf(m_err, "%.*s%s%s : %.*s\n", static_cast<int>(caption.size()), caption.data(), word ? " - " : "",
-                 word ? word : "", static_cast<int>(text.size()), text.data());
+    std::fprintf(m_err, "%.*s%s%s : %.*s\n", static_cast<int>(caption.size()), caption.data(),
+                 word ? " - " : "", word ? word : "", static_cast<int>(text.size()), text.data());
     std::fflush(m_err);
 }
 
-Answer ConsoleFrontEnd::Ask(std::string_view text, std::string_view caption, Buttons buttons, Answer byDefault,
-                            int) {
+Answer ConsoleFrontEnd::Ask(std::string_view text, std::string_view caption, Buttons buttons,
+                            Answer byDefault, int) {
     const bool cancel = buttons == Buttons::YesNoCancel;
     std::fprintf(m_err, "%.*s : %.*s\n", static_cast<int>(caption.size()), caption.data(),
                  static_cast<int>(text.size()), text.data());
     if (!m_interactive) {
         Answer answer = m_batchAnswer.value_or(byDefault);
-        if (answer == Answer::Cancel && !cancel)
-            answer = byDefault;
+        if (answer == Answer::Cancel && !cancel) answer = byDefault;
         std::fprintf(m_err, "Réponse : %s\n", AnswerWord(answer));
         std::fflush(m_err);
         return answer;
@@ -73,30 +71,24 @@ Answer ConsoleFrontEnd::Ask(std::string_view text, std::string_view caption, But
         std::fprintf(m_err, "(o)ui / (n)on%s [%s] ? ", cancel ? " / (a)nnuler" : "", AnswerWord(byDefault));
         std::fflush(m_err);
         std::string line = ReadLine(m_in);
-        if (line == "\x04" || line.empty())
-            return byDefault;
+        if (line == "\x04" || line.empty()) return byDefault;
         char c = static_cast<char>(std::tolower(static_cast<unsigned char>(line[0])));
-        if (c == 'o' || c == 'y')
-            return Answer::Yes;
-        if (c == 'n')
-            return Answer::No;
-        if (cancel && c == 'a')
-            return Answer::Cancel;
+        if (c == 'o' || c == 'y') return Answer::Yes;
+        if (c == 'n') return Answer::No;
+        if (cancel && c == 'a') return Answer::Cancel;
     }
 }
 
 std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice) {
     if (!m_interactive) {
-        if (choice.startPath.empty())
-            return std::nullopt;
+        if (choice.startPath.empty()) return std::nullopt;
         std::fprintf(m_err, "%s %s\n", choice.title.c_str(), choice.startPath.c_str());
         return choice.startPath;
     }
     std::fprintf(m_err, "%s [%s] ", choice.title.c_str(), choice.startPath.c_str());
     std::fflush(m_err);
     std::string line = ReadLine(m_in);
-    if (line == "\x04")
-        return std::nullopt;
+    if (line == "\x04") return std::nullopt;
     if (line.empty())
         return choice.startPath.empty() ? std::nullopt : std::optional<std::string>(choice.startPath);
     return line;
@@ -115,6 +107,8 @@ FrontEnd& ApplicationFrontEnd() {
     return g_applicationFrontEnd ? *g_applicationFrontEnd : console;
 }
 
-void SetApplicationFrontEnd(FrontEnd* frontEnd) { g_applicationFrontEnd = frontEnd; }
+void SetApplicationFrontEnd(FrontEnd* frontEnd) {
+    g_applicationFrontEnd = frontEnd;
+}
 
 } // namespace pyr::ui

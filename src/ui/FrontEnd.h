@@ -10,7 +10,13 @@
 namespace pyr::ui {
 
 // Message box icons, with the values the messages of the program are specified with.
-enum Icon : int { kIconNone = 0, kIconError = 16, kIconQuestion = 32, kIconWarning = 48, kIconInformation = 64 };
+enum Icon : int {
+    kIconNone = 0,
+    kIconError = 16,
+    kIconQuestion = 32,
+    kIconWarning = 48,
+    kIconInformation = 64
+};
 
 inline constexpr std::string_view kCaption = "PYRALIS";
 

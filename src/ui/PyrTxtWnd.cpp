@@ -14,8 +14,7 @@ void CPyrTxtWnd::Print(const char* format, ...) {
     int size = std::vsnprintf(nullptr, 0, format, copy);
     va_end(copy);
     std::string text(size > 0 ? static_cast<size_t>(size) : 0, '\0');
-    if (size > 0)
-        std::vsnprintf(text.data(), text.size() + 1, format, args);
+    if (size > 0) std::vsnprintf(text.data(), text.size() + 1, format, args);
     va_end(args);
     PrintText(text);
 }
@@ -25,8 +24,7 @@ void CPyrTxtWnd::PrintText(std::string_view text) {
     size_t start = 0;
     do {
         size_t end = text.find('\n', start);
-        if (end == std::string_view::npos)
-            end = text.size();
+        if (end == std::string_view::npos) end = text.size();
         m_frontEnd.TextLine(text.substr(start, end - start));
         ++m_lineCount;
         start = end + 1;

@@ -8,8 +8,7 @@ void ScriptedFrontEnd::MessageBox(std::string_view text, std::string_view captio
 
 Answer ScriptedFrontEnd::Ask(std::string_view text, std::string_view, Buttons, Answer byDefault, int) {
     questions.emplace_back(text);
-    if (answers.empty())
-        return byDefault;
+    if (answers.empty()) return byDefault;
     Answer answer = answers.front();
     answers.pop_front();
     return answer;
@@ -17,8 +16,7 @@ Answer ScriptedFrontEnd::Ask(std::string_view text, std::string_view, Buttons, A
 
 std::optional<std::string> ScriptedFrontEnd::ChooseFile(const FileChoice& choice) {
     fileChoices.push_back(choice);
-    if (files.empty())
-        return std::nullopt;
+    if (files.empty()) return std::nullopt;
     auto file = files.front();
     files.pop_front();
     return file;
@@ -27,8 +25,7 @@ std::optional<std::string> ScriptedFrontEnd::ChooseFile(const FileChoice& choice
 std::string ScriptedFrontEnd::AllLines() const {
     std::string all;
     for (const auto& line : lines) {
-        if (!all.empty())
-            all += '\n';
+        if (!all.empty()) all += '\n';
         all += line;
     }
     return all;

@@ -1,0 +1,369 @@
+#include "geobase/GeoFile.h"
+
+#include "core/Numbers.h"
+#include "geobase/Elements.h"
+#include "geobase/GeoBaseMessages.h"
+#include "geobase/Kinds.h"
+
+#include <charconv>
+#include <cmath>
+#include <cstdio>
+#include <vector>
+
+namespace pyr {
+
+namespace {
+
+constexpr char kSeparator = '\t';
+
+// Texts may hold anything: a backslash, a tabulation and the line ends are escaped.
+void AppendEscaped(std::string& out, std::string_view text) {
+    for (char c : text) {
+        switch (c) {
+        case '\\':
+            out += "\\\\";
+            break;
+        case '\t':
+            out += "\\t";
+            break;
+        case '\n':
+            out += "\\n";
+            break;
+        case '\r':
+            out += "\\r";
+            break;
+        default:
+            out += c;
+        }
+    }
+}
+
+std::string Unescaped(std::string_view field) {
+    std::string text;
+    text.reserve(field.size());
+    for (size_t i = 0; i < field.size(); ++i) {
+        char c = field[i];
+        if (c == '\\' && i + 1 < field.size()) {
+            char next = field[i + 1];
+            if (next == '\\' || next == 't' || next == 'n' || next == 'r') {
+                text += next == 't' ? '\t' : next == 'n' ? '\n' : next == 'r' ? '\r' : '\\';
+                ++i;
+                continue;
+            }
+        }
+        text += c;
+    }
+    return text;
+}
+
+// The fields of one element, in the order of the layout.
+class LineWriter {
+public:
+    explicit LineWriter(std::string& out) : m_out(out) {}
+    void Kind(int kind) {
+        char buffer[16];
+        auto result = std::to_chars(buffer, buffer + sizeof buffer, kind);
+        m_out.append(buffer, result.ptr);
+    }
+    void Text(std::string_view text) {
+        m_out += kSeparator;
+        AppendEscaped(m_out, text);
+    }
+    void Number(double value) {
+        m_out += kSeparator;
+        AppendShortest(m_out, value);
+    }
+    void Integer(long long value) {
+        m_out += kSeparator;
+        m_out += std::to_string(value);
+    }
+    // The code and the parameters close most lines; empty ones at the end are left out.
+    void CodeAndParameters(const CElement& element) {
+        if (!element.par().empty()) {
+            Text(element.sym());
+            Text(element.par());
+        } else if (!element.sym().empty()) {
+            Text(element.sym());
+        }
+    }
+
+private:
+    std::string& m_out;
+};
+
+std::string_view InvariantFlag(const CPointGen& point) {
+    if (point.invariantXY()) return point.invariantZ() ? "XYZ" : "XY";
+    return point.invariantZ() ? "Z" : "-";
+}
+
+// The fields of a line, split at the tabulations, read in order.
+class LineReader {
+public:
+    LineReader(std::string_view line, std::vector<std::string_view>& fields, std::string& error)
+        : m_fields(fields), m_error(error) {
+        m_fields.clear();
+        size_t start = 0;
+        while (true) {
+            size_t end = line.find(kSeparator, start);
+            if (end == std::string_view::npos) {
+                m_fields.push_back(line.substr(start));
+                break;
+            }
+            m_fields.push_back(line.substr(start, end - start));
+            start = end + 1;
+        }
+    }
+
+    size_t Count() const { return m_fields.size(); }
+    size_t Position() const { return m_next; }
+    bool Failed() const { return m_failed; }
+
+    // Fields that must be there.
+    bool Require(size_t count) {
+        if (m_fields.size() >= m_next + count) return true;
+        return Fail(
+            Format(msg::kMissingFields, static_cast<int>(m_fields.size()), static_cast<int>(m_next + count)));
+    }
+    std::string Text() { return m_next < m_fields.size() ? Unescaped(m_fields[m_next++]) : std::string(); }
+    std::string_view Raw() { return m_next < m_fields.size() ? m_fields[m_next++] : std::string_view(); }
+    double Number() {
+        std::string_view field = Raw();
+        double value = 0;
+        auto [ptr, ec] = std::from_chars(field.data(), field.data() + field.size(), value);
+        if (field.empty() || ec != std::errc() || ptr != field.data() + field.size() || !std::isfinite(value))
+            Fail(Format(msg::kBadNumber, std::string(field).c_str()));
+        return value;
+    }
+    long long Integer() {
+        std::string_view field = Raw();
+        long long value = 0;
+        if (!ParseInt(field, value)) Fail(Format(msg::kBadNumber, std::string(field).c_str()));
+        return value;
+    }
+    // Code and parameters, both optional.
+    void CodeAndParameters(CElement& element) {
+        element.setSym(Text());
+        element.setPar(Text());
+    }
+    bool Fail(std::string why) {
+        if (!m_failed) m_error = std::move(why);
+        m_failed = true;
+        return false;
+    }
+
+    template <class... Args>
+    static std::string Format(const char* format, Args... args) {
+        int size = std::snprintf(nullptr, 0, format, args...);
+        std::string text(static_cast<size_t>(size > 0 ? size : 0), '\0');
+        std::snprintf(text.data(), text.size() + 1, format, args...);
+        return text;
+    }
+
+private:
+    std::vector<std::string_view>& m_fields;
+    size_t m_next = 1; // the kind code is read apart
+    bool m_failed = false;
+    std::string& m_error;
+};
+
+} // namespace
+
+std::string GeoHeaderLine() {
+    std::string line(kGeoHeader);
+    line += kSeparator;
+    line += std::to_string(kGeoFormatVersion);
+    return line;
+}
+
+int GeoHeaderVersion(std::string_view line) {
+    if (line.substr(0, kGeoHeader.size()) != kGeoHeader) return 0;
+    line.remove_prefix(kGeoHeader.size());
+    while (!line.empty() && (line.front() == kSeparator || line.front() == ' '))
+        line.remove_prefix(1);
+    long long version = 0;
+    if (!ParseInt(line, version) || version < 1 || version > 1000000) return 0;
+    return static_cast<int>(version);
+}
+
+void AppendElementLine(std::string& out, const CElement& element, int kind) {
+    LineWriter w(out);
+    w.Kind(kind);
+    if (kind == kKindComment) {
+        const auto& comment = static_cast<const CComment&>(element);
+        if (!comment.text().empty()) w.Text(comment.text());
+    } else if (kind == kKindStation) {
+        const auto& station = static_cast<const CStation&>(element);
+        w.Text(station.mat());
+        w.Number(station.hi());
+        w.Number(station.v0());
+        w.CodeAndParameters(station);
+    } else if (IsSightingKind(kind)) {
+        const auto& sighting = static_cast<const CVisee&>(element);
+        w.Text(sighting.mat());
+        w.Number(sighting.hp());
+        w.Number(sighting.ah());
+        w.Number(sighting.av());
+        w.Number(sighting.di());
+        w.CodeAndParameters(sighting);
+    } else if (IsLevellingKind(kind)) {
+        const auto& reading = static_cast<const CLecture&>(element);
+        w.Text(reading.mat());
+        w.Number(reading.lm());
+        w.Number(reading.dist());
+        w.CodeAndParameters(reading);
+    } else if (kind == kKindPoint) {
+        const auto& point = static_cast<const CPointGen&>(element);
+        w.Text(point.mat());
+        w.Number(point.x());
+        w.Number(point.y());
+        w.Number(point.z());
+        w.Text(InvariantFlag(point));
+        w.CodeAndParameters(point);
+    } else if (kind == kKindChemin) {
+        const auto& traverse = static_cast<const CChemin&>(element);
+        w.Text(traverse.mat());
+        w.Integer(traverse.isClosed() ? 1 : 0);
+        w.Integer(static_cast<long long>(traverse.stations().size()));
+        for (const auto& station : traverse.stations())
+            w.Text(station);
+        w.CodeAndParameters(traverse);
+    } else if (kind == kKindAppareil) {
+        const auto& instrument = static_cast<const CAppareil&>(element);
+        w.Text(instrument.mat());
+        w.Number(instrument.collVerticale());
+        w.Number(instrument.constPrisme());
+        w.Number(instrument.sigmaAh());
+        w.Number(instrument.sigmaAv());
+        w.Number(instrument.sigmaDi());
+        w.Number(instrument.sigmaPpm());
+        w.CodeAndParameters(instrument);
+    } else {
+        // Codification commands: the word and its parameters first, then the identifier and the code.
+        const auto& command = static_cast<const CCommande&>(element);
+        w.Text(command.word());
+        if (!command.par().empty() || !command.mat().empty() || !command.sym().empty()) w.Text(command.par());
+        if (!command.mat().empty() || !command.sym().empty()) w.Text(command.mat());
+        if (!command.sym().empty()) w.Text(command.sym());
+    }
+}
+
+std::string ElementLine(const CElement& element, int kind) {
+    std::string line;
+    AppendElementLine(line, element, kind);
+    return line;
+}
+
+std::unique_ptr<CElement> ParseElementLine(std::string_view line, int& kind, std::string& error,
+                                           bool lenient) {
+    static std::vector<std::string_view> fields; // reused from line to line: one allocation per load
+    LineReader r(line, fields, error);
+    std::string_view kindField = line.substr(0, line.find(kSeparator));
+    long long code = 0;
+    if (kindField.empty()) {
+        r.Fail(msg::kNoKind);
+        return nullptr;
+    }
+    if (!ParseInt(kindField, code) || !IsKnownKind(static_cast<int>(code))) {
+        r.Fail(LineReader::Format(msg::kUnknownKind, std::string(kindField).c_str()));
+        return nullptr;
+    }
+    kind = static_cast<int>(code);
+
+    std::unique_ptr<CElement> element;
+    if (kind == kKindComment) {
+        // The whole rest of the line is the comment, tabulations included.
+        size_t tab = line.find(kSeparator);
+        return std::make_unique<CComment>(tab == std::string_view::npos ? std::string()
+                                                                        : Unescaped(line.substr(tab + 1)));
+    } else if (kind == kKindStation) {
+        if (!r.Require(3)) return nullptr;
+        auto station = std::make_unique<CStation>(r.Text());
+        station->setHI(r.Number());
+        station->setV0(r.Number());
+        r.CodeAndParameters(*station);
+        element = std::move(station);
+    } else if (IsSightingKind(kind)) {
+        if (!r.Require(5)) return nullptr;
+        std::string mat = r.Text();
+        double hp = r.Number();
+        double ah = r.Number();
+        double av = r.Number();
+        double di = r.Number();
+        std::unique_ptr<CVisee> sighting;
+        if (kind == kKindReference)
+            sighting = std::make_unique<CReference>(std::move(mat), hp, ah, av, di);
+        else
+            sighting = std::make_unique<CMesure>(std::move(mat), hp, ah, av, di);
+        r.CodeAndParameters(*sighting);
+        element = std::move(sighting);
+    } else if (IsLevellingKind(kind)) {
+        if (!r.Require(3)) return nullptr;
+        std::string mat = r.Text();
+        double lm = r.Number();
+        double dist = r.Number();
+        std::unique_ptr<CLecture> reading;
+        if (kind == kKindLectAR)
+            reading = std::make_unique<CLectAR>(std::move(mat), lm, dist);
+        else
+            reading = std::make_unique<CLectAV>(std::move(mat), lm, dist);
+        r.CodeAndParameters(*reading);
+        element = std::move(reading);
+    } else if (kind == kKindPoint) {
+        if (!r.Require(5)) return nullptr;
+        std::string mat = r.Text();
+        double x = r.Number();
+        double y = r.Number();
+        double z = r.Number();
+        auto point = std::make_unique<CPointGen>(std::move(mat), x, y, z);
+        std::string_view flag = r.Raw();
+        if (flag == "XY" || flag == "XYZ") point->setInvariantXY(true);
+        if (flag == "Z" || flag == "XYZ") point->setInvariantZ(true);
+        if (flag != "-" && flag != "XY" && flag != "Z" && flag != "XYZ")
+            r.Fail(LineReader::Format(msg::kBadFlag, std::string(flag).c_str()));
+        r.CodeAndParameters(*point);
+        element = std::move(point);
+    } else if (kind == kKindChemin) {
+        if (!r.Require(3)) return nullptr;
+        auto traverse = std::make_unique<CChemin>(r.Text());
+        long long closed = r.Integer();
+        if (closed != 0 && closed != 1)
+            r.Fail(LineReader::Format(msg::kBadFlag, std::to_string(closed).c_str()));
+        traverse->setClosed(closed == 1);
+        long long count = r.Integer();
+        if (r.Failed() || count < 0 || !r.Require(static_cast<size_t>(count))) {
+            if (!r.Failed()) r.Fail(LineReader::Format(msg::kBadNumber, std::to_string(count).c_str()));
+            return nullptr;
+        }
+        for (long long i = 0; i < count; ++i)
+            traverse->add(r.Text());
+        r.CodeAndParameters(*traverse);
+        element = std::move(traverse);
+    } else if (kind == kKindAppareil) {
+        if (!r.Require(7)) return nullptr;
+        auto instrument = std::make_unique<CAppareil>(r.Text());
+        instrument->setCollVerticale(r.Number());
+        instrument->setConstPrisme(r.Number());
+        instrument->setSigmaAh(r.Number());
+        instrument->setSigmaAv(r.Number());
+        instrument->setSigmaDi(r.Number());
+        instrument->setSigmaPpm(r.Number());
+        r.CodeAndParameters(*instrument);
+        element = std::move(instrument);
+    } else {
+        if (!r.Require(1)) return nullptr;
+        auto command = std::make_unique<CCommande>(r.Text());
+        command->setPar(r.Text());
+        command->setMat(r.Text());
+        command->setSym(r.Text());
+        element = std::move(command);
+    }
+    if (r.Failed()) return nullptr;
+    if (!lenient && r.Position() < r.Count()) {
+        r.Fail(LineReader::Format(msg::kExtraFields, static_cast<int>(r.Count()),
+                                  static_cast<int>(r.Position())));
+        return nullptr;
+    }
+    return element;
+}
+
+} // namespace pyr
