@@ -131,8 +131,8 @@ private:
 
 class CReference : public CVisee {
 public:
-    explicit CReference(std::string mat = {}, double hp = 0.0, double ah = 0.0, double av = 0.0,
-                        double di = 0.0, std::string sym = {})
+    CReference() : CReference(std::string(), 0.0, 0.0, 0.0, 0.0) {}
+    CReference(std::string mat, double hp, double ah, double av, double di, std::string sym = {})
         : CVisee(std::move(mat), hp, ah, av, di, std::move(sym)) {}
     CReference(std::string mat, double ah) : CReference(std::move(mat), 0.0, ah, 0.0, 0.0) {}
     explicit CReference(const CVisee& other) : CVisee(other) {}
@@ -141,8 +141,8 @@ public:
 
 class CMesure : public CVisee {
 public:
-    explicit CMesure(std::string mat = {}, double hp = 0.0, double ah = 0.0, double av = 0.0, double di = 0.0,
-                     std::string sym = {})
+    CMesure() : CMesure(std::string(), 0.0, 0.0, 0.0, 0.0) {}
+    CMesure(std::string mat, double hp, double ah, double av, double di, std::string sym = {})
         : CVisee(std::move(mat), hp, ah, av, di, std::move(sym)) {}
     CMesure(std::string mat, double ah) : CMesure(std::move(mat), 0.0, ah, 0.0, 0.0) {}
     explicit CMesure(const CVisee& other) : CVisee(other) {}

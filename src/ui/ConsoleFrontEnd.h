@@ -19,7 +19,7 @@ public:
 
     void MessageBox(std::string_view text, std::string_view caption, int icon) override;
     Answer Ask(std::string_view text, std::string_view caption, Buttons buttons, Answer byDefault,
-               int icon) override;
+               int icon = kIconQuestion) override;
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override;
 

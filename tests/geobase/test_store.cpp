@@ -1,0 +1,291 @@
+// The store's arrays, accessors and look-ups, on small GéoBases built in each test.
+#include "geobase/Carnet.h"
+
+#include <cmath>
+#include <gtest/gtest.h>
+#include <memory>
+
+using namespace pyr;
+
+namespace {
+
+// Two set-ups of S1 around one of S2, with the points they sight.
+CCarnet SmallJob() {
+    CCarnet c;
+    c.Add(std::make_unique<CAppareil>("TCR 705", 0.0012, -0.0175), kKindAppareil); // 0
+    c.Add(std::make_unique<CPointGen>("S1", 1000.0, 2000.0, 100.0), kKindPoint);   // 1
+    c.Add(std::make_unique<CPointGen>("A1", 0.0, 0.0, "BORNE"), kKindPoint);       // 2: X = Y = 0 is a place
+    c.Add(std::make_unique<CStation>("S1", 1.55), kKindStation);                   // 3
+    c.Add(std::make_unique<CReference>("A1", 1.3, 12.5, 100.2, 250.0), kKindReference); // 4
+    c.Add(std::make_unique<CMesure>("P7", 1.3, 212.5, 99.8, 35.0), kKindMesure);        // 5
+    c.Add(std::make_unique<CStation>("S2", 1.60, 0.0), kKindStation);                   // 6: V0 = 0 is known
+    c.Add(std::make_unique<CMesure>("P7", 1.3, 5.0, 100.0, 40.0), kKindMesure);         // 7
+    c.Add(std::make_unique<CAppareil>("TS 15"), kKindAppareil);                         // 8
+    c.Add(std::make_unique<CStation>("S1", 1.48), kKindStation);                        // 9
+    c.Add(std::make_unique<CMesure>("P7", kUndefined, 300.0, kUndefined, kUndefined), kKindMesure); // 10
+    c.Add(std::make_unique<CPointGen>("P7", 57.25), kKindPoint); // 11: altitude only
+    return c;
+}
+
+void ExpectInStep(const CCarnet& c) {
+    for (int i = 0; i < c.GetSize(); ++i) {
+        ASSERT_NE(c.GetAt(i), nullptr);
+        EXPECT_TRUE(ElementFitsKind(*c.GetAt(i), c.GetType(i))) << "index " << i;
+    }
+    EXPECT_EQ(c.GetAt(c.GetSize()), nullptr);
+    EXPECT_EQ(c.GetType(c.GetSize()), 0);
+}
+
+} // namespace
+
+TEST(Store, TheKindArrayStaysInStepWithTheElements) {
+    CCarnet c = SmallJob();
+    ASSERT_EQ(c.GetSize(), 12);
+    ExpectInStep(c);
+
+    // An element that cannot stand under a kind is refused, and nothing is appended.
+    EXPECT_EQ(c.Add(std::make_unique<CPointGen>("X", 1.0, 2.0), kKindMesure), -1);
+    EXPECT_EQ(c.Add(std::make_unique<CMesure>("X", 1.0), kKindReference), -1);
+    EXPECT_EQ(c.Add(std::make_unique<CCommande>("Sym_2Pts"), 1999), -1);
+    EXPECT_EQ(c.Add(nullptr, kKindComment), -1);
+    EXPECT_EQ(c.GetSize(), 12);
+
+    EXPECT_EQ(c.Add(std::make_unique<CCommande>("ExcentRad", "0.15"), kKindExcentrement), 12);
+    EXPECT_EQ(c.InsertAt(0, std::make_unique<CComment>("en-tête"), kKindComment), 0);
+    EXPECT_EQ(c.GetType(1), kKindAppareil);
+    c.removeElement(0);
+    EXPECT_EQ(c.GetType(0), kKindAppareil);
+    c.RemoveRange(3, 6); // S1(1) with its two sightings
+    EXPECT_EQ(c.GetSize(), 10);
+    EXPECT_EQ(c.matAt(3), "S2");
+    ExpectInStep(c);
+
+    // A sighting changes kind by changing class; commands change kind in place.
+    ASSERT_TRUE(c.SetKindAt(4, kKindReference));
+    EXPECT_NE(c.As<CReference>(4), nullptr);
+    EXPECT_EQ(c.ahAt(4), 5.0);
+    EXPECT_FALSE(c.SetKindAt(4, kKindPoint));
+    EXPECT_TRUE(c.SetKindAt(9, 1025));
+    EXPECT_EQ(c.GetType(9), 1025);
+    ExpectInStep(c);
+
+    CCarnet other;
+    other.Add(std::make_unique<CComment>("a"), kKindComment);
+    other.Add(std::make_unique<CPointGen>("Z9", 1.0), kKindPoint);
+    c.Append(std::move(other));
+    EXPECT_EQ(other.GetSize(), 0);
+    EXPECT_EQ(c.GetSize(), 12);
+    EXPECT_EQ(c.findMat("Z9"), 11);
+    ExpectInStep(c);
+}
+
+TEST(Store, TheUndefinedValueIsMissingEverywhereAndZeroIsAValue) {
+    CCarnet c = SmallJob();
+    double x = -1, y = -1, z = -1;
+    EXPECT_TRUE(c.hasXY("A1", x, y));
+    EXPECT_EQ(x, 0.0);
+    EXPECT_EQ(y, 0.0);
+    EXPECT_FALSE(c.hasZ("A1"));
+    EXPECT_EQ(c.zAt(2), kUndefined);
+    EXPECT_TRUE(c.hasZ("P7", z));
+    EXPECT_EQ(z, 57.25);
+    EXPECT_FALSE(c.hasXY("P7"));
+    EXPECT_EQ(c.zFor("P7"), 57.25);
+    EXPECT_EQ(c.zFor(5), 57.25); // the point a sighting names
+    EXPECT_EQ(c.zFor("A1"), kUndefined);
+
+    EXPECT_EQ(c.v0At(6), 0.0);
+    EXPECT_EQ(c.v0At(3), kUndefined); // a new station is not oriented
+    EXPECT_EQ(c.hiAt(3), 1.55);
+    EXPECT_EQ(c.hpAt(10), kUndefined);
+    EXPECT_EQ(c.avAt(10), kUndefined);
+    EXPECT_EQ(c.dhAt(10), kUndefined); // no zenith angle, no horizontal distance
+    EXPECT_NEAR(c.dhAt(7), 40.0, 1e-12);
+    EXPECT_NEAR(c.dhAt(4), 250.0 * std::sin(100.2 * 3.14159265358979323846 / 200.0), 1e-9);
+
+    // What an element does not have reads as missing, whatever the accessor.
+    EXPECT_EQ(c.xAt(3), kUndefined);
+    EXPECT_EQ(c.hiAt(4), kUndefined);
+    EXPECT_EQ(c.ahAt(1), kUndefined);
+    EXPECT_EQ(c.lmAt(1), kUndefined);
+    EXPECT_EQ(c.cmdAt(1), "");
+    EXPECT_EQ(c.xAt(-1), kUndefined);
+    EXPECT_EQ(c.matAt(99), "");
+    EXPECT_EQ(c.symAt(2), "BORNE");
+
+    // New elements: a sighting holds 0.0 in its four values, a levelling reading has no distance.
+    CMesure fresh;
+    EXPECT_EQ(fresh.hp(), 0.0);
+    EXPECT_EQ(fresh.av(), 0.0);
+    CLectAR reading("R1", 1.4215);
+    EXPECT_EQ(reading.dist(), kUndefined);
+    CMesure direction("P9", 123.4567);
+    EXPECT_EQ(direction.ah(), 123.4567);
+}
+
+TEST(Store, ReprisesAreFoundByTheirNumber) {
+    CCarnet c = SmallJob();
+    EXPECT_EQ(c.findStaRep("S1", 1), 3);
+    EXPECT_EQ(c.findStaRep("S1", 2), 9);
+    EXPECT_EQ(c.findStaRep("S1", 3), -1);
+    EXPECT_EQ(c.findStaRep("S2", 1), 6);
+    EXPECT_EQ(c.findStaRep("S1", 0), -1);
+    EXPECT_EQ(c.RepriseAt(9), 2);
+    EXPECT_EQ(c.StationDesignation(9), "S1(2)");
+    EXPECT_EQ(c.CountStations(), 3);
+
+    std::string name;
+    int reprise = 0;
+    EXPECT_TRUE(CCarnet::extrStaRep("S1(2)", name, reprise));
+    EXPECT_EQ(name, "S1");
+    EXPECT_EQ(reprise, 2);
+    EXPECT_TRUE(CCarnet::extrStaRep(" 1005 (3) ", name, reprise));
+    EXPECT_EQ(name, "1005");
+    EXPECT_EQ(reprise, 3);
+    EXPECT_TRUE(CCarnet::extrStaRep("S7", name, reprise));
+    EXPECT_EQ(reprise, 1);
+    EXPECT_FALSE(CCarnet::extrStaRep("S1(x)", name, reprise));
+    EXPECT_FALSE(CCarnet::extrStaRep("S1(0)", name, reprise));
+    EXPECT_FALSE(CCarnet::extrStaRep("(2)", name, reprise));
+
+    // Each sighting belongs to the station before it.
+    EXPECT_EQ(c.findRepAt(5, name), 3);
+    EXPECT_EQ(name, "S1");
+    EXPECT_EQ(c.findRepAt(7, name), 6);
+    EXPECT_EQ(c.findRepAt(11, name), 9);
+    EXPECT_EQ(c.findRepAt(2, name), -1);
+
+    CChemin traverse("POLY");
+    EXPECT_TRUE(traverse.add(9, c));
+    EXPECT_FALSE(traverse.add(10, c));
+    EXPECT_EQ(traverse.stations(), std::vector<std::string>{"S1(2)"});
+}
+
+TEST(Store, FindSearchesBothWaysAndAnEmptyNameMatchesTheWholeKind) {
+    CCarnet c = SmallJob();
+    EXPECT_EQ(c.Find(kKindMesure, "P7"), 5);
+    EXPECT_EQ(c.Find(kKindMesure, "P7", 6), 7);
+    EXPECT_EQ(c.Find(kKindMesure, "P7", 11, -1), 10);
+    EXPECT_EQ(c.Find(kKindMesure, "P7", 4, -1), -1);
+    EXPECT_EQ(c.Find(kKindMesure, "P7", 100, -1), 10);
+    EXPECT_EQ(c.Find(kKindStation, ""), 3);
+    EXPECT_EQ(c.Find(kKindStation, "", 4), 6);
+    EXPECT_EQ(c.Find(kKindStation, "", 8, -1), 6);
+    EXPECT_EQ(c.Find(kKindStation, "", 10), -1);
+    EXPECT_EQ(c.Find(kKindStation, "NONE"), -1);
+    EXPECT_EQ(c.findMat("P7"), 11);
+    EXPECT_EQ(c.findMat("S2"), -1); // a station is not a known point
+    EXPECT_EQ(c.lastInd("S1"), 1);
+    EXPECT_TRUE(c.hasPnt("S1"));
+    EXPECT_TRUE(c.hasPnt(11));
+    EXPECT_FALSE(c.hasPnt(10));
+}
+
+TEST(Store, TheIndexFollowsAppendsRemovalsAndRenaming) {
+    CCarnet c = SmallJob();
+    EXPECT_EQ(c.findMat("P7"), 11); // builds the index
+    c.Add(std::make_unique<CPointGen>("P8", 1.0, 2.0, 3.0), kKindPoint);
+    EXPECT_EQ(c.findMat("P8"), 12);
+    c.removeElement(0);
+    EXPECT_EQ(c.findMat("P8"), 11);
+    EXPECT_EQ(c.findStaRep("S1", 2), 8);
+
+    // Renamed through a pointer, without the store knowing.
+    c.GetAt(11)->setMat("P8bis");
+    EXPECT_EQ(c.findMat("P8"), -1);
+    EXPECT_EQ(c.findMat("P8bis"), 11);
+    // Renaming an element that is not in the store leaves the index alone.
+    CPointGen loose("L1", 1.0);
+    loose.setMat("L2");
+    EXPECT_EQ(c.findMat("P8bis"), 11);
+
+    // A deep copy has its own index.
+    CCarnet copy = c;
+    copy.removeElement(0);
+    EXPECT_EQ(copy.findMat("P8bis"), 10);
+    EXPECT_EQ(c.findMat("P8bis"), 11);
+    copy.GetAt(0)->setMat("changed");
+    EXPECT_EQ(c.matAt(1), "A1");
+    EXPECT_EQ(c.matAt(0), "S1");
+}
+
+TEST(Store, InstrumentsAndEccentricOffsetsApplyToWhatFollowsThem) {
+    CCarnet c;
+    c.Add(std::make_unique<CAppareil>("TCR", 0.002, -0.03), kKindAppareil);         // 0
+    c.Add(std::make_unique<CCommande>("ExcentVer", "0.12"), kKindExcentrement);     // 1
+    c.Add(std::make_unique<CStation>("S1", 1.5), kKindStation);                     // 2
+    c.Add(std::make_unique<CCommande>("excentrad", " -0.25 m"), kKindExcentrement); // 3
+    c.Add(std::make_unique<CCommande>("ExcentTan", "0.05"), kKindExcentrement);     // 4
+    c.Add(std::make_unique<CCommande>("Sym_2Pts", "1 2"), 1025);                    // 5
+    c.Add(std::make_unique<CMesure>("P1", 1.3, 10.0, 100.0, 20.0), kKindMesure);    // 6
+    c.Add(std::make_unique<CMesure>("P2", 1.3, 20.0, 100.0, 30.0), kKindMesure);    // 7
+    c.Add(std::make_unique<CAppareil>("TS", 0.0, 0.0), kKindAppareil);              // 8
+    c.Add(std::make_unique<CMesure>("P3", 1.3, 30.0, 100.0, 40.0), kKindMesure);    // 9
+
+    EXPECT_EQ(c.findER(6, 1), -0.25); // letter case of the word does not matter
+    EXPECT_EQ(c.findET(6, 1), 0.05);
+    EXPECT_EQ(c.findEV(6, 1), 0.0);   // the station's own offset stops at the station
+    EXPECT_EQ(c.findER(7, 1), 0.0);   // only the sighting right after the offsets
+    EXPECT_EQ(c.findEV(2, -1), 0.12); // the station itself
+    EXPECT_EQ(c.findER(6, 4), 0.0);   // not below the limit
+    EXPECT_EQ(c.findET(6, 3), 0.05);
+
+    EXPECT_EQ(c.findAppAt(6)->mat(), "TCR");
+    EXPECT_EQ(c.findAppAt(9)->mat(), "TS");
+    EXPECT_EQ(c.findAppAt(0)->collVerticale(), 0.002);
+    CCarnet bare;
+    bare.Add(std::make_unique<CStation>("S"), kKindStation);
+    EXPECT_EQ(bare.findAppAt(0), nullptr);
+
+    EXPECT_TRUE(c.isObsAltiAt(6, 2));
+    c.As<CMesure>(7)->setHP(kUndefined);
+    EXPECT_FALSE(c.isObsAltiAt(7, 2));
+    EXPECT_FALSE(c.isObsAltiAt(6, 0));
+    EXPECT_EQ(c.cmdAt(5), "Sym_2Pts");
+    EXPECT_EQ(c.parAt(5), "1 2");
+}
+
+TEST(Store, ComputedPointsAreRoundedToTheDecimalsSettings) {
+    SetStoreDecimals(3, 2, 4);
+    CPointGen p("P1", 1.0, 2.0, 3.0);
+    EXPECT_TRUE(p.setPt(651325.41249, 6862371.90551, 53.8749));
+    EXPECT_EQ(p.x(), 651325.412);
+    EXPECT_EQ(p.y(), 6862371.906);
+    EXPECT_EQ(p.z(), 53.87);
+    EXPECT_FALSE(p.invariantXY());
+    EXPECT_TRUE(p.setPt(12.3456, true));
+    EXPECT_EQ(p.z(), 12.35);
+    EXPECT_TRUE(p.invariantZ());
+    EXPECT_FALSE(p.invariantXY());
+    EXPECT_FALSE(p.setPt(std::nan(""), 1.0));
+    EXPECT_EQ(p.x(), 651325.412);
+    EXPECT_EQ(CCarnet::formatXY(1.23456), 1.235);
+    EXPECT_EQ(CCarnet::formatZ(1.23456), 1.23);
+    EXPECT_EQ(CCarnet::formatAng(123.456789), 123.4568);
+    EXPECT_EQ(CStation::DeciAng(), 4);
+    EXPECT_EQ(CMesure::DeciXY(), 3); // sightings share their settings
+    EXPECT_EQ(CLectAV::DeciZ(), 2);
+    EXPECT_EQ(CAppareil::DeciAng(), 4);
+    SetStoreDecimals(4, 3, 5);
+
+    CPointGen half("H", kUndefined, 5.0, kUndefined);
+    EXPECT_FALSE(half.hasXY());
+    EXPECT_FALSE(half.isOk());
+    CPointGen plani("P", 1.0, 2.0);
+    EXPECT_TRUE(plani.is2D());
+    EXPECT_FALSE(plani.is3D());
+}
+
+TEST(Store, CopiesOfElementsBelongToTheCaller) {
+    CCarnet c = SmallJob();
+    auto copy = c.copyElement(5);
+    ASSERT_NE(copy, nullptr);
+    copy->setMat("Q1");
+    EXPECT_EQ(c.matAt(5), "P7");
+    auto asReference = c.copyElement(5, kKindReference);
+    ASSERT_NE(dynamic_cast<CReference*>(asReference.get()), nullptr);
+    EXPECT_EQ(static_cast<CReference*>(asReference.get())->ah(), 212.5);
+    EXPECT_EQ(c.copyElement(5, kKindPoint), nullptr);
+    EXPECT_EQ(c.copyElement(-1), nullptr);
+    EXPECT_EQ(c.Add(std::move(asReference), kKindReference), 12);
+}
