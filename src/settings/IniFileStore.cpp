@@ -1,5 +1,6 @@
 #include "IniFileStore.h"
 
+#include "SettingsText.h"
 #include "core/Files.h"
 #include "core/Lines.h"
 #include "core/TextEncoding.h"
@@ -199,7 +200,19 @@ void IniFile::Set(std::string_view section, std::string_view key, std::string_vi
     auto utf8 = [](std::string_view text) {
         return IsValidUtf8(text) ? std::string(text) : Windows1252ToUtf8(text);
     };
-    impl_->ini.SetValue(utf8(section).c_str(), utf8(key).c_str(), utf8(value).c_str(), nullptr,
+    const std::string sectionText = utf8(section);
+    std::string keyText = utf8(key);
+    // A key already there keeps its spelling; the library would give it the caller's.
+    CSimpleIniA::TNamesDepend keys;
+    if (impl_->ini.GetAllKeys(sectionText.c_str(), keys)) {
+        for (const auto& entry : keys) {
+            if (EqualIgnoringCase(entry.pItem, keyText)) {
+                keyText = entry.pItem;
+                break;
+            }
+        }
+    }
+    impl_->ini.SetValue(sectionText.c_str(), keyText.c_str(), utf8(value).c_str(), nullptr,
                         /*forceReplace*/ true);
 }
 
@@ -251,7 +264,10 @@ int ReplaceFileContents(const std::string& path, std::string_view bytes) {
     const std::filesystem::path targetPath(target);
     std::filesystem::path folder = targetPath.parent_path();
     if (folder.empty()) folder = ".";
-    std::string temporary = (folder / ("." + targetPath.filename().string() + ".XXXXXX")).string();
+    std::string temporaryName = ".";
+    temporaryName += targetPath.filename().string();
+    temporaryName += ".XXXXXX";
+    std::string temporary = (folder / temporaryName).string();
     const int fd = mkstemp(temporary.data());
     if (fd < 0) return errno;
 
