@@ -92,14 +92,6 @@ TEST_F(ParamFileReport, NullAndEmptyNames) {
                        }));
 }
 
-TEST_F(ParamFileReport, ForgettingTheLastFileReportsItAgain) {
-    const std::string path = folder / "absent/Pyralis.ini";
-    WriteParamInt(path, "A", "x", 1);
-    ResetParamErrorMemory();
-    WriteParamInt(path, "A", "x", 1);
-    EXPECT_EQ(frontEnd.messages.size(), 2u);
-}
-
 TEST_F(ParamFileReport, UnreadableFileIsNeverWrittenOver) {
     if (geteuid() == 0) GTEST_SKIP() << "root reads every file";
     const std::string path = folder / "Illisible.ini";
@@ -108,13 +100,6 @@ TEST_F(ParamFileReport, UnreadableFileIsNeverWrittenOver) {
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 1));
     ASSERT_EQ(chmod(path.c_str(), 0600), 0);
     EXPECT_EQ(test::ReadBytes(path), "[A]\nprecieux=1\n");
-    EXPECT_EQ(frontEnd.messages.size(), 1u);
-}
-
-TEST_F(ParamFileReport, KeylessWriteIsRefused) {
-    const std::string path = folder / "Pyralis.ini";
-    EXPECT_FALSE(WriteParamInt(path, "A", "", 1));
-    EXPECT_FALSE(std::filesystem::exists(path));
     EXPECT_EQ(frontEnd.messages.size(), 1u);
 }
 

@@ -1,6 +1,7 @@
 #include "settings/ParamStore.h"
 
 #include "SettingsTestSupport.h"
+#include "settings/RegistryStore.h"
 
 #include <clocale>
 #include <cstdio>
@@ -195,17 +196,6 @@ TEST_F(ParamStore, FormatDecimalsGivesWhatPrintfGivesInTheCLocale) {
     }
 }
 
-TEST_F(ParamStore, RegistryPathIsTheWholeTextNamingARoot) {
-    EXPECT_TRUE(IsRegistryParamPath("HKEY_CURRENT_USER"));
-    EXPECT_TRUE(IsRegistryParamPath("hkey_current_user"));
-    EXPECT_TRUE(IsRegistryParamPath("Hkey_Dyn_Data"));
-    EXPECT_FALSE(IsRegistryParamPath("HKEY_CURRENT_USER\\Software\\Pyralis"));
-    EXPECT_FALSE(IsRegistryParamPath("HKEY_CURRENT_USER "));
-    EXPECT_FALSE(IsRegistryParamPath(""));
-    EXPECT_FALSE(IsRegistryParamPath(kNullParamPath));
-    EXPECT_FALSE(IsRegistryParamPath(path));
-}
-
 TEST_F(ParamStore, RootFollowedByMoreTextIsWrittenAsAFile) {
     const auto previous = std::filesystem::current_path();
     std::filesystem::current_path(folder.Path());
@@ -217,62 +207,43 @@ TEST_F(ParamStore, RootFollowedByMoreTextIsWrittenAsAFile) {
     EXPECT_FALSE(std::filesystem::exists(folder / "registre"));
 }
 
-TEST_F(ParamStore, ParameterFileObjectReadsAndWritesItsPath) {
+TEST_F(ParamStore, ParameterFileObjectWorksOnItsPath) {
     const CParamFile params(path);
-    EXPECT_EQ(params.Path(), path);
-    EXPECT_FALSE(params.IsRegistry());
-    EXPECT_TRUE(params.WriteBool("Dlg", "Auto", 1));
-    EXPECT_TRUE(params.WriteInt("Dlg", "Nombre", 12));
     EXPECT_TRUE(params.WriteDouble("Dlg", "Tolerance", 0.015));
-    EXPECT_TRUE(params.WriteString("Dlg", "Nom", "Station 1"));
-    int flag = 0, number = 0;
+    EXPECT_TRUE(params.WriteBool("Dlg", "Auto", 1));
     double tolerance = 0;
-    std::string name, kept = "inchangé";
-    params.ReadInt("Dlg", "Auto", 0, 0, 1, flag);
-    params.ReadInt("Dlg", "Nombre", 0, 0, 100, number);
+    int flag = 0;
+    std::string kept = "inchangé";
     params.ReadDouble("Dlg", "Tolerance", 0, 0, 1, tolerance);
-    params.ReadString("Dlg", "Nom", "", name);
+    params.ReadInt("Dlg", "Auto", 0, 0, 1, flag);
     params.ReadString("Dlg", "Absent", kept);
-    EXPECT_EQ(flag, 1);
-    EXPECT_EQ(number, 12);
     EXPECT_EQ(tolerance, 0.015);
-    EXPECT_EQ(name, "Station 1");
+    EXPECT_EQ(flag, 1);
     EXPECT_EQ(kept, "inchangé");
-
     EXPECT_TRUE(CParamFile("hkey_current_user").IsRegistry());
+
     const CParamFile none;
     EXPECT_EQ(none.Path().data(), nullptr);
-    std::string text;
-    EXPECT_TRUE(none.ReadString("Dlg", "Nom", "défaut", text));
-    EXPECT_EQ(text, "défaut");
+    EXPECT_FALSE(none.WriteInt("Dlg", "Nombre", 1));
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(frontEnd.messages[0].text, "Pointeur nul pour le fichier de paramètres !\n(Code d'erreur 22)");
 }
 
-TEST_F(ParamStore, DefaultParameterFileFollowsTheEnvironment) {
-    {
-        ScopedEnv params("PYRALIS_PARAMS", "/srv/pyralis/Cabinet.ini");
-        EXPECT_EQ(DefaultParamFilePath(), "/srv/pyralis/Cabinet.ini");
-    }
+TEST_F(ParamStore, ConfigurationPathsFollowTheEnvironment) {
+    EXPECT_EQ(DefaultParamFilePath(), folder / "Pyralis.ini");
+    EXPECT_EQ(RegistryHiveFolder(), folder / "registre");
     ScopedEnv params("PYRALIS_PARAMS", std::nullopt);
+    ScopedEnv hive("PYRALIS_REGISTRE", std::nullopt);
     {
         ScopedEnv config("XDG_CONFIG_HOME", "/home/geometre/.cfg");
         EXPECT_EQ(DefaultParamFilePath(), "/home/geometre/.cfg/pyralis/Pyralis.ini");
+        EXPECT_EQ(RegistryHiveFolder(), "/home/geometre/.cfg/pyralis/registre");
     }
-    ScopedEnv config("XDG_CONFIG_HOME", std::nullopt);
+    // A relative XDG_CONFIG_HOME is not valid and is passed over.
+    ScopedEnv config("XDG_CONFIG_HOME", "relatif");
     ScopedEnv home("HOME", "/home/geometre");
     EXPECT_EQ(DefaultParamFilePath(), "/home/geometre/.config/pyralis/Pyralis.ini");
-}
-
-TEST_F(ParamStore, MessagesGoToTheParentElseToTheApplication) {
-    ui::ScriptedFrontEnd parent;
-    ShowParamMessage(&parent, "texte");
-    ShowParamMessage(nullptr, "autre", ui::kIconError);
-    ASSERT_EQ(parent.messages.size(), 1u);
-    EXPECT_EQ(parent.messages[0].text, "texte");
-    EXPECT_EQ(parent.messages[0].caption, "PYRALIS");
-    EXPECT_EQ(parent.messages[0].icon, ui::kIconWarning);
-    ASSERT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(frontEnd.messages[0].text, "autre");
-    EXPECT_EQ(frontEnd.messages[0].icon, ui::kIconError);
+    EXPECT_EQ(RegistryHiveFolder(), "/home/geometre/.config/pyralis/registre");
 }
 
 } // namespace
