@@ -16,8 +16,9 @@ namespace pyr {
 
 namespace {
 
-// The last parameter file written or reported, one for the process. A null path is remembered as such,
-// distinct from the empty name the memory starts with.
+// The last parameter file written or reported, one for the process; every command runs in the host's one
+// thread, so it needs no lock. A null path is remembered as such, distinct from the empty name the memory
+// starts with.
 struct RememberedFile {
     bool null = false;
     std::string name;

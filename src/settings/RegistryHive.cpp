@@ -1,21 +1,14 @@
 // The registry form on platforms without a system registry: one initialisation file per root.
 #ifndef _WIN32
 
-#include "ConfigPaths.h"
 #include "IniFileStore.h"
 #include "RegistryPlatform.h"
 
 #include <cerrno>
-#include <cstdlib>
 #include <filesystem>
 #include <system_error>
 
 namespace pyr {
-
-std::string RegistryHiveFolder() {
-    if (const char* folder = std::getenv("PYRALIS_REGISTRE"); folder && *folder) return folder;
-    return (std::filesystem::path(PyralisConfigFolder()) / "registre").string();
-}
 
 namespace registry_detail {
 

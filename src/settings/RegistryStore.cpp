@@ -1,11 +1,14 @@
 #include "RegistryStore.h"
 
+#include "ConfigPaths.h"
 #include "ParamStore.h"
 #include "RegistryPlatform.h"
 #include "SettingsMessages.h"
 #include "SettingsText.h"
 
 #include <array>
+#include <cstdlib>
+#include <filesystem>
 
 namespace pyr {
 
@@ -53,6 +56,11 @@ std::optional<RegistryRoot> RegistryRootFromName(std::string_view name) {
         if (EqualIgnoringCase(name, entry.name)) return entry.root;
     }
     return std::nullopt;
+}
+
+std::string RegistryHiveFolder() {
+    if (const char* folder = std::getenv("PYRALIS_REGISTRE"); folder && *folder) return folder;
+    return (std::filesystem::path(PyralisConfigFolder()) / "registre").string();
 }
 
 std::string_view RegistryRootName(RegistryRoot root) {

@@ -33,7 +33,7 @@ std::string_view RegistryRootName(RegistryRoot root);
 // values are cut to 8191 bytes.
 inline constexpr std::size_t kRegistryValueBuffer = 8192;
 
-// The folder of the hive files (other platforms than Windows): $PYRALIS_REGISTRE when set, else
+// The folder of the hive files, where there is no system registry: $PYRALIS_REGISTRE when set, else
 // $XDG_CONFIG_HOME/pyralis/registre, else ~/.config/pyralis/registre.
 std::string RegistryHiveFolder();
 
