@@ -1,0 +1,38 @@
+#pragma once
+
+// Every text the parameter store shows to a person, as printf formats. The texts are the program's own
+// and are kept word for word, the slip in "imposssible" included: users and their support know them.
+#include <string>
+
+namespace pyr {
+
+// One of the texts below with its values filled in, as printf fills them.
+#if defined(__GNUC__)
+__attribute__((format(printf, 1, 2)))
+#endif
+std::string
+FormatSettingsMessage(const char* format, ...);
+
+// Registry form: %s is the key path, the code is the system's.
+inline constexpr char kMsgRegistryBadRoot[] = "Code incorrect pour la clef d'accès aux registres !";
+inline constexpr char kMsgRegistryNoKeyName[] = "Le nom de la clef de registre à ouvrir doit être indiqué !";
+inline constexpr char kMsgRegistryOpenFailed[] =
+    "%s : \naccès à la clef dans la base de registre impossible (code %d) !";
+// The first %s is the parameter key, the second the key path.
+inline constexpr char kMsgRegistryReadFailed[] =
+    "Impossible de lire le paramètre '%s' dans la clef\n%s !\n(Code d'erreur %d)";
+inline constexpr char kMsgRegistryCreateFailed[] =
+    "%s : \nimpossible de créer la clef dans la base de registres !\n(Code d'erreur %d) !";
+inline constexpr char kMsgRegistryWriteFailed[] =
+    "Impossible d'enregistrer le paramètre '%s' dans la clef\n%s !\n(Code d'erreur %d)";
+
+// File form: %s is the file name, the code is errno.
+inline constexpr char kMsgParamFileNullName[] =
+    "Pointeur nul pour le fichier de paramètres !\n(Code d'erreur %d)";
+inline constexpr char kMsgParamFileNoName[] =
+    "Pas de nom pour le fichier de paramètres !\n(Code d'erreur %d)";
+inline constexpr char kMsgParamFileSaveFailed[] =
+    "%s :\nSauvegarde des paramètres imposssible !\n(Code d'erreur %d)";
+inline constexpr char kMsgParamFileMissing[] = "%s :\nFichier de paramètres inexistant !\n(Code d'erreur %d)";
+
+} // namespace pyr
