@@ -1,5 +1,5 @@
 // GéoBase files: what is saved loads back the same, and nothing that was read is ever lost.
-#include "TempDir.h"
+#include "TestSupport.h"
 #include "geobase/Carnet.h"
 #include "geobase/GeoFile.h"
 #include "ui/PyrTxtWnd.h"

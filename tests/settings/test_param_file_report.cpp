@@ -67,14 +67,14 @@ TEST_F(ParamFileReport, FileJustWrittenIsNotReportedWhenItFailsLater) {
 TEST_F(ParamFileReport, ExistingFileThatCannotBeWrittenIsNamedWithTheSystemCode) {
     if (geteuid() == 0) GTEST_SKIP() << "root writes read-only files";
     const std::string path = folder / "LectureSeule.ini";
-    test::WriteBytes(path, "[A]\nx=0\n");
+    WriteBytes(path, "[A]\nx=0\n");
     ASSERT_EQ(chmod(path.c_str(), 0444), 0);
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 1));
     EXPECT_FALSE(WriteParamInt(path, "A", "y", 1));
     EXPECT_EQ(Texts(), (std::vector<std::string>{
                            FormatSettingsMessage(kMsgParamFileSaveFailed, path.c_str(), EACCES),
                        }));
-    EXPECT_EQ(test::ReadBytes(path), "[A]\nx=0\n");
+    EXPECT_EQ(ReadBytes(path), "[A]\nx=0\n");
 }
 
 TEST_F(ParamFileReport, NullAndEmptyNames) {
@@ -95,11 +95,11 @@ TEST_F(ParamFileReport, NullAndEmptyNames) {
 TEST_F(ParamFileReport, UnreadableFileIsNeverWrittenOver) {
     if (geteuid() == 0) GTEST_SKIP() << "root reads every file";
     const std::string path = folder / "Illisible.ini";
-    test::WriteBytes(path, "[A]\nprecieux=1\n");
+    WriteBytes(path, "[A]\nprecieux=1\n");
     ASSERT_EQ(chmod(path.c_str(), 0200), 0);
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 1));
     ASSERT_EQ(chmod(path.c_str(), 0600), 0);
-    EXPECT_EQ(test::ReadBytes(path), "[A]\nprecieux=1\n");
+    EXPECT_EQ(ReadBytes(path), "[A]\nprecieux=1\n");
     EXPECT_EQ(frontEnd.messages.size(), 1u);
 }
 

@@ -1,6 +1,5 @@
-#include "settings/ParamStore.h"
-
 #include "SettingsTestSupport.h"
+#include "settings/ParamStore.h"
 #include "settings/RegistryStore.h"
 
 #include <clocale>
@@ -10,10 +9,6 @@
 
 namespace pyr {
 namespace {
-
-using test::ReadBytes;
-using test::ScopedEnv;
-using test::WriteBytes;
 
 class ParamStore : public test::SettingsTest {
 protected:
@@ -198,7 +193,7 @@ TEST_F(ParamStore, FormatDecimalsGivesWhatPrintfGivesInTheCLocale) {
 
 TEST_F(ParamStore, RootFollowedByMoreTextIsWrittenAsAFile) {
     const auto previous = std::filesystem::current_path();
-    std::filesystem::current_path(folder.Path());
+    std::filesystem::current_path(folder.Root());
     const bool written = WriteParamInt("HKEY_CURRENT_USER\\Software", "Options", "Cle", 5);
     std::filesystem::current_path(previous);
 

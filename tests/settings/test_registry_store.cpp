@@ -1,17 +1,12 @@
-#include "settings/RegistryStore.h"
-
 #include "SettingsTestSupport.h"
 #include "settings/ParamStore.h"
+#include "settings/RegistryStore.h"
 #include "settings/SettingsMessages.h"
 
 #include <gtest/gtest.h>
 
 namespace pyr {
 namespace {
-
-using test::ReadBytes;
-using test::ScopedEnv;
-using test::WriteBytes;
 
 constexpr std::string_view kOptions = "Software\\Pyralis\\Calculs Topo\\Options_Corrections";
 
