@@ -1,5 +1,6 @@
 #include "Numbers.h"
 
+#include "Strings.h"
 #include "Undefined.h"
 
 #include <charconv>
@@ -13,14 +14,6 @@ namespace {
 
 bool IsBlank(char c) {
     return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\f' || c == '\v';
-}
-
-std::string_view TrimBlanks(std::string_view text) {
-    while (!text.empty() && IsBlank(text.front()))
-        text.remove_prefix(1);
-    while (!text.empty() && IsBlank(text.back()))
-        text.remove_suffix(1);
-    return text;
 }
 
 std::string ToChars(double value, std::chars_format format, int precision) {
@@ -61,7 +54,7 @@ double RoundToDecimals(double value, int decimals) {
 }
 
 bool ParseDouble(std::string_view text, double& value) {
-    text = TrimBlanks(text);
+    text = Trimmed(text);
     if (!text.empty() && text.front() == '+') text.remove_prefix(1);
     if (text.empty()) return false;
     double parsed = 0;
@@ -72,7 +65,7 @@ bool ParseDouble(std::string_view text, double& value) {
 }
 
 bool ParseInt(std::string_view text, long long& value) {
-    text = TrimBlanks(text);
+    text = Trimmed(text);
     if (!text.empty() && text.front() == '+') text.remove_prefix(1);
     if (text.empty()) return false;
     long long parsed = 0;

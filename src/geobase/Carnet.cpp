@@ -1,6 +1,7 @@
 #include "geobase/Carnet.h"
 
 #include "core/Numbers.h"
+#include "core/Strings.h"
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/Matricule.h"
 #include "geobase/Selection.h"
@@ -12,25 +13,6 @@
 #include <cmath>
 
 namespace pyr {
-
-namespace {
-
-std::string_view Trimmed(std::string_view text) {
-    while (!text.empty() && std::isspace(static_cast<unsigned char>(text.front())))
-        text.remove_prefix(1);
-    while (!text.empty() && std::isspace(static_cast<unsigned char>(text.back())))
-        text.remove_suffix(1);
-    return text;
-}
-
-bool SameWordNoCase(std::string_view a, std::string_view b) {
-    return a.size() == b.size() && std::equal(a.begin(), a.end(), b.begin(), [](char x, char y) {
-               return std::tolower(static_cast<unsigned char>(x)) ==
-                      std::tolower(static_cast<unsigned char>(y));
-           });
-}
-
-} // namespace
 
 // ---------------------------------------------------------------- construction
 
@@ -433,7 +415,7 @@ double CCarnet::FindEccentric(std::string_view word, int index, int limit) const
         if (IsObservationOrPointKind(kind)) break;
         if (kind == kKindExcentrement) {
             const auto* command = static_cast<const CCommande*>(GetAt(i));
-            if (SameWordNoCase(command->word(), word)) return command->value();
+            if (EqualIgnoringCase(command->word(), word)) return command->value();
         }
     }
     return 0.0;

@@ -2,6 +2,7 @@
 // file beside it, flushed to the disk, then renamed over the old one. The loader never drops a line.
 #include "core/Files.h"
 #include "core/Lines.h"
+#include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "geobase/Carnet.h"
 #include "geobase/GeoBaseMessages.h"
@@ -19,14 +20,6 @@
 namespace pyr {
 
 namespace {
-
-template <class... Args>
-std::string Formatted(const char* format, Args... args) {
-    int size = std::snprintf(nullptr, 0, format, args...);
-    std::string text(static_cast<size_t>(size > 0 ? size : 0), '\0');
-    std::snprintf(text.data(), text.size() + 1, format, args...);
-    return text;
-}
 
 void Tell(ui::FrontEnd* parent, const std::string& text, int icon) {
     (parent ? *parent : ui::ApplicationFrontEnd()).MessageBox(text, ui::kCaption, icon);
@@ -49,7 +42,7 @@ int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& c
     std::string bytes;
     if (!ReadWholeFile(path, bytes)) {
         std::string why = SystemErrorText(errno);
-        Tell(parent, Formatted(msg::kCannotOpen, path.c_str(), why.c_str()), ui::kIconWarning);
+        Tell(parent, Sprintf(msg::kCannotOpen, path.c_str(), why.c_str()), ui::kIconWarning);
         return 0;
     }
     std::string_view text(bytes);
@@ -124,11 +117,11 @@ int CCarnet::Save(const std::string& path, ui::FrontEnd* parent, bool report) {
         if (!ok) std::remove(temporary.c_str());
     }
     if (!ok) {
-        Tell(parent, Formatted(msg::kSaveFailed, path.c_str()), ui::kIconWarning);
+        Tell(parent, Sprintf(msg::kSaveFailed, path.c_str()), ui::kIconWarning);
         return 0;
     }
     m_path = path;
-    if (report) Tell(parent, Formatted(msg::kSaved, path.c_str()), ui::kIconInformation);
+    if (report) Tell(parent, Sprintf(msg::kSaved, path.c_str()), ui::kIconInformation);
     return 1;
 }
 
@@ -138,7 +131,7 @@ int CCarnet::BackUp() {
     std::filesystem::copy_file(m_path, ReplaceExtension(m_path, "bak"),
                                std::filesystem::copy_options::overwrite_existing, error);
     if (error) {
-        Tell(nullptr, Formatted(msg::kBackUpFailed, m_path.c_str()), ui::kIconWarning);
+        Tell(nullptr, Sprintf(msg::kBackUpFailed, m_path.c_str()), ui::kIconWarning);
         return 0;
     }
     return 1;

@@ -2,6 +2,7 @@
 // and turning elements into comments and back.
 #include "core/Angles.h"
 #include "core/Numbers.h"
+#include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "geobase/Carnet.h"
 #include "geobase/GeoBaseMessages.h"
@@ -23,14 +24,6 @@ std::string Shown(double value) {
 
 bool Finite(double value) {
     return std::isfinite(value);
-}
-
-std::string_view Trimmed(std::string_view text) {
-    while (!text.empty() && std::isspace(static_cast<unsigned char>(text.front())))
-        text.remove_prefix(1);
-    while (!text.empty() && std::isspace(static_cast<unsigned char>(text.back())))
-        text.remove_suffix(1);
-    return text;
 }
 
 // The normalised identifier of an element, written back into it.

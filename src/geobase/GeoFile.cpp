@@ -1,6 +1,7 @@
 #include "geobase/GeoFile.h"
 
 #include "core/Numbers.h"
+#include "core/Strings.h"
 #include "geobase/Elements.h"
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/Kinds.h"
@@ -121,8 +122,8 @@ public:
     // Fields that must be there.
     bool Require(size_t count) {
         if (m_fields.size() >= m_next + count) return true;
-        return Fail(
-            Format(msg::kMissingFields, static_cast<int>(m_fields.size()), static_cast<int>(m_next + count)));
+        return Fail(Sprintf(msg::kMissingFields, static_cast<int>(m_fields.size()),
+                            static_cast<int>(m_next + count)));
     }
     std::string Text() { return m_next < m_fields.size() ? Unescaped(m_fields[m_next++]) : std::string(); }
     std::string_view Raw() { return m_next < m_fields.size() ? m_fields[m_next++] : std::string_view(); }
@@ -131,13 +132,13 @@ public:
         double value = 0;
         auto [ptr, ec] = std::from_chars(field.data(), field.data() + field.size(), value);
         if (field.empty() || ec != std::errc() || ptr != field.data() + field.size() || !std::isfinite(value))
-            Fail(Format(msg::kBadNumber, std::string(field).c_str()));
+            Fail(Sprintf(msg::kBadNumber, std::string(field).c_str()));
         return value;
     }
     long long Integer() {
         std::string_view field = Raw();
         long long value = 0;
-        if (!ParseInt(field, value)) Fail(Format(msg::kBadNumber, std::string(field).c_str()));
+        if (!ParseInt(field, value)) Fail(Sprintf(msg::kBadNumber, std::string(field).c_str()));
         return value;
     }
     // Code and parameters, both optional.
@@ -149,14 +150,6 @@ public:
         if (!m_failed) m_error = std::move(why);
         m_failed = true;
         return false;
-    }
-
-    template <class... Args>
-    static std::string Format(const char* format, Args... args) {
-        int size = std::snprintf(nullptr, 0, format, args...);
-        std::string text(static_cast<size_t>(size > 0 ? size : 0), '\0');
-        std::snprintf(text.data(), text.size() + 1, format, args...);
-        return text;
     }
 
 private:
@@ -264,7 +257,7 @@ std::unique_ptr<CElement> ParseElementLine(std::string_view line, int& kind, std
         return nullptr;
     }
     if (!ParseInt(kindField, code) || !IsKnownKind(static_cast<int>(code))) {
-        r.Fail(LineReader::Format(msg::kUnknownKind, std::string(kindField).c_str()));
+        r.Fail(Sprintf(msg::kUnknownKind, std::string(kindField).c_str()));
         return nullptr;
     }
     kind = static_cast<int>(code);
@@ -319,19 +312,18 @@ std::unique_ptr<CElement> ParseElementLine(std::string_view line, int& kind, std
         if (flag == "XY" || flag == "XYZ") point->setInvariantXY(true);
         if (flag == "Z" || flag == "XYZ") point->setInvariantZ(true);
         if (flag != "-" && flag != "XY" && flag != "Z" && flag != "XYZ")
-            r.Fail(LineReader::Format(msg::kBadFlag, std::string(flag).c_str()));
+            r.Fail(Sprintf(msg::kBadFlag, std::string(flag).c_str()));
         r.CodeAndParameters(*point);
         element = std::move(point);
     } else if (kind == kKindChemin) {
         if (!r.Require(3)) return nullptr;
         auto traverse = std::make_unique<CChemin>(r.Text());
         long long closed = r.Integer();
-        if (closed != 0 && closed != 1)
-            r.Fail(LineReader::Format(msg::kBadFlag, std::to_string(closed).c_str()));
+        if (closed != 0 && closed != 1) r.Fail(Sprintf(msg::kBadFlag, std::to_string(closed).c_str()));
         traverse->setClosed(closed == 1);
         long long count = r.Integer();
         if (r.Failed() || count < 0 || !r.Require(static_cast<size_t>(count))) {
-            if (!r.Failed()) r.Fail(LineReader::Format(msg::kBadNumber, std::to_string(count).c_str()));
+            if (!r.Failed()) r.Fail(Sprintf(msg::kBadNumber, std::to_string(count).c_str()));
             return nullptr;
         }
         for (long long i = 0; i < count; ++i)
@@ -359,8 +351,7 @@ std::unique_ptr<CElement> ParseElementLine(std::string_view line, int& kind, std
     }
     if (r.Failed()) return nullptr;
     if (!lenient && r.Position() < r.Count()) {
-        r.Fail(LineReader::Format(msg::kExtraFields, static_cast<int>(r.Count()),
-                                  static_cast<int>(r.Position())));
+        r.Fail(Sprintf(msg::kExtraFields, static_cast<int>(r.Count()), static_cast<int>(r.Position())));
         return nullptr;
     }
     return element;

@@ -1,7 +1,8 @@
 #include "geobase/Kinds.h"
 
+#include "core/Strings.h"
+
 #include <array>
-#include <cctype>
 
 namespace pyr {
 
@@ -78,15 +79,6 @@ constexpr std::array<CommandEntry, 3> kEccentricCommands{{
     {kExcentVer, "Excentrement vertical"},
 }};
 
-// Letter case is ignored for the ASCII letters; accented letters are compared as they are.
-bool SameWord(std::string_view a, std::string_view b) {
-    if (a.size() != b.size()) return false;
-    for (size_t i = 0; i < a.size(); ++i)
-        if (std::tolower(static_cast<unsigned char>(a[i])) != std::tolower(static_cast<unsigned char>(b[i])))
-            return false;
-    return true;
-}
-
 } // namespace
 
 std::string_view CommandWord(int kind) {
@@ -98,19 +90,20 @@ std::string_view CommandWord(int kind) {
 }
 
 std::string_view CommandDescription(std::string_view word) {
-    if (SameWord(word, kGenericCommand.word)) return kGenericCommand.description;
+    if (EqualIgnoringCase(word, kGenericCommand.word)) return kGenericCommand.description;
     for (const auto& entry : kEccentricCommands)
-        if (SameWord(word, entry.word)) return entry.description;
+        if (EqualIgnoringCase(word, entry.word)) return entry.description;
     for (const auto& entry : kInterpretedCommands)
-        if (SameWord(word, entry.word)) return entry.description;
+        if (EqualIgnoringCase(word, entry.word)) return entry.description;
     return {};
 }
 
 int CommandKind(std::string_view word) {
     for (const auto& entry : kEccentricCommands)
-        if (SameWord(word, entry.word)) return kKindExcentrement;
+        if (EqualIgnoringCase(word, entry.word)) return kKindExcentrement;
     for (size_t i = 0; i < kInterpretedCommands.size(); ++i)
-        if (SameWord(word, kInterpretedCommands[i].word)) return kKindExcentrement + 1 + static_cast<int>(i);
+        if (EqualIgnoringCase(word, kInterpretedCommands[i].word))
+            return kKindExcentrement + 1 + static_cast<int>(i);
     return kKindCommand;
 }
 

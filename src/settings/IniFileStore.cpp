@@ -3,6 +3,7 @@
 #include "SettingsText.h"
 #include "core/Files.h"
 #include "core/Lines.h"
+#include "core/Strings.h"
 #include "core/TextEncoding.h"
 
 #include <cerrno>

@@ -6,6 +6,7 @@
 #include "SettingsMessages.h"
 #include "SettingsText.h"
 #include "core/Numbers.h"
+#include "core/Strings.h"
 
 #include <cerrno>
 #include <cstdlib>
@@ -100,13 +101,12 @@ int WriteFileValue(std::string_view path, std::string_view section, std::string_
 void ReportFileFailure(std::string_view path, int code) {
     std::string text;
     if (path.data() == nullptr) {
-        text = FormatSettingsMessage(kMsgParamFileNullName, code);
+        text = Sprintf(kMsgParamFileNullName, code);
     } else if (path.empty()) {
-        text = FormatSettingsMessage(kMsgParamFileNoName, code);
+        text = Sprintf(kMsgParamFileNoName, code);
     } else {
         const std::string name(path);
-        text = FormatSettingsMessage(PathExists(name) ? kMsgParamFileSaveFailed : kMsgParamFileMissing,
-                                     name.c_str(), code);
+        text = Sprintf(PathExists(name) ? kMsgParamFileSaveFailed : kMsgParamFileMissing, name.c_str(), code);
     }
     ShowParamMessage(nullptr, text, ui::kIconWarning);
 }

@@ -5,6 +5,7 @@
 #include "RegistryPlatform.h"
 #include "SettingsMessages.h"
 #include "SettingsText.h"
+#include "core/Strings.h"
 
 #include <array>
 #include <cstdlib>
@@ -82,11 +83,10 @@ bool ReadRegistryValue(std::string_view rootName, std::string_view keyPath, std:
     case registry_detail::Step::Done:
         break;
     case registry_detail::Step::Open:
-        Report(report, parent, FormatSettingsMessage(kMsgRegistryOpenFailed, key.c_str(), outcome.code));
+        Report(report, parent, Sprintf(kMsgRegistryOpenFailed, key.c_str(), outcome.code));
         return false;
     default:
-        Report(report, parent,
-               FormatSettingsMessage(kMsgRegistryReadFailed, valueName.c_str(), key.c_str(), outcome.code));
+        Report(report, parent, Sprintf(kMsgRegistryReadFailed, valueName.c_str(), key.c_str(), outcome.code));
         return false;
     }
     CutToValueBuffer(text, kRegistryValueBuffer);
@@ -107,11 +107,11 @@ bool WriteRegistryValue(std::string_view rootName, std::string_view keyPath, std
         return true;
     case registry_detail::Step::Create:
     case registry_detail::Step::Open:
-        Report(report, parent, FormatSettingsMessage(kMsgRegistryCreateFailed, key.c_str(), outcome.code));
+        Report(report, parent, Sprintf(kMsgRegistryCreateFailed, key.c_str(), outcome.code));
         return false;
     default:
         Report(report, parent,
-               FormatSettingsMessage(kMsgRegistryWriteFailed, valueName.c_str(), key.c_str(), outcome.code));
+               Sprintf(kMsgRegistryWriteFailed, valueName.c_str(), key.c_str(), outcome.code));
         return false;
     }
 }

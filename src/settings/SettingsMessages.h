@@ -6,13 +6,6 @@
 
 namespace pyr {
 
-// One of the texts below with its values filled in, as printf fills them.
-#if defined(__GNUC__)
-__attribute__((format(printf, 1, 2)))
-#endif
-std::string
-FormatSettingsMessage(const char* format, ...);
-
 // Registry form: %s is the key path, the code is the system's.
 inline constexpr char kMsgRegistryBadRoot[] = "Code incorrect pour la clef d'accès aux registres !";
 inline constexpr char kMsgRegistryNoKeyName[] = "Le nom de la clef de registre à ouvrir doit être indiqué !";

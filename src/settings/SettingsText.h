@@ -16,15 +16,4 @@ inline void CutToValueBuffer(std::string& text, std::size_t bufferSize) {
     text.resize(cut);
 }
 
-// Names of files, registry roots and keys compared as the system compares them: ASCII letters without
-// regard to case, every other byte as it is.
-inline bool EqualIgnoringCase(std::string_view a, std::string_view b) {
-    if (a.size() != b.size()) return false;
-    auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; };
-    for (std::size_t i = 0; i < a.size(); ++i) {
-        if (lower(a[i]) != lower(b[i])) return false;
-    }
-    return true;
-}
-
 } // namespace pyr

@@ -1,5 +1,7 @@
 #include "ui/PyrTxtWnd.h"
 
+#include "core/Strings.h"
+
 #include <cstdarg>
 #include <cstdio>
 #include <string>
@@ -9,12 +11,7 @@ namespace pyr {
 void CPyrTxtWnd::Print(const char* format, ...) {
     va_list args;
     va_start(args, format);
-    va_list copy;
-    va_copy(copy, args);
-    int size = std::vsnprintf(nullptr, 0, format, copy);
-    va_end(copy);
-    std::string text(size > 0 ? static_cast<size_t>(size) : 0, '\0');
-    if (size > 0) std::vsnprintf(text.data(), text.size() + 1, format, args);
+    std::string text = VSprintf(format, args);
     va_end(args);
     PrintText(text);
 }

@@ -1,4 +1,5 @@
 #include "SettingsTestSupport.h"
+#include "core/Strings.h"
 #include "settings/ParamStore.h"
 #include "settings/SettingsMessages.h"
 
@@ -72,7 +73,7 @@ TEST_F(ParamFileReport, ExistingFileThatCannotBeWrittenIsNamedWithTheSystemCode)
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 1));
     EXPECT_FALSE(WriteParamInt(path, "A", "y", 1));
     EXPECT_EQ(Texts(), (std::vector<std::string>{
-                           FormatSettingsMessage(kMsgParamFileSaveFailed, path.c_str(), EACCES),
+                           Sprintf(kMsgParamFileSaveFailed, path.c_str(), EACCES),
                        }));
     EXPECT_EQ(ReadBytes(path), "[A]\nx=0\n");
 }

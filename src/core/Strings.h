@@ -1,0 +1,20 @@
+#pragma once
+
+#include <cstdarg>
+#include <string>
+#include <string_view>
+
+namespace pyr {
+
+// printf into a string, for the program's messages (their formats are given as they stand).
+std::string Sprintf(const char* format, ...) __attribute__((format(printf, 1, 2)));
+std::string VSprintf(const char* format, std::va_list args) __attribute__((format(printf, 1, 0)));
+
+// Without the blanks (spaces, tabulations, line ends) at both ends.
+std::string_view Trimmed(std::string_view text);
+
+// Names compared as Windows compares file names, keys and command words: ASCII letters without regard
+// to case, every other byte as it is.
+bool EqualIgnoringCase(std::string_view a, std::string_view b);
+
+} // namespace pyr
