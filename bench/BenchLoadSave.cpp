@@ -3,9 +3,12 @@
 #include "MemoryUse.h"
 
 #include <benchmark/benchmark.h>
+#include <cstdint>
 #include <filesystem>
 #include <malloc.h>
 #include <optional>
+#include <stdexcept>
+#include <string>
 
 namespace pyr::bench {
 
@@ -35,8 +38,10 @@ void CountPerIteration(benchmark::State& state, std::int64_t bytes) {
     state.SetBytesProcessed(state.iterations() * bytes);
 }
 
-// The heap and the resident memory that a fresh store takes once the million-element file is read,
-// without its look-up index and with it, in bytes per element.
+// The memory that a fresh store takes once the million-element file is read, in bytes per element:
+// tas_o_elem as the allocator counts it (the heap), rss_o_elem as the system does (resident pages);
+// the *_index counters once the first look-up has built the index. Its time is that of a first
+// reading in a process, into memory that the system has still to provide.
 void BM_Memory_1M(benchmark::State& state) {
     MillionJob& job = Million();
     for (auto _ : state) {
