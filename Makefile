@@ -2,14 +2,18 @@
 #   make demo    install what is missing, build in Release, run the main job on the bundled data
 #   make check   install what is missing, build with AddressSanitizer and UBSan, run every test
 #   make bench   build in Release and run the benchmarks
+#   make fuzz    build the fuzz targets with clang and run each for FUZZ_SECONDS (60) seconds
 #   make format  apply .clang-format to every source file
 
 JOBS ?= $(shell nproc)
 RELEASE_DIR := build/release
 CHECK_DIR := build/check
+FUZZ_DIR := build/fuzz
+FUZZ_SECONDS ?= 60
+FUZZ_TARGETS := fuzz_geo_load
 DEMO_DIR := build/demo-out
 
-.PHONY: all deps release demo check bench format clean
+.PHONY: all deps release demo check bench fuzz format clean
 
 all: release
 
@@ -31,6 +35,13 @@ check: deps
 
 bench: release
 	$(RELEASE_DIR)/bench/pyr_bench --benchmark_counters_tabular=true
+
+fuzz: deps
+	@command -v clang++ >/dev/null || { echo "make fuzz : clang++ est introuvable (paquets clang et libclang-rt-dev)."; exit 1; }
+	cmake -S . -B $(FUZZ_DIR) -G Ninja -DCMAKE_CXX_COMPILER=clang++ -DCMAKE_BUILD_TYPE=RelWithDebInfo \
+		-DPYR_TESTS=OFF -DPYR_FUZZ=ON
+	cmake --build $(FUZZ_DIR) -j $(JOBS) --target $(FUZZ_TARGETS)
+	bash fuzz/run $(FUZZ_DIR) $(FUZZ_SECONDS) $(FUZZ_TARGETS)
 
 format:
 	git ls-files '*.cpp' '*.h' | xargs clang-format -i

@@ -85,7 +85,8 @@ int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& c
 bool CCarnet::Write(std::FILE* file, bool withHeader) const {
     if (!file) return false;
     std::string buffer;
-    buffer.reserve(kWriteChunk + 4096);
+    // About 64 bytes a line: a small store does not need a whole chunk.
+    buffer.reserve(std::min(kWriteChunk, 64 * m_elements.size()) + 4096);
     if (withHeader) {
         buffer += GeoHeaderLine();
         buffer += '\n';

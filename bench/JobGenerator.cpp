@@ -1,0 +1,169 @@
+#include "JobGenerator.h"
+
+#include "geobase/Elements.h"
+#include "geobase/Kinds.h"
+
+#include <cmath>
+#include <memory>
+#include <unordered_map>
+
+namespace pyr::bench {
+
+namespace {
+
+constexpr int kReferencesPerStation = 6;
+constexpr int kMeasuresPerStation = 8;
+// About 26 elements for each set-up once the control points, instruments and comments are counted.
+constexpr int kElementsPerStation = 26;
+
+const char* const kCodes[] = {"BORNE", "ANGLE BAT", "POTEAU", "ARBRE", "REGARD", "", "", ""};
+
+} // namespace
+
+double JobGenerator::Uniform(double low, double high) {
+    // A 64-bit linear congruential step: the same job on every machine and every run.
+    m_state = m_state * 6364136223846793005ULL + 1442695040888963407ULL;
+    double unit = static_cast<double>(m_state >> 11) / static_cast<double>(1ULL << 53);
+    return low + (high - low) * unit;
+}
+
+double JobGenerator::Rounded(double value, int decimals) {
+    // Dividing by a power of ten gives the double nearest to the decimal value, as a reader would.
+    const double scale = std::pow(10.0, decimals);
+    return std::round(value * scale) / scale;
+}
+
+std::string JobGenerator::Named(std::string_view prefix, long long number) {
+    std::string name(prefix);
+    name += std::to_string(number);
+    return name;
+}
+
+void JobGenerator::AddControlPoints(CCarnet& carnet, int count) {
+    for (int i = 0; i < count; ++i) {
+        auto point = std::make_unique<CPointGen>(
+            ControlName(++m_controlCount), Rounded(m_east + Uniform(-2000, 2000), 3),
+            Rounded(m_north + Uniform(-2000, 2000), 3), Rounded(Uniform(40, 120), 3), "BORNE");
+        point->setInvariantXY(true);
+        point->setInvariantZ(true);
+        carnet.Add(std::move(point), kKindPoint);
+    }
+}
+
+int JobGenerator::AddStation(CCarnet& carnet) {
+    const int occurrence = m_occurrences++;
+    if (occurrence % 100 == 0) {
+        auto instrument = std::make_unique<CAppareil>(Named("Tachéomètre ", occurrence / 100 % 3 + 1),
+                                                      Rounded(Uniform(-0.002, 0.002), 5), 0.0);
+        instrument->setSigmaAh(0.0003);
+        instrument->setSigmaAv(0.0003);
+        instrument->setSigmaDi(0.002);
+        instrument->setSigmaPpm(2.0);
+        carnet.Add(std::move(instrument), kKindAppareil);
+    }
+    if (occurrence % 10 == 0)
+        carnet.Add(std::make_unique<CComment>("Opérateur = J. Martin, mise en station " +
+                                              std::to_string(occurrence + 1) + ", temps couvert"),
+                   kKindComment);
+
+    int number;
+    const bool reprise = occurrence % 4 == 3 && m_recentStations.size() >= 2;
+    if (reprise) {
+        number = m_recentStations[m_recentStations.size() - 2];
+    } else {
+        number = ++m_stationNames;
+        m_east += Uniform(-60, 80);
+        m_north += Uniform(-60, 80);
+        // A new station is itself a point, computed or known.
+        carnet.Add(std::make_unique<CPointGen>(StationName(number), Rounded(m_east, 3), Rounded(m_north, 3),
+                                               Rounded(Uniform(40, 120), 3)),
+                   kKindPoint);
+    }
+    m_recentStations.push_back(number);
+    if (m_recentStations.size() > 4) m_recentStations.erase(m_recentStations.begin());
+
+    const int stationIndex = carnet.Add(
+        std::make_unique<CStation>(StationName(number), Rounded(Uniform(1.4, 1.7), 3)), kKindStation);
+
+    // References: four control points around, and the stations before and after in the traverse.
+    for (int r = 0; r < kReferencesPerStation; ++r) {
+        std::string target;
+        if (r == 4 && number > 1)
+            target = StationName(number - 1);
+        else if (r == 5)
+            target = StationName(number + 1);
+        else
+            target = ControlName(1 + (number * 3 + r * 7) % std::max(m_controlCount, 1));
+        carnet.Add(std::make_unique<CReference>(target, 1.3, Rounded(Uniform(0, 400), 5),
+                                                Rounded(Uniform(98, 102), 5), Rounded(Uniform(50, 600), 4)),
+                   kKindReference);
+    }
+
+    // Measured detail points, some of them eccentric, then the points computed from them.
+    std::vector<std::pair<long long, const char*>> measured;
+    for (int m = 0; m < kMeasuresPerStation; ++m) {
+        long long point = m_nextPoint++;
+        const char* code = kCodes[(point * 7) % std::size(kCodes)];
+        if (point % 5 == 0)
+            carnet.Add(std::make_unique<CCommande>(std::string(kExcentRad), "0.150"), kKindExcentrement);
+        carnet.Add(std::make_unique<CMesure>(std::to_string(point), m % 3 == 0 ? 2.0 : 1.3,
+                                             Rounded(Uniform(0, 400), 5), Rounded(Uniform(95, 105), 5),
+                                             Rounded(Uniform(3, 250), 4), code),
+                   kKindMesure);
+        measured.emplace_back(point, code);
+    }
+    for (auto [point, code] : measured)
+        carnet.Add(std::make_unique<CPointGen>(std::to_string(point), Rounded(m_east + Uniform(-250, 250), 3),
+                                               Rounded(m_north + Uniform(-250, 250), 3),
+                                               Rounded(Uniform(40, 120), 3), code),
+                   kKindPoint);
+
+    if (occurrence % 200 == 199) {
+        auto traverse = std::make_unique<CChemin>(Named("CHEM", occurrence / 200 + 1));
+        for (int s = std::max(1, number - 4); s <= number; ++s)
+            traverse->add(StationName(s) + "(1)");
+        carnet.Add(std::move(traverse), kKindChemin);
+    }
+    return stationIndex;
+}
+
+CCarnet MakeJob(int stationCount) {
+    CCarnet carnet;
+    JobGenerator generator;
+    generator.AddControlPoints(carnet, stationCount / 2 + 6);
+    for (int s = 0; s < stationCount; ++s)
+        generator.AddStation(carnet);
+    return carnet;
+}
+
+CCarnet MakeJobOfSize(int elementCount) {
+    CCarnet carnet;
+    JobGenerator generator;
+    const int stationCount = elementCount / kElementsPerStation + 1;
+    generator.AddControlPoints(carnet, stationCount / 2 + 6);
+    while (carnet.GetSize() < elementCount)
+        generator.AddStation(carnet);
+    carnet.RemoveRange(elementCount, carnet.GetSize());
+    return carnet;
+}
+
+JobContents Contents(const CCarnet& carnet) {
+    JobContents contents;
+    std::unordered_map<std::string, int> setUps;
+    for (int i = 0; i < carnet.GetSize(); ++i) {
+        int kind = carnet.GetType(i);
+        if (kind == kKindStation) {
+            std::string name = carnet.matAt(i);
+            int rank = ++setUps[name];
+            if (rank == 1) contents.stationNames.push_back(name);
+            contents.reprises.emplace_back(std::move(name), rank);
+        } else if (kind == kKindPoint) {
+            contents.pointNames.push_back(carnet.matAt(i));
+        } else if (IsSightingKind(kind)) {
+            contents.sightings.push_back(i);
+        }
+    }
+    return contents;
+}
+
+} // namespace pyr::bench

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "geobase/Carnet.h"
+
+#include <cstdint>
+#include <string>
+#include <string_view>
+#include <utility>
+#include <vector>
+
+// A GéoBase such as a big survey job produces, built in memory through the store's public operations:
+// control points, then station after station with its references, measured sightings, eccentric
+// offsets and the points computed from them; now and then an instrument, a comment, a traverse.
+namespace pyr::bench {
+
+class JobGenerator {
+public:
+    explicit JobGenerator(std::uint64_t seed = 20240611) : m_state(seed) {}
+
+    // Known points "A1".."An" with their Lambert-93 coordinates, declared invariant.
+    void AddControlPoints(CCarnet& carnet, int count);
+    // One station set-up and everything written after it. One station in four is a reprise of a
+    // station set up two set-ups earlier. Returns the index of the station element.
+    int AddStation(CCarnet& carnet);
+
+    int StationOccurrences() const { return m_occurrences; }
+
+private:
+    double Uniform(double low, double high);
+    static double Rounded(double value, int decimals);
+    static std::string Named(std::string_view prefix, long long number);
+    static std::string StationName(int number) { return Named("S", number); }
+    static std::string ControlName(int number) { return Named("A", number); }
+
+    std::uint64_t m_state;
+    int m_controlCount = 0;
+    int m_occurrences = 0;
+    int m_stationNames = 0;
+    std::vector<int> m_recentStations; // station numbers of the last set-ups, for reprises
+    long long m_nextPoint = 1000;
+    double m_east = 651200.0;
+    double m_north = 6862300.0;
+};
+
+// A job of `stationCount` station set-ups with control points in proportion.
+CCarnet MakeJob(int stationCount);
+// A job of exactly `elementCount` elements (the last station may be cut short).
+CCarnet MakeJobOfSize(int elementCount);
+
+// What a job holds, gathered once so that look-ups can be timed alone.
+struct JobContents {
+    std::vector<std::string> stationNames;             // distinct, in order of first set-up
+    std::vector<std::pair<std::string, int>> reprises; // every station set-up: name and rank from 1
+    std::vector<std::string> pointNames;               // every point element's identifier
+    std::vector<int> sightings;                        // indices of every reference and measure
+};
+JobContents Contents(const CCarnet& carnet);
+
+} // namespace pyr::bench
