@@ -1,6 +1,7 @@
 #pragma once
 
 #include "core/Undefined.h"
+#include "geobase/ElementPool.h"
 
 #include <cstdint>
 #include <memory>
@@ -19,6 +20,10 @@ class CElement {
 public:
     virtual ~CElement() = default;
     virtual std::unique_ptr<CElement> Clone() const = 0;
+
+    // Elements come from the element pool; the virtual destructor hands the right size back.
+    static void* operator new(std::size_t size) { return ElementPool::Allocate(size); }
+    static void operator delete(void* memory, std::size_t size) noexcept { ElementPool::Free(memory, size); }
 
     const std::string& mat() const { return m_mat; }
     const std::string& sym() const { return m_sym; }
