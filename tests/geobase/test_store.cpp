@@ -97,8 +97,6 @@ TEST(Store, TheUndefinedValueIsMissingEverywhereAndZeroIsAValue) {
     EXPECT_EQ(c.v0At(6), 0.0);
     EXPECT_EQ(c.v0At(3), kUndefined); // a new station is not oriented
     EXPECT_EQ(c.hiAt(3), 1.55);
-    EXPECT_EQ(c.hpAt(10), kUndefined);
-    EXPECT_EQ(c.avAt(10), kUndefined);
     EXPECT_EQ(c.dhAt(10), kUndefined); // no zenith angle, no horizontal distance
     EXPECT_NEAR(c.dhAt(7), 40.0, 1e-12);
     EXPECT_NEAR(c.dhAt(4), 250.0 * std::sin(100.2 * 3.14159265358979323846 / 200.0), 1e-9);
@@ -106,21 +104,8 @@ TEST(Store, TheUndefinedValueIsMissingEverywhereAndZeroIsAValue) {
     // What an element does not have reads as missing, whatever the accessor.
     EXPECT_EQ(c.xAt(3), kUndefined);
     EXPECT_EQ(c.hiAt(4), kUndefined);
-    EXPECT_EQ(c.ahAt(1), kUndefined);
-    EXPECT_EQ(c.lmAt(1), kUndefined);
-    EXPECT_EQ(c.cmdAt(1), "");
     EXPECT_EQ(c.xAt(-1), kUndefined);
     EXPECT_EQ(c.matAt(99), "");
-    EXPECT_EQ(c.symAt(2), "BORNE");
-
-    // New elements: a sighting holds 0.0 in its four values, a levelling reading has no distance.
-    CMesure fresh;
-    EXPECT_EQ(fresh.hp(), 0.0);
-    EXPECT_EQ(fresh.av(), 0.0);
-    CLectAR reading("R1", 1.4215);
-    EXPECT_EQ(reading.dist(), kUndefined);
-    CMesure direction("P9", 123.4567);
-    EXPECT_EQ(direction.ah(), 123.4567);
 }
 
 TEST(Store, ReprisesAreFoundByTheirNumber) {
