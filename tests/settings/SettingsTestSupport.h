@@ -5,6 +5,8 @@
 #include "ui/ScriptedFrontEnd.h"
 
 #include <gtest/gtest.h>
+#include <string>
+#include <vector>
 
 namespace pyr::test {
 
@@ -14,12 +16,24 @@ class SettingsTest : public ::testing::Test {
 protected:
     SettingsTest()
         : scopedFrontEnd_(frontEnd), registryFolder_("PYRALIS_REGISTRE", folder / "registre"),
-          paramsFile_("PYRALIS_PARAMS", folder / "Pyralis.ini") {
+          paramsFile_("PYRALIS_PARAMS", path) {
         ResetParamErrorMemory();
     }
     ~SettingsTest() override { ResetParamErrorMemory(); }
 
+    // The texts of the messages shown, each checked to be captioned "PYRALIS" with that icon.
+    static std::vector<std::string> Texts(const ui::ScriptedFrontEnd& shown, int icon) {
+        std::vector<std::string> texts;
+        for (const auto& message : shown.messages) {
+            EXPECT_EQ(message.caption, "PYRALIS");
+            EXPECT_EQ(message.icon, icon);
+            texts.push_back(message.text);
+        }
+        return texts;
+    }
+
     TempDir folder;
+    const std::string path = folder / "Pyralis.ini";
     ui::ScriptedFrontEnd frontEnd;
 
 private:
