@@ -1,0 +1,89 @@
+#pragma once
+
+#include <functional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+// A dialog as a model: its state, its rules and its actions, without any widget. A front end shows it
+// and forwards a person's actions; a front end without widgets (the command line, the tests) drives it
+// through the options it declares.
+namespace pyr::ui {
+
+class FrontEnd;
+
+// How a modal dialog ended.
+enum class DialogResult {
+    Ok,     // closed with OK: the work is done
+    Cancel, // closed without change
+    Failed  // refused or failed; a message has said why
+};
+
+// The options by which a dialog's values are set and its actions run from a command line. Each dialog
+// only declares them; one mechanism (DialogCommandLine.h) parses them, applies them in the order they
+// were given and writes the help.
+class DialogOptions {
+public:
+    // Applies an option: an empty text when accepted, else the French reason of the refusal (shown
+    // to the person, and the dialog is not run).
+    using Apply = std::function<std::string(const std::string& value)>;
+
+    struct Option {
+        std::string name;      // long name without its dashes: "geobase"
+        std::string valueName; // the value's name in the help ("FICHIER"); empty for a switch
+        std::string help;      // one line of French
+        bool repeatable = false;
+        Apply apply;           // a switch gets an empty value
+    };
+
+    // "--name VALUE".
+    void Value(std::string name, std::string valueName, std::string help, Apply apply,
+               bool repeatable = false);
+    // "--name": a switch or an action.
+    void Switch(std::string name, std::string help, std::function<std::string()> action);
+
+    const std::vector<Option>& Options() const { return m_options; }
+
+private:
+    std::vector<Option> m_options;
+};
+
+// What every command hands to its dialog before it opens (the last GéoBase, the current parameter
+// file, the installation folder, the command's title).
+struct CommandInputs {
+    std::string geoBase;      // the GéoBase offered first: the last one used
+    std::string paramPath;    // the current parameter path (a file or a registry root)
+    std::string configFolder; // the installation folder, ending with a separator; holds "Config/"
+    std::string title;        // "calcul d'un point par intersections de visées"
+};
+
+class DialogModel {
+public:
+    virtual ~DialogModel() = default;
+
+    void SetInputs(CommandInputs inputs) { m_inputs = std::move(inputs); }
+    const CommandInputs& Inputs() const { return m_inputs; }
+
+    // The GéoBase the dialog works on: the one offered first, until the person names another.
+    const std::string& GeoBase() const { return m_inputs.geoBase; }
+    void SetGeoBase(std::string path) {
+        m_inputs.geoBase = std::move(path);
+        m_geoBaseNamed = true;
+    }
+    // Whether the person named the GéoBase (rather than taking the one offered).
+    bool GeoBaseNamed() const { return m_geoBaseNamed; }
+
+    // The caption of the dialog's window.
+    virtual std::string Caption() const { return m_inputs.title; }
+    // The dialog's own options; "--geobase" is common to every dialog and declared by the mechanism.
+    virtual void DeclareOptions(DialogOptions&) {}
+    // Runs the dialog with the person at the front end, after the options were applied: what the dialog
+    // does until it is closed.
+    virtual DialogResult Run(FrontEnd& frontEnd) = 0;
+
+private:
+    CommandInputs m_inputs;
+    bool m_geoBaseNamed = false;
+};
+
+} // namespace pyr::ui
