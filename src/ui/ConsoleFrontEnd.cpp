@@ -1,5 +1,8 @@
 #include "ui/ConsoleFrontEnd.h"
 
+#include "ui/DialogCommandLine.h"
+
+#include <algorithm>
 #include <cctype>
 #include <string>
 #include <unistd.h>
@@ -96,6 +99,40 @@ std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice)
 
 void ConsoleFrontEnd::TextLine(std::string_view line) {
     std::fprintf(m_out, "%.*s\n", static_cast<int>(line.size()), line.data());
+}
+
+void ConsoleFrontEnd::SetCommand(std::string name, std::vector<std::string> arguments) {
+    m_command = std::move(name);
+    m_arguments = std::move(arguments);
+    m_status = 0;
+}
+
+DialogResult ConsoleFrontEnd::DoModal(DialogModel& dialog) {
+    CommandLineOutcome outcome = ApplyCommandLine(dialog, m_command, m_arguments);
+    DialogResult result = DialogResult::Failed;
+    int status = 0;
+    switch (outcome.kind) {
+    case CommandLineOutcome::Kind::Help:
+        std::fprintf(m_out, "%s\n", outcome.text.c_str());
+        std::fflush(m_out);
+        result = DialogResult::Cancel;
+        break;
+    case CommandLineOutcome::Kind::Usage:
+        std::fprintf(m_err, "pyralis %s : %s\n", m_command.c_str(), outcome.text.c_str());
+        std::fflush(m_err);
+        status = 2;
+        break;
+    case CommandLineOutcome::Kind::Refused:
+        MessageBox(outcome.text, kCaption, kIconWarning);
+        status = 1;
+        break;
+    case CommandLineOutcome::Kind::Run:
+        result = dialog.Run(*this);
+        if (result == DialogResult::Failed) status = 1;
+        break;
+    }
+    m_status = std::max(m_status, status);
+    return result;
 }
 
 namespace {

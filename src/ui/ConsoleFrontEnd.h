@@ -4,12 +4,15 @@
 
 #include <cstdio>
 #include <optional>
+#include <string>
+#include <vector>
 
 namespace pyr::ui {
 
 // The terminal: messages to standard error, text-window lines to standard output. Questions are asked
 // at the terminal when standard input is one; otherwise (batch) they take the answer given in advance
-// (--oui / --non) or their default, and say which answer was taken.
+// (--oui / --non) or their default, and say which answer was taken. A dialog takes its options from the
+// words of the command line.
 class ConsoleFrontEnd : public FrontEnd {
 public:
     ConsoleFrontEnd(std::FILE* in = stdin, std::FILE* out = stdout, std::FILE* err = stderr);
@@ -17,11 +20,19 @@ public:
     void SetBatchAnswer(std::optional<Answer> answer) { m_batchAnswer = answer; }
     void SetInteractive(bool interactive) { m_interactive = interactive; }
 
+    // The command being run and the words after its name: DoModal applies them to the dialog.
+    void SetCommand(std::string name, std::vector<std::string> arguments);
+    // What the last command came to: 0 it ran (closed with OK or cancelled), 1 refused or failed (a
+    // message said why), 2 bad usage; the worst of its dialogs when it runs several. SetCommand resets it
+    // to 0.
+    int Status() const { return m_status; }
+
     void MessageBox(std::string_view text, std::string_view caption, int icon) override;
     Answer Ask(std::string_view text, std::string_view caption, Buttons buttons, Answer byDefault,
                int icon = kIconQuestion) override;
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override;
+    DialogResult DoModal(DialogModel& dialog) override;
 
 private:
     std::FILE* m_in;
@@ -29,6 +40,9 @@ private:
     std::FILE* m_err;
     bool m_interactive;
     std::optional<Answer> m_batchAnswer;
+    std::string m_command;
+    std::vector<std::string> m_arguments;
+    int m_status = 0;
 };
 
 } // namespace pyr::ui

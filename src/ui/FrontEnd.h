@@ -1,5 +1,7 @@
 #pragma once
 
+#include "ui/DialogModel.h"
+
 #include <optional>
 #include <string>
 #include <string_view>
@@ -42,6 +44,9 @@ public:
     virtual std::optional<std::string> ChooseFile(const FileChoice& choice) = 0;
     // One line of the text window, without its end.
     virtual void TextLine(std::string_view line) = 0;
+    // Runs a dialog modally, as every command does with its dialog: the front end gives it what the
+    // person asked for (its options, on a command line) and runs it until it is closed.
+    virtual DialogResult DoModal(DialogModel& dialog) = 0;
 };
 
 // The application's own front end: what a message without a parent window goes to. The console until a

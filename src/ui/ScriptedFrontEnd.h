@@ -9,7 +9,8 @@
 namespace pyr::ui {
 
 // The front end of the tests: answers and file choices given in advance, everything shown recorded.
-// A question with no answer left takes its default.
+// A question with no answer left takes its default; a file choice with no file left takes the path it
+// offers (nothing when it offers none). Every dialog gets `dialogArguments` as its command line.
 class ScriptedFrontEnd : public FrontEnd {
 public:
     struct Message {
@@ -26,11 +27,20 @@ public:
     std::vector<FileChoice> fileChoices;
     std::vector<std::string> lines;
 
+    // The words applied to every dialog run, as a command line would give them, and the name of the
+    // command they are given to (for the help and the messages).
+    std::vector<std::string> dialogArguments;
+    std::string command = "commande";
+    // The caption of every dialog run, in the order they were opened, and how each ended (same order).
+    std::vector<std::string> dialogs;
+    std::vector<DialogResult> results;
+
     void MessageBox(std::string_view text, std::string_view caption, int icon) override;
     Answer Ask(std::string_view text, std::string_view caption, Buttons buttons, Answer byDefault,
                int icon = kIconQuestion) override;
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override { lines.emplace_back(line); }
+    DialogResult DoModal(DialogModel& dialog) override;
 
     // All text-window lines joined with '\n', for searching in a test.
     std::string AllLines() const;
