@@ -1,70 +1,138 @@
-// pyralis GEOBASE [COPIE]: reads a GéoBase, shows what it holds, and saves it under a new name.
-#include "core/Numbers.h"
-#include "core/TextEncoding.h"
-#include "geobase/Carnet.h"
+// pyralis: the command-line host. It loads the module PyrCalTopo15.arx as a CAD host would, lists its
+// commands, runs one by its global or local name, or gives a person a "Commande : " prompt.
+#include "HostOptions.h"
+#include "host/HostTexts.h"
+#include "host/Services.h"
+#include "hostrt/HostRuntime.h"
 #include "ui/ConsoleFrontEnd.h"
-#include "ui/PyrTxtWnd.h"
 
 #include <cstdio>
-#include <map>
+#include <cstdlib>
+#include <filesystem>
 #include <string>
-
-using namespace pyr;
+#include <unistd.h>
+#include <vector>
 
 namespace {
 
-std::string Value(double value, int decimals) {
-    return IsKnown(value) ? FormatFixed(value, decimals) : std::string("inconnu");
+using pyr::host::CPyrCommandTitles;
+
+constexpr const char* kUsage =
+    "Usage : pyralis [--params CHEMIN] [--oui | --non] [COMMANDE [options]]\n"
+    "\n"
+    "Sans commande, pyralis donne la liste des commandes (nom global, nom local, titre), puis, devant un\n"
+    "terminal, l'invite « Commande : ». Une commande s'appelle par son nom global ou local, sans souci des\n"
+    "majuscules : pyralis CalInter, pyralis PyraCalInter.\n"
+    "\n"
+    "Options de pyralis, valables pour toute commande :\n"
+    "  --params CHEMIN   le fichier de paramètres (ou une racine du registre, HKEY_CURRENT_USER ...)\n"
+    "  --oui, --non      la réponse aux questions posées en traitement par lots\n"
+    "  --interactif      l'invite « Commande : » même sans terminal\n"
+    "  --help            cette aide ; « pyralis COMMANDE --help » donne les options de la commande\n";
+
+constexpr int kStatusUsage = 2;
+constexpr int kStatusFailed = 1;
+
+// The folder of this program: the host's support path, where its modules lie.
+std::string ProgramFolder() {
+    std::error_code error;
+    std::filesystem::path self = std::filesystem::read_symlink("/proc/self/exe", error);
+    return error ? std::string(".") : self.parent_path().string();
 }
 
-void ShowContents(CPyrTxtWnd& txt, const CCarnet& carnet) {
-    txt.Print("%d éléments :", carnet.GetSize());
-    std::map<int, int> counts;
-    for (int i = 0; i < carnet.GetSize(); ++i)
-        ++counts[IsCommandKind(carnet.GetType(i)) && carnet.GetType(i) != kKindExcentrement
-                     ? kKindCommand
-                     : carnet.GetType(i)];
-    for (auto [kind, count] : counts)
-        txt.Print("  %s %6d", PadRight(KindLabel(kind), 14).c_str(), count);
+const CPyrCommandTitles* Titles() {
+    return static_cast<const CPyrCommandTitles*>(acrxServiceDictionary()->at(pyr::host::kCommandTitlesName));
+}
 
-    txt.Print("\nStations :");
-    for (int i = carnet.Find(kKindStation, ""); i >= 0; i = carnet.Find(kKindStation, "", i + 1)) {
-        int references = 0, measures = 0;
-        for (int j = i + 1; j < carnet.GetSize() && carnet.GetType(j) != kKindStation; ++j) {
-            references += carnet.GetType(j) == kKindReference;
-            measures += carnet.GetType(j) == kKindMesure;
-        }
-        txt.Print("  %-12s HI = %s  V0 = %s  %d référence(s), %d mesure(s)",
-                  carnet.StationDesignation(i).c_str(), Value(carnet.hiAt(i), CStation::DeciZ()).c_str(),
-                  Value(carnet.v0At(i), CStation::DeciAng()).c_str(), references, measures);
+void ListCommands() {
+    const CPyrCommandTitles* titles = Titles();
+    for (const AcEdCommand& command : acedRegCmds()->commands()) {
+        if (command.group != pyr::host::kCommandGroup) continue;
+        std::string title = titles ? titles->Title(command.globalName) : std::string();
+        if (title.empty())
+            title = std::string("(affiche la barre d'outils « ") + pyr::host::kToolbarGroup + " »)";
+        std::printf("%-14s %-12s %s\n", command.globalName.c_str(), command.localName.c_str(), title.c_str());
     }
+    std::fflush(stdout);
+}
 
-    txt.Print("\nPoints :");
-    for (int i = carnet.Find(kKindPoint, ""); i >= 0; i = carnet.Find(kKindPoint, "", i + 1))
-        txt.Print("  %-10s X = %14s  Y = %14s  Z = %10s", carnet.matAt(i).c_str(),
-                  Value(carnet.xAt(i), CPointGen::DeciXY()).c_str(),
-                  Value(carnet.yAt(i), CPointGen::DeciXY()).c_str(),
-                  Value(carnet.zAt(i), CPointGen::DeciZ()).c_str());
+int RunCommand(pyr::ui::ConsoleFrontEnd& console, const std::string& name, std::vector<std::string> words) {
+    if (!acedRegCmds()->lookupCmd(name)) {
+        std::fprintf(stderr, "pyralis : commande inconnue « %s » ; « pyralis » seul en donne la liste.\n",
+                     name.c_str());
+        return kStatusUsage;
+    }
+    console.SetCommand(name, std::move(words));
+    acedRegCmds()->runCommand(name);
+    std::fflush(stdout);
+    return console.Status();
+}
+
+void Prompt(pyr::ui::ConsoleFrontEnd& console) {
+    std::string line;
+    while (true) {
+        std::fputs("Commande : ", stderr);
+        std::fflush(stderr);
+        line.clear();
+        int c;
+        while ((c = std::fgetc(stdin)) != EOF && c != '\n')
+            line += static_cast<char>(c);
+        if (c == EOF && line.empty()) break;
+        std::vector<std::string> words = SplitCommandLine(line);
+        if (words.empty()) continue;
+        const std::string name = words.front();
+        if (name == "FIN" || name == "fin" || name == "QUITTER" || name == "quitter") break;
+        if (name == "?" || name == "AIDE" || name == "aide") {
+            ListCommands();
+            continue;
+        }
+        words.erase(words.begin());
+        RunCommand(console, name, std::move(words));
+    }
+    std::fputc('\n', stderr);
 }
 
 } // namespace
 
 int main(int argc, char** argv) {
-    if (argc < 2 || argc > 3) {
-        std::fprintf(stderr,
-                     "Usage : pyralis GEOBASE.geo [COPIE.geo]\n"
-                     "Montre le contenu de la GéoBase et, si une copie est demandée, l'y enregistre.\n");
-        return 2;
+    const HostOptions options = ParseHostOptions(std::vector<std::string>(argv + 1, argv + argc));
+    if (!options.error.empty()) {
+        std::fprintf(stderr, "pyralis : %s\n\n%s", options.error.c_str(), kUsage);
+        return kStatusUsage;
     }
-    ui::FrontEnd& frontEnd = ui::ApplicationFrontEnd();
-    CPyrTxtWnd txt(frontEnd);
-    CCarnet carnet;
-    if (!carnet.Load(&txt, argv[1], {}, 0, &frontEnd)) return 1;
-    txt.Print("GéoBase : %s", argv[1]);
-    ShowContents(txt, carnet);
-    if (argc == 3) {
-        if (!carnet.Save(argv[2], &frontEnd, false)) return 1;
-        txt.Print("\nGéoBase enregistrée dans <%s>.", argv[2]);
+    if (options.help) {
+        std::fputs(kUsage, stdout);
+        return 0;
     }
-    return 0;
+    // The parameter path goes where the services look for it.
+    if (options.params) setenv("PYRALIS_PARAMS", options.params->c_str(), 1);
+
+    pyr::ui::ConsoleFrontEnd console;
+    if (options.answer) console.SetBatchAnswer(*options.answer ? pyr::ui::Answer::Yes : pyr::ui::Answer::No);
+    if (options.interactive) console.SetInteractive(true);
+    pyr::ui::SetApplicationFrontEnd(&console);
+    pyr::SetMainWindow(&console);
+    pyr::SetSupportPath({ProgramFolder()});
+
+    std::string module;
+    if (acedFindFile(pyr::host::kModuleFile, module) != RTNORM || !acrxDynamicLinker()->loadModule(module)) {
+        std::fprintf(stderr, pyr::host::kMsgModuleNotLoaded, pyr::host::kModuleFile);
+        std::fprintf(stderr, "\n%s\n", acrxDynamicLinker()->lastError().c_str());
+        return kStatusFailed;
+    }
+    static int drawing = 0; // the one drawing of this host
+    acrxDynamicLinker()->sendDocumentMessage(AcRx::kLoadDwgMsg, &drawing);
+
+    int status = 0;
+    if (!options.command.empty()) {
+        status = RunCommand(console, options.command, options.commandWords);
+    } else {
+        ListCommands();
+        if (options.interactive || isatty(fileno(stdin))) Prompt(console);
+    }
+
+    acrxDynamicLinker()->sendDocumentMessage(AcRx::kUnloadDwgMsg, &drawing);
+    acrxDynamicLinker()->unloadAll();
+    pyr::SetMainWindow(nullptr);
+    return status;
 }

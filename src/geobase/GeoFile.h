@@ -13,6 +13,10 @@ class CElement;
 inline constexpr std::string_view kGeoHeader = "GEOBASE PYRALIS";
 inline constexpr int kGeoFormatVersion = 1;
 
+// How a GéoBase is offered in a file choice.
+inline constexpr const char* kGeoFileFilter = "GéoBase PYRALIS (*.geo)|*.geo||";
+inline constexpr const char* kGeoFileExtension = "geo";
+
 // "GEOBASE PYRALIS\t1"
 std::string GeoHeaderLine();
 // The version of a header line, or 0 when the line is not a header.

@@ -27,6 +27,9 @@ enum AppMsgCode : int {
     kUnloadDwgMsg = 4, // a drawing is closed; same packet
 };
 
+// The version of the host's interface that modules are built for, answered by their acrxGetApiVersion.
+inline constexpr int kApiVersion = 15;
+
 // What an entry point answers.
 enum AppRetCode : int {
     kRetOK = 0,

@@ -5,4 +5,5 @@
 #include "hostrt/CommandStack.h"
 #include "hostrt/DynamicLinker.h"
 #include "hostrt/FindFile.h"
+#include "hostrt/MainWindow.h"
 #include "hostrt/SysVars.h"

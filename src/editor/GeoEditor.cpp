@@ -1,0 +1,58 @@
+#include "editor/GeoEditor.h"
+
+#include "core/Strings.h"
+#include "geobase/Carnet.h"
+#include "geobase/GeoFile.h"
+#include "settings/LastGeoBase.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+namespace pyr {
+
+namespace {
+
+constexpr const char* kChooseTitle = "Sélectionnez la GéoBase à éditer :";
+constexpr const char* kOpened = "GéoBase <%s> : %d élément(s).";
+constexpr int kKindColumn = 14;
+
+} // namespace
+
+std::string EditorLine(const CCarnet& carnet, int index) {
+    const int kind = carnet.GetType(index);
+    // The element's fields as the file writes them, the kind code left out, a column between them.
+    std::string fields = ElementLine(*carnet.GetAt(index), kind);
+    const size_t first = fields.find('\t');
+    fields = first == std::string::npos ? std::string() : fields.substr(first + 1);
+    std::string values;
+    for (char c : fields)
+        values += c == '\t' ? std::string("  ") : std::string(1, c);
+    std::string label(KindLabel(kind));
+    // Accented labels: pad by characters, not bytes.
+    int width = 0;
+    for (unsigned char c : label)
+        width += (c & 0xC0) != 0x80;
+    if (width < kKindColumn) label.append(static_cast<size_t>(kKindColumn - width), ' ');
+    return Sprintf("%06d  %s%s", index + 1, label.c_str(), values.c_str());
+}
+
+ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
+    std::string path = GeoBase();
+    if (!GeoBaseNamed()) {
+        auto chosen = frontEnd.ChooseFile({false, kChooseTitle, kGeoFileFilter, kGeoFileExtension, path});
+        if (!chosen) return ui::DialogResult::Cancel;
+        path = *chosen;
+    }
+    if (path.empty()) return ui::DialogResult::Cancel;
+
+    CPyrTxtWnd txt(frontEnd);
+    CCarnet carnet;
+    if (!carnet.Load(&txt, path, {}, 0, &frontEnd)) return ui::DialogResult::Failed;
+    WriteLastGeoBase(Inputs().paramPath, path);
+
+    txt.Print(kOpened, path.c_str(), carnet.GetSize());
+    for (int i = 0; i < carnet.GetSize(); ++i)
+        txt.PrintText(EditorLine(carnet, i));
+    return ui::DialogResult::Ok;
+}
+
+} // namespace pyr

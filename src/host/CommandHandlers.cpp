@@ -1,0 +1,61 @@
+#include "host/CommandHandlers.h"
+
+#include "core/Strings.h"
+#include "editor/GeoEditor.h"
+#include "host/CommandFlow.h"
+#include "host/HostTexts.h"
+#include "host/ServicesLookup.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+namespace pyr::host {
+
+namespace {
+
+// The dialog of a command that this version does not have yet: it says so.
+class CDlgPending : public ui::DialogModel {
+public:
+    explicit CDlgPending(const CommandSpec& command) : m_command(command) {}
+
+    ui::DialogResult Run(ui::FrontEnd& frontEnd) override {
+        frontEnd.MessageBox(Sprintf(kMsgNotAvailable, m_command.localName, m_command.title), ui::kCaption,
+                            ui::kIconInformation);
+        return ui::DialogResult::Failed;
+    }
+
+private:
+    const CommandSpec& m_command;
+};
+
+void RunPending(const CommandSpec& command) {
+    RunCommandDialog(command.title, [&command] { return std::make_unique<CDlgPending>(command); });
+}
+
+} // namespace
+
+void OnShowToolbar(const CommandSpec&) {
+    CPyrMainServices* services = MainServices();
+    if (!services) return;
+    services->ShowToolbar(kToolbarGroup, true);
+    if (ui::FrontEnd* parent = services->GetParentWindow())
+        CPyrTxtWnd(*parent).Print(kMsgToolbarShown, kToolbarGroup);
+}
+
+void OnGeoEdit(const CommandSpec& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CGeoEditor>(); });
+}
+
+void OnExport(const CommandSpec& command) {
+    RunPending(command);
+}
+
+void OnTabCode(const CommandSpec& command) {
+    if (!ScaleServices()) return;
+    RunPending(command);
+}
+
+void OnPending(const CommandSpec& command) {
+    RunPending(command);
+}
+
+} // namespace pyr::host

@@ -1,0 +1,88 @@
+#include "host/CommandTable.h"
+
+#include "core/Strings.h"
+#include "host/CommandHandlers.h"
+#include "host/HostTexts.h"
+#include "host/Services.h"
+#include "hostrt/HostRuntime.h"
+
+#include <array>
+
+namespace pyr::host {
+
+namespace {
+
+constexpr std::array<CommandSpec, 37> kCommands{{
+    {"PyrCalTopo15", "PyrCalTopo15", nullptr, OnShowToolbar},
+    {"PyraCalcOpt", "CalcOpt", "options des calculs topométriques.", OnPending},
+    {"PyraLGeodim", "LGeodim", "transformation carnet Trimble GDM -> GéoBase", OnPending},
+    {"PyraLNikPsi", "LNikPsi", "transformation carnet Nikon/Psion -> GéoBase", OnPending},
+    {"PyraLNikAtl", "LNikAtl", "transformation carnet Nikon/Atlas -> GéoBase", OnPending},
+    {"PyraLNikKps", "LNikKps", "transformation carnet Nikon/Kheops -> GéoBase", OnPending},
+    {"PyraLSokkia", "LSokkia", "transformation carnet Sokkia -> GéoBase", OnPending},
+    {"PyraLQuenda", "LQuenda", "transformation carnet Quendal-Pc -> GéoBase", OnPending},
+    {"PyraLSeparat", "LSeparat", "transformation carnet Séparateur -> GéoBase", OnPending},
+    {"PyraLColonne", "LColonne", "transformation carnet Colonné -> GéoBase", OnPending},
+    {"PyraLTopcon", "LTopcon", "transformation carnet Topcon GT7 -> GéoBase", OnPending},
+    {"PyraLecWild", "LecWild", "transformation carnet Wild -> GéoBase", OnPending},
+    {"PyraLZeiss1", "LZeiss1", "transformation carnet Trimble Zeiss -> GéoBase", OnPending},
+    {"PyraEPoints", "EPoints", "transformation GéoBase -> fichier de points", OnExport},
+    {"PyraEGeoBase", "EGeoBase", "transformation GéoBase -> GéoBase", OnPending},
+    {"PyraESeparat", "ESeparat", "transformation GéoBase -> format séparateur", OnExport},
+    {"PyraEColonne", "EColonne", "transformation GéoBase -> format colonné", OnExport},
+    {"PyraEQuendal", "EQuendal", "transformation GéoBase -> carnet Quendal-Pc", OnExport},
+    {"PyraELeica", "ELeica", "transformation GéoBase -> format Leica", OnExport},
+    {"PyraESpectra", "ESpectra", "transformation GéoBase -> format Trimble GDM", OnExport},
+    {"PyraESokkia", "ESokkia", "transformation GéoBase -> format Sokkia", OnExport},
+    {"PyraGeoEdit", "GeoEdit", "éditeur de GéoBases", OnGeoEdit},
+    {"PyraGeoEdit2", "GeoEdit2", "éditeur de GéoBases", OnGeoEdit},
+    {"PyraCalInter", "CalInter", "calcul d'un point par intersections de visées", OnPending},
+    {"PyraCalRelev", "CalRelev", "calcul d'un point par relèvement", OnPending},
+    {"PyraCalRecou", "CalRecou", "calcul d'un point par recoupement", OnPending},
+    {"PyraCalExcen", "CalExcen", "calcul d'une station excentrée", OnPending},
+    {"PyraCalTrian", "CalTrian", "calcul d'un point par triangulation", OnPending},
+    {"PyraCalculV0", "CalculV0", "calcul du V0 d'une station", OnPending},
+    {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnPending},
+    {"PyraCalRayon", "CalRayon", "calcul des points rayonnés", OnPending},
+    {"PyraCalBloc", "CalBloc", "calcul de compensation en bloc", OnPending},
+    {"PyraCalNivSm", "CalNivSm", "calcul d'un cheminement altimétrique simple", OnPending},
+    {"PyraCalNivSt", "CalNivSt", "calcul d'un cheminement par double station", OnPending},
+    // The codification commands break the "Pyra" + local name rule of the global names.
+    {"PyraAsmCode", "CalAsmCode", "fusion d'un fichier de codification", OnPending},
+    {"PyraTabCode", "CalTabCode", "gestion d'un table de codes", OnTabCode},
+    {"PyraDesCode", "CalDesCode", "traitement d'un levé codé", OnPending},
+}};
+
+class CommandTitles : public CPyrCommandTitles {
+public:
+    std::string Title(std::string_view globalName) const override {
+        for (const CommandSpec& command : kCommands)
+            if (EqualIgnoringCase(command.globalName, globalName)) return command.title ? command.title : "";
+        return {};
+    }
+};
+
+CommandTitles g_titles;
+
+} // namespace
+
+std::span<const CommandSpec> CommandTable() {
+    return kCommands;
+}
+
+bool RegisterCommands() {
+    bool allAdded = true;
+    for (const CommandSpec& command : kCommands)
+        allAdded &= acedRegCmds()->addCommand(kCommandGroup, command.globalName, command.localName,
+                                              ACRX_CMD_MODAL, [&command] { command.handler(command); });
+    acrxServiceDictionary()->atPut(kCommandTitlesName, &g_titles);
+    return allAdded;
+}
+
+void UnregisterCommands() {
+    acedRegCmds()->removeGroup(kCommandGroup);
+    if (acrxServiceDictionary()->at(kCommandTitlesName) == &g_titles)
+        acrxServiceDictionary()->remove(kCommandTitlesName);
+}
+
+} // namespace pyr::host

@@ -1,0 +1,67 @@
+// The editor's first face: the elements of a GéoBase one a line.
+#include "TestSupport.h"
+#include "editor/GeoEditor.h"
+#include "geobase/Carnet.h"
+#include "settings/LastGeoBase.h"
+#include "ui/ScriptedFrontEnd.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+using pyr::ui::DialogResult;
+
+constexpr const char* kGeo = "GEOBASE PYRALIS\t1\n"
+                             "1000\tLevé du 3 mars\n"
+                             "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
+                             "1006\tA1\t651050.118\t6862512.447\t-999999\tXY\tBORNE\n";
+
+TEST(EditorLine, NumberFromOneKindInAColumnAndTheValuesAsWritten) {
+    TempDir dir;
+    WriteBytes(dir / "a.geo", kGeo);
+    pyr::CCarnet carnet;
+    ASSERT_TRUE(carnet.Load(nullptr, dir / "a.geo"));
+    // The label column is counted in characters: "Référence" is as wide as "Reference".
+    EXPECT_EQ(pyr::EditorLine(carnet, 0), "000001  Commentaire   Levé du 3 mars");
+    EXPECT_EQ(pyr::EditorLine(carnet, 1), "000002  Référence     A1  1.3  323.76206  99.40145  260.0083");
+    EXPECT_EQ(pyr::EditorLine(carnet, 2),
+              "000003  Point         A1  651050.118  6862512.447  -999999  XY  BORNE");
+}
+
+class Editor : public ::testing::Test {
+protected:
+    DialogResult Open(std::string offered) {
+        editor.SetInputs({std::move(offered), dir / "Pyralis.ini", "", "éditeur de GéoBases"});
+        return editor.Run(frontEnd);
+    }
+    TempDir dir;
+    pyr::ui::ScriptedFrontEnd frontEnd;
+    pyr::CGeoEditor editor;
+};
+
+TEST_F(Editor, TheGeoBaseOfferedIsShownAndRecordedAsTheLastOne) {
+    WriteBytes(dir / "a.geo", kGeo);
+    EXPECT_EQ(Open(dir / "a.geo"), DialogResult::Ok);
+    ASSERT_EQ(frontEnd.fileChoices.size(), 1u);
+    EXPECT_EQ(frontEnd.fileChoices[0].filter, "GéoBase PYRALIS (*.geo)|*.geo||");
+    EXPECT_EQ(frontEnd.fileChoices[0].startPath, dir / "a.geo");
+    ASSERT_EQ(frontEnd.lines.size(), 4u);
+    EXPECT_EQ(frontEnd.lines[0], "GéoBase <" + dir / "a.geo" + "> : 3 élément(s).");
+    EXPECT_EQ(pyr::ReadLastGeoBase(dir / "Pyralis.ini"), dir / "a.geo");
+}
+
+TEST_F(Editor, ANamedGeoBaseIsOpenedWithoutAskingAndAMissingOneIsRefused) {
+    editor.SetGeoBase(dir / "absente.geo");
+    EXPECT_EQ(editor.Run(frontEnd), DialogResult::Failed);
+    EXPECT_TRUE(frontEnd.fileChoices.empty());
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_NE(frontEnd.messages[0].text.find("Impossible d'ouvrir la GéoBase"), std::string::npos);
+    EXPECT_EQ(pyr::ReadLastGeoBase(dir / "Pyralis.ini"), "");
+}
+
+TEST_F(Editor, NoGeoBaseChosenEndsWithoutChange) {
+    EXPECT_EQ(Open(""), DialogResult::Cancel);
+    EXPECT_TRUE(frontEnd.lines.empty());
+}
+
+} // namespace

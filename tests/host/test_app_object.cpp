@@ -1,0 +1,115 @@
+// The application object and the command table, taken directly (without loading the module).
+#include "HostTestSupport.h"
+#include "host/CommandContext.h"
+#include "host/CommandTable.h"
+#include "host/PyrAppModul.h"
+
+#include <gtest/gtest.h>
+#include <set>
+
+namespace {
+
+using namespace pyr::host;
+
+TEST(EntryPoint, WithoutAnApplicationObjectEveryMessageIsAnError) {
+    ASSERT_EQ(TheApp(), nullptr);
+    for (int message : {1, 2, 3, 4, 42})
+        EXPECT_EQ(ModuleEntryPoint(message, nullptr), AcRx::kRetError) << message;
+}
+
+TEST(AppObject, UnknownMessagesAreAnsweredZeroAndChangeNothing) {
+    CPyrAppModul app;
+    SetTheApp(&app);
+    const size_t commands = acedRegCmds()->commands().size();
+    const size_t services = acrxServiceDictionary()->numEntries();
+    for (int message : {0, 5, 6, 99, -1})
+        EXPECT_EQ(ModuleEntryPoint(message, &app), AcRx::kRetOK) << message;
+    EXPECT_EQ(acedRegCmds()->commands().size(), commands);
+    EXPECT_EQ(acrxServiceDictionary()->numEntries(), services);
+    EXPECT_EQ(app.DataManager().Count(), 0u);
+    EXPECT_EQ(app.AppId(), nullptr);
+    EXPECT_EQ(app.AppName(), "PyrCalTopo15");
+    SetTheApp(nullptr);
+}
+
+TEST(AppObject, EachDrawingIsKnownOnceAndClosingItIsAnswered) {
+    CPyrAppModul app;
+    int first = 0, second = 0;
+    EXPECT_EQ(app.OnMessage(AcRx::kLoadDwgMsg, &first), AcRx::kRetOK);
+    EXPECT_EQ(app.OnMessage(AcRx::kLoadDwgMsg, &first), AcRx::kRetOK);
+    EXPECT_EQ(app.OnMessage(AcRx::kLoadDwgMsg, &second), AcRx::kRetOK);
+    EXPECT_EQ(app.OnMessage(AcRx::kUnloadDwgMsg, &first), AcRx::kRetOK);
+    EXPECT_EQ(app.DataManager().Count(), 2u);
+    EXPECT_TRUE(app.DataManager().Knows(&second));
+}
+
+TEST(AppObject, AFailedInitialisationIsAnErrorAndRegistersNothing) {
+    std::vector<std::string> aborts;
+    pyr::SetAbortHandler([&](const std::string& message) { aborts.push_back(message); });
+    pyr::SetSupportPath({});
+    CPyrAppModul app;
+    int id = 7;
+    EXPECT_EQ(app.OnMessage(AcRx::kInitAppMsg, &id), AcRx::kRetError);
+    EXPECT_EQ(app.AppId(), &id);
+    EXPECT_EQ(aborts, std::vector<std::string>{"Impossible de trouver le module <Pyr2000Srv.arx>!!!"});
+    EXPECT_EQ(acedRegCmds()->lookupCmd("CalInter"), nullptr);
+    pyr::SetAbortHandler({});
+}
+
+TEST(CommandTable, SharedHandlersAndNames) {
+    const auto table = CommandTable();
+    ASSERT_EQ(table.size(), 37u);
+    // The eight exports (14 to 21, counted from 1) share one handler and differ by their title; so do
+    // the two editors (22, 23); the reading of a GéoBase into a GéoBase (15) is no export.
+    std::set<std::string> exportTitles;
+    for (size_t i = 13; i < 21; ++i) {
+        if (i == 14) continue;
+        EXPECT_EQ(table[i].handler, table[13].handler) << table[i].globalName;
+        exportTitles.insert(table[i].title);
+    }
+    EXPECT_NE(table[14].handler, table[13].handler);
+    EXPECT_EQ(exportTitles.size(), 7u);
+    EXPECT_EQ(table[21].handler, table[22].handler);
+    EXPECT_STREQ(table[21].title, table[22].title);
+    EXPECT_EQ(table[0].title, nullptr);
+
+    std::set<std::string> names;
+    for (const CommandSpec& command : table) {
+        EXPECT_TRUE(names.insert(pyr::host::kCommandGroup + std::string(command.globalName)).second);
+        EXPECT_TRUE(names.insert(command.localName).second) << command.localName;
+    }
+    EXPECT_STREQ(table[35].title, "gestion d'un table de codes");
+}
+
+TEST(CommandContext, RecordsOnceSetsEchoAndUcsFollowOffAndPutsTheDrawingBack) {
+    pyr::ResetSysVars();
+    acedSetVar("CLAYER", "Stations");
+    acedSetVar("CMDECHO", "1");
+    acedSetVar("UCSFOLLOW", "1");
+    acedSetVar("AFLAGS", "2");
+    {
+        CCmdContext context;
+        context.Open();
+        EXPECT_EQ(SysVar("CMDECHO"), "0");
+        EXPECT_EQ(SysVar("UCSFOLLOW"), "0");
+        EXPECT_EQ(context.Recorded("CLAYER"), "Stations");
+        EXPECT_EQ(context.Recorded("DWGNAME"), "Dessin1.dwg");
+        acedSetVar("CLAYER", "Autre");
+        acedSetVar("AFLAGS", "0");
+        context.Close();
+        EXPECT_EQ(SysVar("CLAYER"), "Stations");
+        EXPECT_EQ(SysVar("AFLAGS"), "2");
+        EXPECT_EQ(SysVar("CMDECHO"), "1");
+
+        // A second opening keeps what the first one recorded.
+        acedSetVar("CLAYER", "Nouveau");
+        context.Open();
+        EXPECT_EQ(context.Recorded("CLAYER"), "Stations");
+        // Left open: the destructor closes it.
+    }
+    EXPECT_EQ(SysVar("CLAYER"), "Stations");
+    EXPECT_EQ(SysVar("UCSFOLLOW"), "1");
+    pyr::ResetSysVars();
+}
+
+} // namespace

@@ -1,0 +1,174 @@
+// The module PyrCalTopo15.arx as its host sees it: loaded through the dynamic linker, with the real
+// services module beside it, its commands run from the host's command stack.
+#include "HostTestSupport.h"
+#include "settings/ParamStore.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+using pyr::host::kCommandGroup;
+using pyr::host::kToolbarGroup;
+using pyr::ui::DialogResult;
+
+const char* const kModule = "PyrCalTopo15.arx";
+
+class Module : public ::testing::Test {
+protected:
+    void SetUp() override {
+        pyr::SetMainWindow(&frontEnd);
+        pyr::SetSupportPath({PYR_PROGRAM_DIR});
+        ASSERT_TRUE(acrxDynamicLinker()->loadModule(ProgramFile(kModule)))
+            << acrxDynamicLinker()->lastError();
+    }
+    void TearDown() override {
+        acrxDynamicLinker()->unloadModule(kModule);
+        acrxDynamicLinker()->unloadAll();
+        pyr::SetMainWindow(nullptr);
+        pyr::SetSupportPath({});
+        pyr::ResetSysVars();
+    }
+
+    bool Run(const char* name) { return acedRegCmds()->runCommand(name); }
+
+    std::vector<std::string> Group() const {
+        std::vector<std::string> names;
+        for (const AcEdCommand& command : acedRegCmds()->commands())
+            if (command.group == kCommandGroup) names.push_back(command.globalName + " " + command.localName);
+        return names;
+    }
+
+    TempDir dir;
+    ScopedEnv params{"PYRALIS_PARAMS", dir / "Pyralis.ini"};
+    RecordingFrontEnd frontEnd;
+};
+
+TEST_F(Module, InitialisationLoadsTheServicesInstallsTheToolbarAndRegistersTheCommandsInOrder) {
+    EXPECT_EQ(acrxDynamicLinker()->loadedModules(),
+              (std::vector<std::string>{ProgramFile(kModule), ProgramFile("Pyr2000Srv.arx")}));
+    ASSERT_NE(RegisteredServices(), nullptr);
+    EXPECT_TRUE(RegisteredServices()->IsModuleRegistered("PyrCalTopo15"));
+    EXPECT_TRUE(RegisteredServices()->IsToolbarVisible(kToolbarGroup));
+    EXPECT_EQ(Group(), (std::vector<std::string>{
+                           "PyrCalTopo15 PyrCalTopo15", "PyraCalcOpt CalcOpt",    "PyraLGeodim LGeodim",
+                           "PyraLNikPsi LNikPsi",       "PyraLNikAtl LNikAtl",    "PyraLNikKps LNikKps",
+                           "PyraLSokkia LSokkia",       "PyraLQuenda LQuenda",    "PyraLSeparat LSeparat",
+                           "PyraLColonne LColonne",     "PyraLTopcon LTopcon",    "PyraLecWild LecWild",
+                           "PyraLZeiss1 LZeiss1",       "PyraEPoints EPoints",    "PyraEGeoBase EGeoBase",
+                           "PyraESeparat ESeparat",     "PyraEColonne EColonne",  "PyraEQuendal EQuendal",
+                           "PyraELeica ELeica",         "PyraESpectra ESpectra",  "PyraESokkia ESokkia",
+                           "PyraGeoEdit GeoEdit",       "PyraGeoEdit2 GeoEdit2",  "PyraCalInter CalInter",
+                           "PyraCalRelev CalRelev",     "PyraCalRecou CalRecou",  "PyraCalExcen CalExcen",
+                           "PyraCalTrian CalTrian",     "PyraCalculV0 CalculV0",  "PyraCalChem CalChem",
+                           "PyraCalRayon CalRayon",     "PyraCalBloc CalBloc",    "PyraCalNivSm CalNivSm",
+                           "PyraCalNivSt CalNivSt",     "PyraAsmCode CalAsmCode", "PyraTabCode CalTabCode",
+                           "PyraDesCode CalDesCode"}));
+    for (const AcEdCommand& command : acedRegCmds()->commands())
+        EXPECT_EQ(command.flags, ACRX_CMD_MODAL) << command.globalName;
+}
+
+TEST_F(Module, UnloadingTakesTheCommandsAndTheToolbarBack) {
+    pyr::host::CPyrMainServices* services = RegisteredServices();
+    ASSERT_TRUE(acrxDynamicLinker()->unloadModule(kModule));
+    EXPECT_TRUE(Group().empty());
+    EXPECT_FALSE(services->IsToolbarInstalled(kToolbarGroup));
+    EXPECT_FALSE(services->IsModuleRegistered("PyrCalTopo15"));
+    EXPECT_FALSE(acrxServiceIsRegistered(pyr::host::kCommandTitlesName));
+}
+
+TEST_F(Module, ACommandAnswersToItsGlobalAndLocalNamesInAnyCase) {
+    for (const char* name : {"PyraCalInter", "calinter", "CalInter"})
+        ASSERT_TRUE(Run(name)) << name;
+    ASSERT_EQ(frontEnd.seen.size(), 3u);
+    for (const auto& seen : frontEnd.seen)
+        EXPECT_EQ(seen.title, "calcul d'un point par intersections de visées");
+    // Not built yet: the command says so, and counts as refused.
+    ASSERT_EQ(frontEnd.messages.size(), 3u);
+    EXPECT_EQ(frontEnd.messages[0].text,
+              "La commande CalInter (calcul d'un point par intersections de visées) "
+              "n'est pas encore disponible dans cette version de PYRALIS Calculs Topo.");
+    EXPECT_EQ(frontEnd.results, std::vector<DialogResult>(3, DialogResult::Failed));
+}
+
+TEST_F(Module, EachExportCommandHandsItsOwnTitleToTheServices) {
+    const std::vector<std::pair<const char*, const char*>> exports = {
+        {"EPoints", "transformation GéoBase -> fichier de points"},
+        {"ESeparat", "transformation GéoBase -> format séparateur"},
+        {"EColonne", "transformation GéoBase -> format colonné"},
+        {"EQuendal", "transformation GéoBase -> carnet Quendal-Pc"},
+        {"ELeica", "transformation GéoBase -> format Leica"},
+        {"ESpectra", "transformation GéoBase -> format Trimble GDM"},
+        {"ESokkia", "transformation GéoBase -> format Sokkia"},
+        {"PyraEPoints", "transformation GéoBase -> fichier de points"}};
+    for (const auto& [name, title] : exports) {
+        ASSERT_TRUE(Run(name));
+        EXPECT_EQ(RegisteredServices()->CommandTitle(), title);
+        EXPECT_EQ(frontEnd.seen.back().title, title);
+    }
+}
+
+TEST_F(Module, WhileADialogRunsTheEchoAndUcsFollowingAreOffAndEverythingComesBackAfter) {
+    acedSetVar("CMDECHO", "1");
+    acedSetVar("UCSFOLLOW", "1");
+    acedSetVar("CLAYER", "Points");
+    frontEnd.layerSetByDialog = "Autre";
+    ASSERT_TRUE(Run("CalculV0"));
+    ASSERT_EQ(frontEnd.seen.size(), 1u);
+    EXPECT_EQ(frontEnd.seen[0].cmdecho, "0");
+    EXPECT_EQ(frontEnd.seen[0].ucsfollow, "0");
+    EXPECT_EQ(frontEnd.seen[0].resources, "PyrCalTopo15");
+    EXPECT_EQ(SysVar("CMDECHO"), "1");
+    EXPECT_EQ(SysVar("UCSFOLLOW"), "1");
+    EXPECT_EQ(SysVar("CLAYER"), "Points");
+    EXPECT_EQ(RegisteredServices()->ResourceModule(), "");
+}
+
+TEST_F(Module, TheLastGeoBaseIsOfferedFirstUnlessAnotherIsNamed) {
+    ASSERT_TRUE(
+        pyr::WriteParamString(dir / "Pyralis.ini", "GeoBase", "Derniere", "/chantiers/lotissement.geo"));
+    ASSERT_TRUE(Run("CalRelev"));
+    frontEnd.dialogArguments = {"--geobase", "/chantiers/autre.geo"};
+    ASSERT_TRUE(Run("CalRelev"));
+    ASSERT_EQ(frontEnd.seen.size(), 2u);
+    EXPECT_EQ(frontEnd.seen[0].geoBase, "/chantiers/lotissement.geo");
+    EXPECT_FALSE(frontEnd.seen[0].geoBaseNamed);
+    EXPECT_EQ(frontEnd.seen[0].paramPath, dir / "Pyralis.ini");
+    EXPECT_EQ(frontEnd.seen[1].geoBase, "/chantiers/autre.geo");
+    EXPECT_TRUE(frontEnd.seen[1].geoBaseNamed);
+}
+
+TEST_F(Module, BothEditorCommandsShowTheGeoBaseAndRecordItAsTheLastOne) {
+    const std::string geo = dir / "petit.geo";
+    WriteBytes(
+        geo,
+        "GEOBASE PYRALIS\t1\n1001\tS1\t1.562\t-999999\n1006\tA1\t651050.118\t6862512.447\t55.021\tXYZ\n");
+    frontEnd.files = {geo};
+    ASSERT_TRUE(Run("GeoEdit"));
+    const std::vector<std::string> first = frontEnd.lines;
+    ASSERT_GE(first.size(), 3u);
+    EXPECT_EQ(first[first.size() - 2].substr(0, 8), "000001  ");
+    EXPECT_EQ(first.back().substr(0, 8), "000002  ");
+
+    // The second editor command is offered the GéoBase just recorded.
+    frontEnd.lines.clear();
+    ASSERT_TRUE(Run("PyraGeoEdit2"));
+    EXPECT_EQ(frontEnd.lines, first);
+    EXPECT_EQ(frontEnd.seen.back().geoBase, geo);
+    EXPECT_EQ(frontEnd.results, (std::vector<DialogResult>{DialogResult::Ok, DialogResult::Ok}));
+}
+
+TEST_F(Module, TheToolbarCommandShowsTheToolbarAgainWithoutADialog) {
+    RegisteredServices()->ShowToolbar(kToolbarGroup, false);
+    ASSERT_TRUE(Run("PyrCalTopo15"));
+    EXPECT_TRUE(RegisteredServices()->IsToolbarVisible(kToolbarGroup));
+    EXPECT_TRUE(frontEnd.seen.empty());
+}
+
+TEST_F(Module, TheTableOfCodesBringsTheScaleServices) {
+    EXPECT_FALSE(acrxServiceIsRegistered(pyr::host::kScaleServicesName));
+    ASSERT_TRUE(Run("CalTabCode"));
+    EXPECT_TRUE(acrxServiceIsRegistered(pyr::host::kScaleServicesName));
+    EXPECT_EQ(frontEnd.seen.back().title, "gestion d'un table de codes");
+}
+
+} // namespace

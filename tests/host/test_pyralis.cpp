@@ -1,0 +1,122 @@
+// The command-line host, run as a person or a script runs it: standard output, standard error and the
+// exit status.
+#include "HostTestSupport.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+
+namespace {
+
+struct Outcome {
+    int status = -1;
+    std::string out;
+    std::string err;
+    std::vector<std::string> OutLines() const {
+        std::vector<std::string> lines;
+        std::string line;
+        for (char c : out) {
+            if (c == '\n') {
+                lines.push_back(line);
+                line.clear();
+            } else {
+                line += c;
+            }
+        }
+        return lines;
+    }
+};
+
+class Pyralis : public ::testing::Test {
+protected:
+    // Runs "pyralis <arguments>" from the test's folder, with its own parameter file.
+    Outcome Run(const std::string& arguments, const std::string& input = "",
+                const std::string& program = ProgramFile("pyralis")) {
+        WriteBytes(dir / "entree.txt", input);
+        const std::string command = "cd '" + dir.Root().string() + "' && '" + program + "' --params '" +
+                                    Params() + "' " + arguments + " <entree.txt >sortie.txt 2>erreurs.txt";
+        Outcome outcome;
+        const int raw = std::system(command.c_str());
+        outcome.status = WIFEXITED(raw) ? WEXITSTATUS(raw) : -1;
+        outcome.out = ReadBytes(dir / "sortie.txt");
+        outcome.err = ReadBytes(dir / "erreurs.txt");
+        return outcome;
+    }
+    std::string Params() const { return dir / "Pyralis.ini"; }
+
+    TempDir dir;
+};
+
+bool Has(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
+
+TEST_F(Pyralis, AloneItListsTheCommandsInRegistrationOrder) {
+    const Outcome outcome = Run("");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    const auto lines = outcome.OutLines();
+    ASSERT_EQ(lines.size(), 37u) << outcome.out;
+    EXPECT_EQ(lines[0].substr(0, 27), "PyrCalTopo15   PyrCalTopo15");
+    EXPECT_EQ(lines[23], "PyraCalInter   CalInter     calcul d'un point par intersections de visées");
+    EXPECT_EQ(lines[35], "PyraTabCode    CalTabCode   gestion d'un table de codes");
+}
+
+TEST_F(Pyralis, ExitStatusSaysWhetherTheCommandRanWasRefusedOrMisused) {
+    for (const char* name : {"calinter", "PyraCalInter", "CALINTER"}) {
+        const Outcome refused = Run(name);
+        EXPECT_EQ(refused.status, 1) << name;
+        EXPECT_TRUE(Has(refused.err, "La commande CalInter (calcul d'un point par intersections de visées) "
+                                     "n'est pas encore disponible"))
+            << refused.err;
+        EXPECT_EQ(refused.out, "");
+    }
+    const Outcome unknown = Run("CalInconnu");
+    EXPECT_EQ(unknown.status, 2);
+    EXPECT_TRUE(Has(unknown.err, "commande inconnue « CalInconnu »")) << unknown.err;
+    const Outcome badOption = Run("CalInter --bidon");
+    EXPECT_EQ(badOption.status, 2);
+    EXPECT_TRUE(Has(badOption.err, "--bidon")) << badOption.err;
+    const Outcome hostOption = Run("--bidon CalInter");
+    EXPECT_EQ(hostOption.status, 2);
+
+    const Outcome help = Run("CalInter --help");
+    EXPECT_EQ(help.status, 0);
+    EXPECT_TRUE(Has(help.out, "--geobase")) << help.out;
+    EXPECT_TRUE(Has(Run("--help").out, "--params"));
+}
+
+TEST_F(Pyralis, TheEditorShowsTheGeoBaseAndTheSecondEditorFindsItAgain) {
+    const std::string demo = std::string(PYR_SOURCE_DIR) + "/data/chantier-demo.geo";
+    const Outcome first = Run("GeoEdit --geobase '" + demo + "'");
+    ASSERT_EQ(first.status, 0) << first.err;
+    const auto lines = first.OutLines();
+    ASSERT_GT(lines.size(), 30u);
+    EXPECT_EQ(lines[1].substr(0, 8), "000001  ");
+    EXPECT_EQ(lines[3], "000003  Appareil      Appareil Standard  0  0  0.0003  0.0003  0.002  2");
+    EXPECT_TRUE(Has(ReadBytes(Params()), "Derniere=" + demo));
+
+    const Outcome second = Run("geoedit2");
+    EXPECT_EQ(second.status, 0) << second.err;
+    EXPECT_EQ(second.out, first.out);
+}
+
+TEST_F(Pyralis, APersonTypesCommandsAtThePrompt) {
+    const Outcome outcome = Run("--interactif", "calinter\n\"PyrCalTopo15\"\nFIN\n");
+    EXPECT_EQ(outcome.status, 0);
+    EXPECT_TRUE(Has(outcome.err, "Commande : ")) << outcome.err;
+    EXPECT_TRUE(Has(outcome.err, "n'est pas encore disponible"));
+    EXPECT_TRUE(Has(outcome.out, "Barre d'outils « Calculs Topo » affichée.")) << outcome.out;
+}
+
+TEST_F(Pyralis, WithoutItsServicesModuleTheHostStops) {
+    // The host and the module alone in a folder: the services are nowhere to be found.
+    namespace fs = std::filesystem;
+    fs::create_directories(dir.Root() / "seul");
+    for (const char* file : {"pyralis", "PyrCalTopo15.arx"})
+        fs::copy_file(ProgramFile(file), dir.Root() / "seul" / file);
+    const Outcome outcome = Run("CalInter", "", dir / "seul/pyralis");
+    EXPECT_NE(outcome.status, 0);
+    EXPECT_TRUE(Has(outcome.err, "Impossible de trouver le module <Pyr2000Srv.arx>!!!")) << outcome.err;
+}
+
+} // namespace
