@@ -1,5 +1,5 @@
 # PYRALIS Calculs Topo: the usual commands.
-#   make demo    install what is missing, build in Release, run the main job on the bundled data
+#   make demo    install what is missing, build in Release, run pyralis on the bundled GéoBase
 #   make check   install what is missing, build with AddressSanitizer and UBSan, run every test
 #   make bench   build in Release and run the benchmarks
 #   make fuzz    build the fuzz targets with clang and run each for FUZZ_SECONDS (60) seconds
@@ -24,9 +24,12 @@ release: deps
 	cmake -S . -B $(RELEASE_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Release -DPYR_TESTS=OFF -DPYR_BENCH=ON
 	cmake --build $(RELEASE_DIR) -j $(JOBS)
 
+# The commands of the module, then the GéoBase editor on the bundled job, with a parameter file of the
+# demo's own (the user's settings are left alone).
 demo: release
 	@mkdir -p $(DEMO_DIR)
-	$(RELEASE_DIR)/apps/pyralis data/chantier-demo.geo $(DEMO_DIR)/chantier-demo-copie.geo
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini </dev/null
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini GeoEdit --geobase data/chantier-demo.geo
 
 check: deps
 	cmake -S . -B $(CHECK_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPYR_SANITIZE=ON -DPYR_WERROR=ON
