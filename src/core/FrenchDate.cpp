@@ -81,11 +81,15 @@ std::string FormatFrenchDate(std::string_view format, const std::tm& when) {
     return out;
 }
 
-std::string FormatFrenchDateNow(std::string_view format) {
+std::tm LocalTimeNow() {
     const std::time_t now = std::time(nullptr);
     std::tm local{};
     localtime_r(&now, &local);
-    return FormatFrenchDate(format, local);
+    return local;
+}
+
+std::string FormatFrenchDateNow(std::string_view format) {
+    return FormatFrenchDate(format, LocalTimeNow());
 }
 
 } // namespace pyr

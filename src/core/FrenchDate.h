@@ -12,5 +12,7 @@ namespace pyr {
 std::string FormatFrenchDate(std::string_view format, const std::tm& when);
 // The same for the present local time.
 std::string FormatFrenchDateNow(std::string_view format);
+// The present local time.
+std::tm LocalTimeNow();
 
 } // namespace pyr
