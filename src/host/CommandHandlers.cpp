@@ -5,6 +5,7 @@
 #include "host/CommandFlow.h"
 #include "host/HostTexts.h"
 #include "host/ServicesLookup.h"
+#include "settings/OptionPages.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
@@ -43,6 +44,10 @@ void OnShowToolbar(const CommandSpec&) {
 
 void OnGeoEdit(const CommandSpec& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CGeoEditor>(); });
+}
+
+void OnCalcOpt(const CommandSpec& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<COptionPSheet>(); });
 }
 
 void OnExport(const CommandSpec& command) {

@@ -10,6 +10,8 @@ namespace pyr::host {
 void OnShowToolbar(const CommandSpec& command);
 // "GeoEdit" and "GeoEdit2": the GéoBase editor.
 void OnGeoEdit(const CommandSpec& command);
+// "CalcOpt": the options sheet of the calculations.
+void OnCalcOpt(const CommandSpec& command);
 // The eight exports of a GéoBase, told apart by their title.
 void OnExport(const CommandSpec& command);
 // "CalTabCode": the table of codes, which needs the scale services too.

@@ -14,7 +14,7 @@ namespace {
 
 constexpr std::array<CommandSpec, 37> kCommands{{
     {"PyrCalTopo15", "PyrCalTopo15", nullptr, OnShowToolbar},
-    {"PyraCalcOpt", "CalcOpt", "options des calculs topométriques.", OnPending},
+    {"PyraCalcOpt", "CalcOpt", "options des calculs topométriques.", OnCalcOpt},
     {"PyraLGeodim", "LGeodim", "transformation carnet Trimble GDM -> GéoBase", OnPending},
     {"PyraLNikPsi", "LNikPsi", "transformation carnet Nikon/Psion -> GéoBase", OnPending},
     {"PyraLNikAtl", "LNikAtl", "transformation carnet Nikon/Atlas -> GéoBase", OnPending},

@@ -100,6 +100,17 @@ TEST_F(Pyralis, TheEditorShowsTheGeoBaseAndTheSecondEditorFindsItAgain) {
     EXPECT_EQ(second.out, first.out);
 }
 
+TEST_F(Pyralis, CalcOptRefusesAnOptionOutOfItsLimitsAndSetsOneWithin) {
+    const Outcome refused = Run("CalcOpt --regler Options_Corrections/RayonTerre=5000");
+    EXPECT_EQ(refused.status, 1);
+    EXPECT_TRUE(Has(refused.err, "la valeur 5000 est hors des limites (6000 à 7000).")) << refused.err;
+    EXPECT_FALSE(std::filesystem::exists(Params()));
+
+    const Outcome set = Run("CalcOpt --regler Options_Corrections/RayonTerre=6378");
+    EXPECT_EQ(set.status, 0) << set.err;
+    EXPECT_TRUE(Has(Run("calcopt --afficher").out, "\nRayonTerre=6378.000000\n"));
+}
+
 TEST_F(Pyralis, APersonTypesCommandsAtThePrompt) {
     const Outcome outcome = Run("--interactif", "calinter\n\"PyrCalTopo15\"\nFIN\n");
     EXPECT_EQ(outcome.status, 0);
