@@ -24,6 +24,11 @@ struct OptionValue {
     std::string text; // texts
 };
 
+// A number typed by a person for a key of that kind (switch, integer or real), read strictly and checked
+// against the limits: empty when accepted (the number in `value`), else the French reason.
+std::string CheckOptionNumber(std::string_view section, std::string_view key, std::string_view text,
+                              OptionType type, double minimum, double maximum, double& value);
+
 class COptionPage {
 public:
     virtual ~COptionPage() = default;
