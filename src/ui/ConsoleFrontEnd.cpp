@@ -4,8 +4,14 @@
 
 #include <algorithm>
 #include <cctype>
+#include <cerrno>
+#include <cstdlib>
+#include <spawn.h>
 #include <string>
+#include <sys/wait.h>
 #include <unistd.h>
+
+extern char** environ;
 
 namespace pyr::ui {
 
@@ -44,6 +50,62 @@ std::string ReadLine(std::FILE* in) {
         line += static_cast<char>(c);
     if (c == EOF && line.empty()) return "\x04"; // end of input: the question takes its default
     return line;
+}
+
+// The words of a command held in an environment variable ("emacs -nw"), split at blanks: no shell
+// reads it, so a path with spaces or quotes reaches the program as one argument.
+std::vector<std::string> CommandWords(const char* command) {
+    std::vector<std::string> words;
+    std::string word;
+    for (const char* c = command; *c; ++c) {
+        if (std::isspace(static_cast<unsigned char>(*c))) {
+            if (!word.empty()) words.push_back(std::move(word));
+            word.clear();
+        } else {
+            word += *c;
+        }
+    }
+    if (!word.empty()) words.push_back(std::move(word));
+    return words;
+}
+
+std::vector<char*> Argv(std::vector<std::string>& words) {
+    std::vector<char*> argv;
+    for (auto& word : words)
+        argv.push_back(word.data());
+    argv.push_back(nullptr);
+    return argv;
+}
+
+// Runs the editor on the file and waits for the person to close it. False when it cannot be started.
+bool RunEditor(const char* command, const std::string& path) {
+    std::vector<std::string> words = CommandWords(command);
+    if (words.empty()) return false;
+    words.push_back(path);
+    std::vector<char*> argv = Argv(words);
+    pid_t pid;
+    if (posix_spawnp(&pid, argv[0], nullptr, nullptr, argv.data(), environ) != 0) return false;
+    int status = 0;
+    while (waitpid(pid, &status, 0) < 0 && errno == EINTR) {
+    }
+    return true;
+}
+
+// Hands the file to the desktop's viewer without waiting for it: an intermediate process starts it and
+// ends at once, so that the viewer belongs to no one here and leaves no zombie behind.
+bool OpenWithDesktop(const std::string& path) {
+    std::vector<std::string> words = {"xdg-open", path};
+    std::vector<char*> argv = Argv(words);
+    pid_t intermediate = fork();
+    if (intermediate < 0) return false;
+    if (intermediate == 0) {
+        pid_t viewer;
+        _exit(posix_spawnp(&viewer, argv[0], nullptr, nullptr, argv.data(), environ) == 0 ? 0 : 127);
+    }
+    int status = 0;
+    while (waitpid(intermediate, &status, 0) < 0 && errno == EINTR) {
+    }
+    return WIFEXITED(status) && WEXITSTATUS(status) == 0;
 }
 
 } // namespace
@@ -99,6 +161,17 @@ std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice)
 
 void ConsoleFrontEnd::TextLine(std::string_view line) {
     std::fprintf(m_out, "%.*s\n", static_cast<int>(line.size()), line.data());
+}
+
+void ConsoleFrontEnd::ShowFile(const std::string& path) {
+    if (m_interactive) {
+        const char* visual = std::getenv("VISUAL");
+        const char* editor = std::getenv("EDITOR");
+        const char* command = visual && *visual ? visual : editor && *editor ? editor : nullptr;
+        if (command ? RunEditor(command, path) : OpenWithDesktop(path)) return;
+    }
+    std::fprintf(m_err, "Fichier à consulter : %s\n", path.c_str());
+    std::fflush(m_err);
 }
 
 void ConsoleFrontEnd::SetCommand(std::string name, std::vector<std::string> arguments) {

@@ -12,7 +12,8 @@ namespace pyr::ui {
 // The terminal: messages to standard error, text-window lines to standard output. Questions are asked
 // at the terminal when standard input is one; otherwise (batch) they take the answer given in advance
 // (--oui / --non) or their default, and say which answer was taken. A dialog takes its options from the
-// words of the command line.
+// words of the command line. A file is shown in the person's editor ($VISUAL, else $EDITOR, else the
+// desktop's viewer through xdg-open) only when a person is there; a batch run names the file instead.
 class ConsoleFrontEnd : public FrontEnd {
 public:
     ConsoleFrontEnd(std::FILE* in = stdin, std::FILE* out = stdout, std::FILE* err = stderr);
@@ -33,6 +34,7 @@ public:
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override;
     DialogResult DoModal(DialogModel& dialog) override;
+    void ShowFile(const std::string& path) override;
 
 private:
     std::FILE* m_in;

@@ -47,6 +47,9 @@ public:
     // Runs a dialog modally, as every command does with its dialog: the front end gives it what the
     // person asked for (its options, on a command line) and runs it until it is closed.
     virtual DialogResult DoModal(DialogModel& dialog) = 0;
+    // Shows a file to the person (a listing once written, a file they asked to see) in the platform's
+    // viewer.
+    virtual void ShowFile(const std::string& path) = 0;
 };
 
 // The application's own front end: what a message without a parent window goes to. The console until a

@@ -26,6 +26,8 @@ public:
     std::vector<std::string> questions;
     std::vector<FileChoice> fileChoices;
     std::vector<std::string> lines;
+    // The files shown to the person, in order.
+    std::vector<std::string> shownFiles;
 
     // The words applied to every dialog run, as a command line would give them, and the name of the
     // command they are given to (for the help and the messages).
@@ -41,6 +43,7 @@ public:
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override { lines.emplace_back(line); }
     DialogResult DoModal(DialogModel& dialog) override;
+    void ShowFile(const std::string& path) override { shownFiles.push_back(path); }
 
     // All text-window lines joined with '\n', for searching in a test.
     std::string AllLines() const;

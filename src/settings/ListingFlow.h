@@ -1,0 +1,38 @@
+#pragma once
+
+#include "settings/ListingKinds.h"
+#include "settings/ListingObject.h"
+#include "ui/FrontEnd.h"
+
+#include <cstddef>
+#include <functional>
+#include <string>
+#include <string_view>
+
+// The listing at the end of a computation, as every computation dialog writes it: the question, the
+// file's name, completing or replacing it, the common heading of each result and the display.
+namespace pyr {
+
+struct ListingRequest {
+    std::string_view paramPath; // the parameter file or registry root of the listing options
+    std::string geobasePath;    // the GéoBase computed: names the listing and heads it
+    ListingKind kind = ListingKind::Intersection;
+    std::size_t resultCount = 0;
+    // Writes the computation's own block for result `index` (0 to resultCount - 1), after the heading.
+    std::function<void(CDlgCfgListing&, std::size_t index)> writeResult;
+    // Writes the tolerances and options the computation used; called in each heading when the option
+    // "EcrireTolérances" is set. May be empty.
+    std::function<void(CDlgCfgListing&)> writeTolerances;
+    // False when the person already asked for the listing ("Fin + Listing"): no question.
+    bool ask = true;
+};
+
+// Writes the listing and returns its path, or "" when nothing was written (no result, No to the
+// question, a file that cannot be opened: a listing is never worth stopping a computation for).
+std::string WriteComputationListing(ui::FrontEnd& frontEnd, const ListingRequest& request);
+
+// The heading of one result: the title, the GéoBase, the date, the tolerances when asked for, an empty
+// line.
+void WriteListingHeading(CDlgCfgListing& listing, const ListingRequest& request, bool writeTolerances);
+
+} // namespace pyr
