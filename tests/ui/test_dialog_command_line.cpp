@@ -1,5 +1,6 @@
 // Dialogs driven from a command line: options applied in the order given, French faults, the help,
 // and what the console and the scripted front end make of each outcome.
+#include "TestSupport.h"
 #include "ui/ConsoleFrontEnd.h"
 #include "ui/DialogCommandLine.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -51,14 +52,6 @@ public:
 
 std::string Hint(const std::string& fault) {
     return fault + "\nVoir : pyralis calvis --help";
-}
-
-std::string Contents(std::FILE* file) {
-    std::rewind(file);
-    std::string text;
-    for (int c; (c = std::fgetc(file)) != EOF;)
-        text += static_cast<char>(c);
-    return text;
 }
 
 } // namespace

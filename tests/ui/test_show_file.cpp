@@ -8,14 +8,6 @@
 
 namespace {
 
-std::string Contents(std::FILE* file) {
-    std::rewind(file);
-    std::string text;
-    for (int c; (c = std::fgetc(file)) != EOF;)
-        text += static_cast<char>(c);
-    return text;
-}
-
 // An "editor" that writes the arguments it was given into a file, one a line, and its command line as
 // $VISUAL would hold it ("sh <script> <marker>"), to check the words and the path that reach it.
 class ShowFile : public ::testing::Test {
