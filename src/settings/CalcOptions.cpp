@@ -116,7 +116,8 @@ std::string ReadTextOf(std::string_view paramPath, const OptionSpec& spec) {
 int ReadDecimals(std::string_view paramPath, std::string_view key) {
     const OptionSpec* spec = FindOptionSpec(kSectionEditor, key);
     const int byDefault = LenientAtoi(spec->defaultValue);
-    std::string_view text = Trimmed(ReadTextOf(paramPath, *spec));
+    const std::string stored = ReadTextOf(paramPath, *spec);
+    const std::string_view text = Trimmed(stored);
     std::string_view digits = text;
     if (!digits.empty() && (digits.front() == '+' || digits.front() == '-')) digits.remove_prefix(1);
     if (digits.empty() || !std::isdigit(static_cast<unsigned char>(digits.front()))) return byDefault;
