@@ -7,6 +7,8 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
+#include <filesystem>
+
 namespace pyr {
 
 namespace {
@@ -47,7 +49,10 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
     CPyrTxtWnd txt(frontEnd);
     CCarnet carnet;
     if (!carnet.Load(&txt, path, {}, 0, &frontEnd)) return ui::DialogResult::Failed;
-    WriteLastGeoBase(Inputs().paramPath, path);
+    // Recorded whole, so that the next command finds it from whatever folder it is run.
+    std::error_code error;
+    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
+    WriteLastGeoBase(Inputs().paramPath, error ? path : absolute.lexically_normal().string());
 
     txt.Print(kOpened, path.c_str(), carnet.GetSize());
     for (int i = 0; i < carnet.GetSize(); ++i)
