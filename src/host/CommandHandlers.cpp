@@ -16,7 +16,7 @@ namespace {
 // The dialog of a command that this version does not have yet: it says so.
 class CDlgPending : public ui::DialogModel {
 public:
-    explicit CDlgPending(const CommandSpec& command) : m_command(command) {}
+    explicit CDlgPending(const CommandEntry& command) : m_command(command) {}
 
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override {
         frontEnd.MessageBox(Sprintf(kMsgNotAvailable, m_command.localName, m_command.title), ui::kCaption,
@@ -25,16 +25,16 @@ public:
     }
 
 private:
-    const CommandSpec& m_command;
+    const CommandEntry& m_command;
 };
 
-void RunPending(const CommandSpec& command) {
+void RunPending(const CommandEntry& command) {
     RunCommandDialog(command.title, [&command] { return std::make_unique<CDlgPending>(command); });
 }
 
 } // namespace
 
-void OnShowToolbar(const CommandSpec&) {
+void OnShowToolbar(const CommandEntry&) {
     CPyrMainServices* services = MainServices();
     if (!services) return;
     services->ShowToolbar(kToolbarGroup, true);
@@ -42,24 +42,24 @@ void OnShowToolbar(const CommandSpec&) {
         CPyrTxtWnd(*parent).Print(kMsgToolbarShown, kToolbarGroup);
 }
 
-void OnGeoEdit(const CommandSpec& command) {
+void OnGeoEdit(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CGeoEditor>(); });
 }
 
-void OnCalcOpt(const CommandSpec& command) {
+void OnCalcOpt(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<COptionPSheet>(); });
 }
 
-void OnExport(const CommandSpec& command) {
+void OnExport(const CommandEntry& command) {
     RunPending(command);
 }
 
-void OnTabCode(const CommandSpec& command) {
+void OnTabCode(const CommandEntry& command) {
     if (!ScaleServices()) return;
     RunPending(command);
 }
 
-void OnPending(const CommandSpec& command) {
+void OnPending(const CommandEntry& command) {
     RunPending(command);
 }
 

@@ -7,16 +7,16 @@
 namespace pyr::host {
 
 // "PyrCalTopo15": shows the toolbar of the application again.
-void OnShowToolbar(const CommandSpec& command);
+void OnShowToolbar(const CommandEntry& command);
 // "GeoEdit" and "GeoEdit2": the GéoBase editor.
-void OnGeoEdit(const CommandSpec& command);
+void OnGeoEdit(const CommandEntry& command);
 // "CalcOpt": the options sheet of the calculations.
-void OnCalcOpt(const CommandSpec& command);
+void OnCalcOpt(const CommandEntry& command);
 // The eight exports of a GéoBase, told apart by their title.
-void OnExport(const CommandSpec& command);
+void OnExport(const CommandEntry& command);
 // "CalTabCode": the table of codes, which needs the scale services too.
-void OnTabCode(const CommandSpec& command);
+void OnTabCode(const CommandEntry& command);
 // A command whose dialog this version does not have yet.
-void OnPending(const CommandSpec& command);
+void OnPending(const CommandEntry& command);
 
 } // namespace pyr::host

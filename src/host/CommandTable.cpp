@@ -12,7 +12,7 @@ namespace pyr::host {
 
 namespace {
 
-constexpr std::array<CommandSpec, 37> kCommands{{
+constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyrCalTopo15", "PyrCalTopo15", nullptr, OnShowToolbar},
     {"PyraCalcOpt", "CalcOpt", "options des calculs topométriques.", OnCalcOpt},
     {"PyraLGeodim", "LGeodim", "transformation carnet Trimble GDM -> GéoBase", OnPending},
@@ -56,7 +56,7 @@ constexpr std::array<CommandSpec, 37> kCommands{{
 class CommandTitles : public CPyrCommandTitles {
 public:
     std::string Title(std::string_view globalName) const override {
-        for (const CommandSpec& command : kCommands)
+        for (const CommandEntry& command : kCommands)
             if (EqualIgnoringCase(command.globalName, globalName)) return command.title ? command.title : "";
         return {};
     }
@@ -66,13 +66,13 @@ CommandTitles g_titles;
 
 } // namespace
 
-std::span<const CommandSpec> CommandTable() {
+std::span<const CommandEntry> CommandTable() {
     return kCommands;
 }
 
 bool RegisterCommands() {
     bool allAdded = true;
-    for (const CommandSpec& command : kCommands)
+    for (const CommandEntry& command : kCommands)
         allAdded &= acedRegCmds()->addCommand(kCommandGroup, command.globalName, command.localName,
                                               ACRX_CMD_MODAL, [&command] { command.handler(command); });
     acrxServiceDictionary()->atPut(kCommandTitlesName, &g_titles);

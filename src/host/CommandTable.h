@@ -4,12 +4,12 @@
 
 namespace pyr::host {
 
-struct CommandSpec;
+struct CommandEntry;
 // A command's handler is given its line of the table: commands that share a handler differ by their
 // title (the export commands: the title selects the format).
-using CommandHandler = void (*)(const CommandSpec& command);
+using CommandHandler = void (*)(const CommandEntry& command);
 
-struct CommandSpec {
+struct CommandEntry {
     const char* globalName;
     const char* localName;
     const char* title; // null for the command that shows the toolbar again
@@ -18,7 +18,7 @@ struct CommandSpec {
 
 // The 37 commands, in the order they are registered (neither alphabetical nor the order of the
 // handlers).
-std::span<const CommandSpec> CommandTable();
+std::span<const CommandEntry> CommandTable();
 
 // Adds every command of the table to the host's command stack, in the table's order, under the group
 // "PYRALIS_FONCTIONS_2D_CALTOPO", and tells the host their titles. False when one could not be added.

@@ -28,7 +28,7 @@ enum class OptionType {
     Text     // written as it is (some texts hold numbers: the editor's decimals)
 };
 
-struct OptionSpec {
+struct OptionEntry {
     std::string_view section;
     std::string_view key;
     OptionType type;
@@ -39,9 +39,9 @@ struct OptionSpec {
 
 // The keys of the fixed sections, section by section in the order of the pages (the numbered keys of
 // the instruments are not in it: see OptionPages.h).
-std::span<const OptionSpec> CalcOptionSpecs();
+std::span<const OptionEntry> CalcOptionTable();
 // The key of that section, or null.
-const OptionSpec* FindOptionSpec(std::string_view section, std::string_view key);
+const OptionEntry* FindOption(std::string_view section, std::string_view key);
 
 // Reads with the table's default and limits, from the parameter path (a file or a registry root). An
 // unknown section or key reads as 0 or "" (a caller's slip, caught by the tests).

@@ -12,7 +12,7 @@ namespace pyr {
 namespace {
 
 std::string ValueText(const OptionValue& value) {
-    switch (value.spec->type) {
+    switch (value.entry->type) {
     case OptionType::Switch:
     case OptionType::Integer:
         return Sprintf("%d", value.integer);
@@ -56,30 +56,30 @@ std::string CheckOptionNumber(std::string_view section, std::string_view key, st
 // --- A page of the table ------------------------------------------------------------------------------
 
 COptionPage::COptionPage(std::string_view section) : m_section(section) {
-    for (const auto& spec : CalcOptionSpecs()) {
-        if (spec.section != section) continue;
+    for (const auto& entry : CalcOptionTable()) {
+        if (entry.section != section) continue;
         OptionValue value;
-        value.spec = &spec;
-        value.integer = LenientAtoi(spec.defaultValue);
-        value.real = LenientAtof(spec.defaultValue);
-        value.text = spec.defaultValue;
+        value.entry = &entry;
+        value.integer = LenientAtoi(entry.defaultValue);
+        value.real = LenientAtof(entry.defaultValue);
+        value.text = entry.defaultValue;
         m_values.push_back(std::move(value));
     }
 }
 
 void COptionPage::Read(std::string_view paramPath) {
     for (auto& value : m_values) {
-        const OptionSpec& spec = *value.spec;
-        switch (spec.type) {
+        const OptionEntry& entry = *value.entry;
+        switch (entry.type) {
         case OptionType::Switch:
         case OptionType::Integer:
-            value.integer = ReadOptionInt(paramPath, spec.section, spec.key);
+            value.integer = ReadOptionInt(paramPath, entry.section, entry.key);
             break;
         case OptionType::Real:
-            value.real = ReadOptionReal(paramPath, spec.section, spec.key);
+            value.real = ReadOptionReal(paramPath, entry.section, entry.key);
             break;
         case OptionType::Text:
-            value.text = ReadOptionText(paramPath, spec.section, spec.key);
+            value.text = ReadOptionText(paramPath, entry.section, entry.key);
             break;
         }
     }
@@ -88,23 +88,24 @@ void COptionPage::Read(std::string_view paramPath) {
 bool COptionPage::Write(std::string_view paramPath) const {
     bool written = true;
     for (const auto& value : m_values)
-        written = WriteKey(paramPath, value.spec->key) && written;
+        written = WriteKey(paramPath, value.entry->key) && written;
     return written;
 }
 
 bool COptionPage::WriteKey(std::string_view paramPath, std::string_view key) const {
     const OptionValue* value = Find(key);
     if (!value) return false;
-    const OptionSpec& spec = *value->spec;
-    switch (spec.type) {
+    const OptionEntry& entry = *value->entry;
+    switch (entry.type) {
     case OptionType::Switch:
-        return WriteParamBool(paramPath, spec.section, spec.key, static_cast<unsigned char>(value->integer));
+        return WriteParamBool(paramPath, entry.section, entry.key,
+                              static_cast<unsigned char>(value->integer));
     case OptionType::Integer:
-        return WriteParamInt(paramPath, spec.section, spec.key, value->integer);
+        return WriteParamInt(paramPath, entry.section, entry.key, value->integer);
     case OptionType::Real:
-        return WriteParamDouble(paramPath, spec.section, spec.key, value->real);
+        return WriteParamDouble(paramPath, entry.section, entry.key, value->real);
     case OptionType::Text:
-        return WriteParamString(paramPath, spec.section, spec.key, value->text);
+        return WriteParamString(paramPath, entry.section, entry.key, value->text);
     }
     return false;
 }
@@ -112,23 +113,23 @@ bool COptionPage::WriteKey(std::string_view paramPath, std::string_view key) con
 std::vector<std::string> COptionPage::Lines() const {
     std::vector<std::string> lines{"[" + std::string(m_section) + "]"};
     for (const auto& value : m_values)
-        lines.push_back(std::string(value.spec->key) + "=" + ValueText(value));
+        lines.push_back(std::string(value.entry->key) + "=" + ValueText(value));
     return lines;
 }
 
 std::string COptionPage::Set(std::string_view key, std::string_view text) {
     OptionValue* value = Find(key);
     if (!value) return Sprintf(kMsgUnknownKey, std::string(m_section).c_str(), std::string(key).c_str());
-    const OptionSpec& spec = *value->spec;
-    if (spec.type == OptionType::Text) {
+    const OptionEntry& entry = *value->entry;
+    if (entry.type == OptionType::Text) {
         value->text = text;
         return {};
     }
     double number = 0;
     std::string refusal =
-        CheckOptionNumber(spec.section, spec.key, text, spec.type, spec.minimum, spec.maximum, number);
+        CheckOptionNumber(entry.section, entry.key, text, entry.type, entry.minimum, entry.maximum, number);
     if (!refusal.empty()) return refusal;
-    if (spec.type == OptionType::Real)
+    if (entry.type == OptionType::Real)
         value->real = number;
     else
         value->integer = static_cast<int>(number);
@@ -138,7 +139,7 @@ std::string COptionPage::Set(std::string_view key, std::string_view text) {
 std::pair<std::string, std::string> COptionPage::KeyAndValue(std::string_view key) const {
     const OptionValue* value = Find(key);
     if (!value) return {std::string(key), {}};
-    return {std::string(value->spec->key), ValueText(*value)};
+    return {std::string(value->entry->key), ValueText(*value)};
 }
 
 int COptionPage::Int(std::string_view key) const {
@@ -160,13 +161,13 @@ const std::string& COptionPage::Text(std::string_view key) const {
 void COptionPage::SetInt(std::string_view key, int value) {
     if (OptionValue* held = Find(key))
         held->integer =
-            std::clamp(value, static_cast<int>(held->spec->minimum), static_cast<int>(held->spec->maximum));
+            std::clamp(value, static_cast<int>(held->entry->minimum), static_cast<int>(held->entry->maximum));
 }
 
 void COptionPage::SetReal(std::string_view key, double value) {
     if (OptionValue* held = Find(key))
         held->real =
-            value >= held->spec->minimum ? std::min(value, held->spec->maximum) : held->spec->minimum;
+            value >= held->entry->minimum ? std::min(value, held->entry->maximum) : held->entry->minimum;
 }
 
 void COptionPage::SetText(std::string_view key, std::string value) {
@@ -175,7 +176,7 @@ void COptionPage::SetText(std::string_view key, std::string value) {
 
 const OptionValue* COptionPage::Find(std::string_view key) const {
     for (const auto& value : m_values)
-        if (EqualIgnoringCase(value.spec->key, key)) return &value;
+        if (EqualIgnoringCase(value.entry->key, key)) return &value;
     return nullptr;
 }
 

@@ -18,7 +18,7 @@ namespace pyr {
 
 // One value of a page.
 struct OptionValue {
-    const OptionSpec* spec = nullptr;
+    const OptionEntry* entry = nullptr;
     int integer = 0;  // switches and integers
     double real = 0;  // reals
     std::string text; // texts

@@ -11,7 +11,7 @@
 // Printf-style texts use the C locale's decimal point: the host programs never change LC_NUMERIC.
 namespace pyr::ui {
 
-// Message box icons, with the values the messages of the program are specified with.
+// Message box icons, with the values the system gives them (16 error, 48 warning ...).
 enum Icon : int {
     kIconNone = 0,
     kIconError = 16,

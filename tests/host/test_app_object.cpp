@@ -74,7 +74,7 @@ TEST(CommandTable, SharedHandlersAndNames) {
     EXPECT_EQ(table[0].title, nullptr);
 
     std::set<std::string> names;
-    for (const CommandSpec& command : table) {
+    for (const CommandEntry& command : table) {
         EXPECT_TRUE(names.insert(pyr::host::kCommandGroup + std::string(command.globalName)).second);
         EXPECT_TRUE(names.insert(command.localName).second) << command.localName;
     }

@@ -65,12 +65,13 @@ TEST_F(CalcOptions, MissingSectionsGiveTheDefaultsWhichLieWithinTheirLimits) {
     EXPECT_EQ(ReadOptionText(path, "Options_Inconnues", "Projection"), "");
 
     // A default outside its limits would be changed by every read.
-    for (const auto& spec : CalcOptionSpecs()) {
-        if (spec.type == OptionType::Text) continue;
-        const double byDefault = std::stod(std::string(spec.defaultValue));
-        EXPECT_TRUE(byDefault >= spec.minimum && byDefault <= spec.maximum)
-            << spec.section << "/" << spec.key;
-        EXPECT_EQ(ReadOptionReal(path, spec.section, spec.key), byDefault) << spec.section << "/" << spec.key;
+    for (const auto& entry : CalcOptionTable()) {
+        if (entry.type == OptionType::Text) continue;
+        const double byDefault = std::stod(std::string(entry.defaultValue));
+        EXPECT_TRUE(byDefault >= entry.minimum && byDefault <= entry.maximum)
+            << entry.section << "/" << entry.key;
+        EXPECT_EQ(ReadOptionReal(path, entry.section, entry.key), byDefault)
+            << entry.section << "/" << entry.key;
     }
 
     COptionPSheet sheet = Sheet();
