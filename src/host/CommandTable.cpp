@@ -27,7 +27,7 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraLecWild", "LecWild", "transformation carnet Wild -> GéoBase", OnPending},
     {"PyraLZeiss1", "LZeiss1", "transformation carnet Trimble Zeiss -> GéoBase", OnPending},
     {"PyraEPoints", "EPoints", "transformation GéoBase -> fichier de points", OnExport},
-    {"PyraEGeoBase", "EGeoBase", "transformation GéoBase -> GéoBase", OnPending},
+    {"PyraEGeoBase", "EGeoBase", "transformation GéoBase -> GéoBase", OnExport},
     {"PyraESeparat", "ESeparat", "transformation GéoBase -> format séparateur", OnExport},
     {"PyraEColonne", "EColonne", "transformation GéoBase -> format colonné", OnExport},
     {"PyraEQuendal", "EQuendal", "transformation GéoBase -> carnet Quendal-Pc", OnExport},
