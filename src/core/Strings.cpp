@@ -1,6 +1,8 @@
 #include "core/Strings.h"
 
+#include <clocale>
 #include <cstdio>
+#include <locale.h>
 
 namespace pyr {
 
@@ -13,6 +15,10 @@ std::string Sprintf(const char* format, ...) {
 }
 
 std::string VSprintf(const char* format, std::va_list args) {
+    // The C locale for the length of the call, on this thread only: "%f" writes '.' whatever the
+    // user's LC_NUMERIC, and the process's locale is left as it is.
+    static const locale_t cLocale = newlocale(LC_ALL_MASK, "C", nullptr);
+    const locale_t previous = cLocale ? uselocale(cLocale) : nullptr;
     std::va_list again;
     va_copy(again, args);
     const int size = std::vsnprintf(nullptr, 0, format, args);
@@ -22,6 +28,7 @@ std::string VSprintf(const char* format, std::va_list args) {
         std::vsnprintf(text.data(), text.size() + 1, format, again);
     }
     va_end(again);
+    if (previous) uselocale(previous);
     return text;
 }
 

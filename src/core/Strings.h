@@ -6,7 +6,8 @@
 
 namespace pyr {
 
-// printf into a string, for the program's messages (their formats are given as they stand).
+// printf into a string, for the program's messages (their formats are given as they stand), always with
+// the C locale's decimal point.
 std::string Sprintf(const char* format, ...) __attribute__((format(printf, 1, 2)));
 std::string VSprintf(const char* format, std::va_list args) __attribute__((format(printf, 1, 0)));
 

@@ -1,6 +1,7 @@
 #include "editor/GeoEditor.h"
 
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 #include "geobase/Carnet.h"
 #include "geobase/GeoFile.h"
 #include "settings/LastGeoBase.h"
@@ -28,13 +29,7 @@ std::string EditorLine(const CCarnet& carnet, int index) {
     std::string values;
     for (char c : fields)
         values += c == '\t' ? std::string("  ") : std::string(1, c);
-    std::string label(KindLabel(kind));
-    // Accented labels: pad by characters, not bytes.
-    int width = 0;
-    for (unsigned char c : label)
-        width += (c & 0xC0) != 0x80;
-    if (width < kKindColumn) label.append(static_cast<size_t>(kKindColumn - width), ' ');
-    return Sprintf("%06d  %s%s", index + 1, label.c_str(), values.c_str());
+    return Sprintf("%06d  %s%s", index + 1, PadRight(KindLabel(kind), kKindColumn).c_str(), values.c_str());
 }
 
 ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {

@@ -1,14 +1,13 @@
 #include "settings/ListingObject.h"
 
 #include "core/Files.h"
+#include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "settings/ParamStore.h"
 
 #include <algorithm>
-#include <clocale>
 #include <cstdarg>
 #include <filesystem>
-#include <locale.h>
 
 namespace pyr {
 
@@ -17,28 +16,6 @@ namespace {
 // Lines of a plain-text page's footer, with the page count: a separator and the page number.
 constexpr int kFooterLines = 2;
 constexpr std::string_view kHeaderName = "PYRALIS Calculs Topo";
-
-// Formats under the C locale for the length of the call, so that "%f" writes '.' whatever the user's
-// LC_NUMERIC, without touching the process's locale.
-std::string FormatInCLocale(const char* format, std::va_list args) {
-    static locale_t cLocale = newlocale(LC_ALL_MASK, "C", nullptr);
-    locale_t previous = cLocale ? uselocale(cLocale) : nullptr;
-    std::va_list copy;
-    va_copy(copy, args);
-    char small[512];
-    int length = std::vsnprintf(small, sizeof small, format, copy);
-    va_end(copy);
-    std::string text;
-    if (length >= 0 && static_cast<std::size_t>(length) < sizeof small) {
-        text.assign(small, static_cast<std::size_t>(length));
-    } else if (length >= 0) {
-        text.resize(static_cast<std::size_t>(length) + 1);
-        std::vsnprintf(text.data(), text.size(), format, args);
-        text.resize(static_cast<std::size_t>(length));
-    }
-    if (previous) uselocale(previous);
-    return text;
-}
 
 } // namespace
 
@@ -195,7 +172,7 @@ void CDlgCfgListing::WriteFooter() {
 int CDlgCfgListing::WriteLine(const char* format, ...) {
     std::va_list args;
     va_start(args, format);
-    std::string text = FormatInCLocale(format, args);
+    std::string text = VSprintf(format, args);
     va_end(args);
     return Emit(text);
 }

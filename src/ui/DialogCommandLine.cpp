@@ -4,6 +4,8 @@
 // as its value) are refused before it runs.
 #include "ui/DialogCommandLine.h"
 
+#include "core/TextEncoding.h"
+
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cctype>
@@ -101,12 +103,6 @@ std::optional<CommandLineOutcome> CheckValues(const DialogOptions& options, std:
     return std::nullopt;
 }
 
-// The width of a UTF-8 text on a terminal: one column per character.
-std::size_t Columns(std::string_view text) {
-    return static_cast<std::size_t>(std::count_if(
-        text.begin(), text.end(), [](char c) { return (static_cast<unsigned char>(c) & 0xC0) != 0x80; }));
-}
-
 } // namespace
 
 CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view command,
@@ -193,7 +189,7 @@ std::string DialogHelp(DialogModel& dialog, std::string_view command) {
 
     std::size_t column = 0;
     for (const auto& entry : entries)
-        column = std::max(column, Columns(entry.first));
+        column = std::max(column, Utf8Length(entry.first));
 
     std::string text = "Usage : ";
     text += kProgram;
@@ -204,7 +200,7 @@ std::string DialogHelp(DialogModel& dialog, std::string_view command) {
     text += "\nOptions :\n";
     for (const auto& [left, help] : entries) {
         text += "  " + left;
-        text.append(column - Columns(left) + 3, ' ');
+        text.append(column - Utf8Length(left) + 3, ' ');
         text += help + '\n';
     }
     text += "  ";

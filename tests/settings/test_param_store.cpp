@@ -6,6 +6,7 @@
 
 #include <cerrno>
 #include <clocale>
+#include <cstdio>
 #include <gtest/gtest.h>
 #include <string>
 #include <tuple>
@@ -149,14 +150,18 @@ TEST_F(ParamStore, FilesThatCannotBeWrittenOrReadAreLeftAloneAndNamedWithTheSyst
 TEST_F(ParamStore, NumbersKeepTheirDecimalPointUnderAFrenchLocale) {
     const std::string previous = std::setlocale(LC_ALL, nullptr);
     if (!std::setlocale(LC_ALL, "fr_FR.UTF-8")) GTEST_SKIP() << "fr_FR.UTF-8 is not installed";
-    const std::string localeText = Sprintf("%.1f", 2.5);
+    char localeText[16];
+    std::snprintf(localeText, sizeof localeText, "%.1f", 2.5);
+    const std::string messageText = Sprintf("%.1f", 2.5);
     WriteParamDouble(path, "A", "Reel", 2.5);
     double real = 0;
     ReadParamDouble(path, "A", "Reel", 0, 0, 10, real);
     const std::string decimals = FormatDecimals(1234.5678, 2);
     std::setlocale(LC_ALL, previous.c_str());
 
-    EXPECT_EQ(localeText, "2,5") << "without a decimal comma in the locale this test proves nothing";
+    EXPECT_EQ(std::string(localeText), "2,5")
+        << "without a decimal comma in the locale this test proves nothing";
+    EXPECT_EQ(messageText, "2.5");
     EXPECT_EQ(ReadBytes(path), "[A]\nReel=2.500000\n");
     EXPECT_EQ(real, 2.5);
     EXPECT_EQ(decimals, "1234.57");
