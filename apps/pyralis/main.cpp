@@ -9,6 +9,7 @@
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
+#include <optional>
 #include <string>
 #include <unistd.h>
 #include <vector>
@@ -69,19 +70,11 @@ int RunCommand(pyr::ui::ConsoleFrontEnd& console, const std::string& name, std::
 }
 
 void Prompt(pyr::ui::ConsoleFrontEnd& console) {
-    std::string line;
-    while (true) {
-        std::fputs("Commande : ", stderr);
-        std::fflush(stderr);
-        line.clear();
-        int c;
-        while ((c = std::fgetc(stdin)) != EOF && c != '\n')
-            line += static_cast<char>(c);
-        if (c == EOF && line.empty()) break;
-        std::vector<std::string> words = SplitCommandLine(line);
+    while (std::optional<std::string> line = console.Prompt("Commande : ")) {
+        std::vector<std::string> words = SplitCommandLine(*line);
         if (words.empty()) continue;
         const std::string name = words.front();
-        if (name == "FIN" || name == "fin" || name == "QUITTER" || name == "quitter") break;
+        if (name == "FIN" || name == "fin" || name == "QUITTER" || name == "quitter") return;
         if (name == "?" || name == "AIDE" || name == "aide") {
             ListCommands();
             continue;

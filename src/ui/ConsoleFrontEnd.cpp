@@ -159,6 +159,14 @@ std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice)
     return line;
 }
 
+std::optional<std::string> ConsoleFrontEnd::Prompt(std::string_view prompt) {
+    std::fprintf(m_err, "%.*s", static_cast<int>(prompt.size()), prompt.data());
+    std::fflush(m_err);
+    std::string line = ReadLine(m_in);
+    if (line == "\x04") return std::nullopt;
+    return line;
+}
+
 void ConsoleFrontEnd::TextLine(std::string_view line) {
     std::fprintf(m_out, "%.*s\n", static_cast<int>(line.size()), line.data());
 }

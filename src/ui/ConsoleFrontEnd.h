@@ -27,6 +27,8 @@ public:
     // message said why), 2 bad usage; the worst of its dialogs when it runs several. SetCommand resets it
     // to 0.
     int Status() const { return m_status; }
+    // Shows the prompt on the error stream and reads the line typed; nothing at the end of the input.
+    std::optional<std::string> Prompt(std::string_view prompt);
 
     void MessageBox(std::string_view text, std::string_view caption, int icon) override;
     Answer Ask(std::string_view text, std::string_view caption, Buttons buttons, Answer byDefault,
