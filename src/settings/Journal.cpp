@@ -11,12 +11,6 @@
 
 namespace pyr {
 
-namespace {
-
-constexpr const char* kDateFormat = "%A %d %B %Y à %H h %M mn";
-
-} // namespace
-
 std::string JournalPath(std::string_view geoBasePath) {
     std::filesystem::path path{std::string(geoBasePath)};
     path.replace_extension("jnl");
@@ -24,7 +18,7 @@ std::string JournalPath(std::string_view geoBasePath) {
 }
 
 std::string JournalHeader(std::string_view computation, const std::tm& when) {
-    return "\n\n" + FormatFrenchDate(kDateFormat, when) + " - " + std::string(computation);
+    return "\n\n" + FormatFrenchDate(kComputationDateFormat, when) + " - " + std::string(computation);
 }
 
 std::string JournalPointLine(std::string_view mat, double x, double y, double z, bool yFirst) {

@@ -76,7 +76,7 @@ std::string CDlgCfgListing::FormatAngl(double value, int decimals, bool wrap) co
 }
 
 std::string CDlgCfgListing::FormatTime() {
-    return FormatFrenchDateNow("%A %d %B %Y à %H h %M mn");
+    return FormatFrenchDateNow(kComputationDateFormat);
 }
 
 } // namespace pyr
