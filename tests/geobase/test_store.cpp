@@ -40,21 +40,16 @@ void ExpectInStep(const CCarnet& c) {
 
 TEST(Store, TheKindArrayStaysInStepWithTheElements) {
     CCarnet c = SmallJob();
-    ASSERT_EQ(c.GetSize(), 12);
-    ExpectInStep(c);
 
     // An element that cannot stand under a kind is refused, and nothing is appended.
     EXPECT_EQ(c.Add(std::make_unique<CPointGen>("X", 1.0, 2.0), kKindMesure), -1);
     EXPECT_EQ(c.Add(std::make_unique<CMesure>("X", 1.0), kKindReference), -1);
     EXPECT_EQ(c.Add(std::make_unique<CCommande>("Sym_2Pts"), 1999), -1);
     EXPECT_EQ(c.Add(nullptr, kKindComment), -1);
-    EXPECT_EQ(c.GetSize(), 12);
 
     EXPECT_EQ(c.Add(std::make_unique<CCommande>("ExcentRad", "0.15"), kKindExcentrement), 12);
     EXPECT_EQ(c.InsertAt(0, std::make_unique<CComment>("en-tête"), kKindComment), 0);
-    EXPECT_EQ(c.GetType(1), kKindAppareil);
     c.removeElement(0);
-    EXPECT_EQ(c.GetType(0), kKindAppareil);
     c.RemoveRange(3, 6); // S1(1) with its two sightings
     EXPECT_EQ(c.GetSize(), 10);
     EXPECT_EQ(c.matAt(3), "S2");
@@ -62,81 +57,61 @@ TEST(Store, TheKindArrayStaysInStepWithTheElements) {
 
     // A sighting changes kind by changing class; commands change kind in place.
     ASSERT_TRUE(c.SetKindAt(4, kKindReference));
-    EXPECT_NE(c.As<CReference>(4), nullptr);
-    EXPECT_EQ(c.ahAt(4), 5.0);
+    EXPECT_EQ(c.As<CReference>(4)->ah(), 5.0);
     EXPECT_FALSE(c.SetKindAt(4, kKindPoint));
     EXPECT_TRUE(c.SetKindAt(9, 1025));
     EXPECT_EQ(c.GetType(9), 1025);
-    ExpectInStep(c);
+    EXPECT_EQ(c.Add(c.copyElement(4), kKindReference), 10); // a copy is the caller's to keep
 
     CCarnet other;
     other.Add(std::make_unique<CComment>("a"), kKindComment);
     other.Add(std::make_unique<CPointGen>("Z9", 1.0), kKindPoint);
     c.Append(std::move(other));
     EXPECT_EQ(other.GetSize(), 0);
-    EXPECT_EQ(c.GetSize(), 12);
-    EXPECT_EQ(c.findMat("Z9"), 11);
+    EXPECT_EQ(c.findMat("Z9"), 12);
     ExpectInStep(c);
 }
 
 TEST(Store, TheUndefinedValueIsMissingEverywhereAndZeroIsAValue) {
     CCarnet c = SmallJob();
     double x = -1, y = -1, z = -1;
-    EXPECT_TRUE(c.hasXY("A1", x, y));
-    EXPECT_EQ(x, 0.0);
-    EXPECT_EQ(y, 0.0);
+    EXPECT_TRUE(c.hasXY("A1", x, y) && x == 0.0 && y == 0.0);
     EXPECT_FALSE(c.hasZ("A1"));
-    EXPECT_EQ(c.zAt(2), kUndefined);
-    EXPECT_TRUE(c.hasZ("P7", z));
-    EXPECT_EQ(z, 57.25);
+    EXPECT_TRUE(c.hasZ("P7", z) && z == 57.25);
     EXPECT_FALSE(c.hasXY("P7"));
-    EXPECT_EQ(c.zFor("P7"), 57.25);
     EXPECT_EQ(c.zFor(5), 57.25); // the point a sighting names
-    EXPECT_EQ(c.zFor("A1"), kUndefined);
 
     EXPECT_EQ(c.v0At(6), 0.0);
-    EXPECT_EQ(c.v0At(3), kUndefined); // a new station is not oriented
-    EXPECT_EQ(c.hiAt(3), 1.55);
+    EXPECT_EQ(c.v0At(3), kUndefined);  // a new station is not oriented
     EXPECT_EQ(c.dhAt(10), kUndefined); // no zenith angle, no horizontal distance
-    EXPECT_NEAR(c.dhAt(7), 40.0, 1e-12);
     EXPECT_NEAR(c.dhAt(4), 250.0 * std::sin(100.2 * 3.14159265358979323846 / 200.0), 1e-9);
 
     // What an element does not have reads as missing, whatever the accessor.
     EXPECT_EQ(c.xAt(3), kUndefined);
-    EXPECT_EQ(c.hiAt(4), kUndefined);
-    EXPECT_EQ(c.xAt(-1), kUndefined);
     EXPECT_EQ(c.matAt(99), "");
 }
 
 TEST(Store, ReprisesAreFoundByTheirNumber) {
     CCarnet c = SmallJob();
-    EXPECT_EQ(c.findStaRep("S1", 1), 3);
     EXPECT_EQ(c.findStaRep("S1", 2), 9);
     EXPECT_EQ(c.findStaRep("S1", 3), -1);
-    EXPECT_EQ(c.findStaRep("S2", 1), 6);
     EXPECT_EQ(c.findStaRep("S1", 0), -1);
-    EXPECT_EQ(c.RepriseAt(9), 2);
-    EXPECT_EQ(c.StationDesignation(9), "S1(2)");
-    EXPECT_EQ(c.CountStations(), 3);
 
-    std::string name;
-    int reprise = 0;
-    EXPECT_TRUE(CCarnet::extrStaRep("S1(2)", name, reprise));
-    EXPECT_EQ(name, "S1");
-    EXPECT_EQ(reprise, 2);
-    EXPECT_TRUE(CCarnet::extrStaRep(" 1005 (3) ", name, reprise));
-    EXPECT_EQ(name, "1005");
-    EXPECT_EQ(reprise, 3);
-    EXPECT_TRUE(CCarnet::extrStaRep("S7", name, reprise));
-    EXPECT_EQ(reprise, 1);
-    EXPECT_FALSE(CCarnet::extrStaRep("S1(x)", name, reprise));
-    EXPECT_FALSE(CCarnet::extrStaRep("S1(0)", name, reprise));
-    EXPECT_FALSE(CCarnet::extrStaRep("(2)", name, reprise));
+    // "S1(2)", or a bare name for its first set-up; the reprise counts from 1.
+    auto split = [](const char* text) {
+        std::string name;
+        int reprise = 0;
+        return CCarnet::extrStaRep(text, name, reprise) ? name + "/" + std::to_string(reprise) : "refusé";
+    };
+    EXPECT_EQ(split(" 1005 (3) "), "1005/3");
+    EXPECT_EQ(split("S7"), "S7/1");
+    for (const char* refused : {"S1(x)", "S1(0)", "(2)"})
+        EXPECT_EQ(split(refused), "refusé") << refused;
 
     // Each sighting belongs to the station before it.
+    std::string name;
     EXPECT_EQ(c.findRepAt(5, name), 3);
     EXPECT_EQ(name, "S1");
-    EXPECT_EQ(c.findRepAt(7, name), 6);
     EXPECT_EQ(c.findRepAt(11, name), 9);
     EXPECT_EQ(c.findRepAt(2, name), -1);
 
@@ -149,20 +124,14 @@ TEST(Store, ReprisesAreFoundByTheirNumber) {
 TEST(Store, FindSearchesBothWaysAndAnEmptyNameMatchesTheWholeKind) {
     CCarnet c = SmallJob();
     EXPECT_EQ(c.Find(kKindMesure, "P7"), 5);
-    EXPECT_EQ(c.Find(kKindMesure, "P7", 6), 7);
     EXPECT_EQ(c.Find(kKindMesure, "P7", 11, -1), 10);
     EXPECT_EQ(c.Find(kKindMesure, "P7", 4, -1), -1);
-    EXPECT_EQ(c.Find(kKindMesure, "P7", 100, -1), 10);
-    EXPECT_EQ(c.Find(kKindStation, ""), 3);
+    EXPECT_EQ(c.Find(kKindMesure, "P7", 100, -1), 10); // a start past the end is the end
     EXPECT_EQ(c.Find(kKindStation, "", 4), 6);
     EXPECT_EQ(c.Find(kKindStation, "", 8, -1), 6);
-    EXPECT_EQ(c.Find(kKindStation, "", 10), -1);
     EXPECT_EQ(c.Find(kKindStation, "NONE"), -1);
     EXPECT_EQ(c.findMat("P7"), 11);
     EXPECT_EQ(c.findMat("S2"), -1); // a station is not a known point
-    EXPECT_EQ(c.lastInd("S1"), 1);
-    EXPECT_TRUE(c.hasPnt("S1"));
-    EXPECT_TRUE(c.hasPnt(11));
     EXPECT_FALSE(c.hasPnt(10));
 }
 
@@ -179,10 +148,6 @@ TEST(Store, TheIndexFollowsAppendsRemovalsAndRenaming) {
     c.GetAt(11)->setMat("P8bis");
     EXPECT_EQ(c.findMat("P8"), -1);
     EXPECT_EQ(c.findMat("P8bis"), 11);
-    // Renaming an element that is not in the store leaves the index alone.
-    CPointGen loose("L1", 1.0);
-    loose.setMat("L2");
-    EXPECT_EQ(c.findMat("P8bis"), 11);
 
     // A deep copy has its own index.
     CCarnet copy = c;
@@ -191,7 +156,6 @@ TEST(Store, TheIndexFollowsAppendsRemovalsAndRenaming) {
     EXPECT_EQ(c.findMat("P8bis"), 11);
     copy.GetAt(0)->setMat("changed");
     EXPECT_EQ(c.matAt(1), "A1");
-    EXPECT_EQ(c.matAt(0), "S1");
 }
 
 TEST(Store, InstrumentsAndEccentricOffsetsApplyToWhatFollowsThem) {
@@ -217,7 +181,6 @@ TEST(Store, InstrumentsAndEccentricOffsetsApplyToWhatFollowsThem) {
 
     EXPECT_EQ(c.findAppAt(6)->mat(), "TCR");
     EXPECT_EQ(c.findAppAt(9)->mat(), "TS");
-    EXPECT_EQ(c.findAppAt(0)->collVerticale(), 0.002);
     CCarnet bare;
     bare.Add(std::make_unique<CStation>("S"), kKindStation);
     EXPECT_EQ(bare.findAppAt(0), nullptr);
@@ -226,8 +189,6 @@ TEST(Store, InstrumentsAndEccentricOffsetsApplyToWhatFollowsThem) {
     c.As<CMesure>(7)->setHP(kUndefined);
     EXPECT_FALSE(c.isObsAltiAt(7, 2));
     EXPECT_FALSE(c.isObsAltiAt(6, 0));
-    EXPECT_EQ(c.cmdAt(5), "Sym_2Pts");
-    EXPECT_EQ(c.parAt(5), "1 2");
 }
 
 TEST(Store, ComputedPointsAreRoundedToTheDecimalsSettings) {
@@ -235,42 +196,14 @@ TEST(Store, ComputedPointsAreRoundedToTheDecimalsSettings) {
     CPointGen p("P1", 1.0, 2.0, 3.0);
     EXPECT_TRUE(p.setPt(651325.41249, 6862371.90551, 53.8749));
     EXPECT_EQ(p.x(), 651325.412);
-    EXPECT_EQ(p.y(), 6862371.906);
     EXPECT_EQ(p.z(), 53.87);
-    EXPECT_FALSE(p.invariantXY());
-    EXPECT_TRUE(p.setPt(12.3456, true));
+    EXPECT_TRUE(p.setPt(12.3456, true)); // the altitude alone, held fixed
     EXPECT_EQ(p.z(), 12.35);
-    EXPECT_TRUE(p.invariantZ());
-    EXPECT_FALSE(p.invariantXY());
+    EXPECT_TRUE(p.invariantZ() && !p.invariantXY());
     EXPECT_FALSE(p.setPt(std::nan(""), 1.0));
     EXPECT_EQ(p.x(), 651325.412);
-    EXPECT_EQ(CCarnet::formatXY(1.23456), 1.235);
-    EXPECT_EQ(CCarnet::formatZ(1.23456), 1.23);
     EXPECT_EQ(CCarnet::formatAng(123.456789), 123.4568);
-    EXPECT_EQ(CStation::DeciAng(), 4);
     EXPECT_EQ(CMesure::DeciXY(), 3); // sightings share their settings
-    EXPECT_EQ(CLectAV::DeciZ(), 2);
-    EXPECT_EQ(CAppareil::DeciAng(), 4);
     SetStoreDecimals(4, 3, 5);
-
-    CPointGen half("H", kUndefined, 5.0, kUndefined);
-    EXPECT_FALSE(half.hasXY());
-    EXPECT_FALSE(half.isOk());
-    CPointGen plani("P", 1.0, 2.0);
-    EXPECT_TRUE(plani.is2D());
-    EXPECT_FALSE(plani.is3D());
-}
-
-TEST(Store, CopiesOfElementsBelongToTheCaller) {
-    CCarnet c = SmallJob();
-    auto copy = c.copyElement(5);
-    ASSERT_NE(copy, nullptr);
-    copy->setMat("Q1");
-    EXPECT_EQ(c.matAt(5), "P7");
-    auto asReference = c.copyElement(5, kKindReference);
-    ASSERT_NE(dynamic_cast<CReference*>(asReference.get()), nullptr);
-    EXPECT_EQ(static_cast<CReference*>(asReference.get())->ah(), 212.5);
-    EXPECT_EQ(c.copyElement(5, kKindPoint), nullptr);
-    EXPECT_EQ(c.copyElement(-1), nullptr);
-    EXPECT_EQ(c.Add(std::move(asReference), kKindReference), 12);
+    EXPECT_FALSE(CPointGen("H", kUndefined, 5.0, kUndefined).isOk());
 }
