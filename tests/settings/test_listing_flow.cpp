@@ -1,10 +1,8 @@
 #include "SettingsTestSupport.h"
 #include "core/Strings.h"
-#include "core/TextEncoding.h"
 #include "settings/ListingFlow.h"
 
 #include <algorithm>
-#include <cstdio>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <set>
@@ -14,12 +12,7 @@
 namespace pyr::test {
 namespace {
 
-int Count(const std::string& text, const std::string& part) {
-    int count = 0;
-    for (std::size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1))
-        ++count;
-    return count;
-}
+using namespace std::string_literals;
 
 class ListingFlow : public SettingsTest {
 protected:
@@ -30,74 +23,55 @@ protected:
                                  chooseName, show, tolerances, format));
     }
 
-    ListingRequest Request(ListingKind kind, std::size_t results) {
+    std::string Write(ListingKind kind, std::size_t results, bool ask = true) {
         ListingRequest request;
         request.paramPath = path;
         request.geobasePath = geobase;
         request.kind = kind;
         request.resultCount = results;
-        request.writeResult = [this](CDlgCfgListing& listing, std::size_t index) {
-            written.push_back(index);
-            listing.WriteLine("|  Calcul du point P%zu  |\n", index + 1);
+        request.ask = ask;
+        request.writeResult = [](CDlgCfgListing& listing, std::size_t i) {
+            listing.WriteLine("|  Calcul du point P%zu  |\n", i + 1);
         };
-        request.writeTolerances = [this](CDlgCfgListing& listing) {
-            ++toleranceBlocks;
-            listing.WriteLine("Tolérance angulaire : %.4f Gr\n", 0.01);
+        request.writeTolerances = [](CDlgCfgListing& listing) {
+            listing.WriteLine("Tolérance : 0.0100 Gr\n");
         };
-        return request;
+        return WriteComputationListing(frontEnd, request);
     }
 
-    std::set<std::string> FilesInFolder() const {
-        std::set<std::string> names;
-        for (const auto& entry : std::filesystem::directory_iterator(folder.Root()))
-            names.insert(entry.path().filename().string());
-        return names;
-    }
-
-    const std::string geobase = folder / "chantier.geo";
-    std::vector<std::size_t> written;
-    int toleranceBlocks = 0;
+    std::string geobase = folder / "chantier.geo";
 };
 
 TEST_F(ListingFlow, NothingWithoutResultsAndNothingAfterNo) {
     Options(false, true, true, 1);
-    EXPECT_EQ(WriteComputationListing(frontEnd, Request(ListingKind::Intersection, 0)), "");
+    EXPECT_EQ(Write(ListingKind::Intersection, 0), "");
     EXPECT_TRUE(frontEnd.questions.empty());
 
     frontEnd.answers = {ui::Answer::No};
-    EXPECT_EQ(WriteComputationListing(frontEnd, Request(ListingKind::StationV0, 2)), "");
+    EXPECT_EQ(Write(ListingKind::StationV0, 2), "");
     EXPECT_EQ(frontEnd.questions, std::vector<std::string>{kListingQuestionV0});
     EXPECT_TRUE(frontEnd.fileChoices.empty());
-    EXPECT_TRUE(written.empty());
-    EXPECT_EQ(FilesInFolder(), std::set<std::string>{"Pyralis.ini"});
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.Root()), {}), 1) << "Pyralis.ini only";
 }
 
-TEST_F(ListingFlow, BesideTheGeoBaseWithoutFileChoiceEachResultWithItsHeading) {
+TEST_F(ListingFlow, BesideTheGeoBaseWithoutFileChoiceEachResultOnItsOwnPage) {
     Options(false, false, true, 1);
-    const std::string listingPath = WriteComputationListing(frontEnd, Request(ListingKind::Intersection, 2));
-
+    const std::string listingPath = Write(ListingKind::Intersection, 2);
     EXPECT_EQ(listingPath, folder / "chantier.cin");
     EXPECT_TRUE(frontEnd.fileChoices.empty());
     EXPECT_TRUE(frontEnd.shownFiles.empty());
     EXPECT_TRUE(frontEnd.lines.empty()) << "no echo while the file is written";
-    EXPECT_EQ(frontEnd.questions, std::vector<std::string>{kListingQuestionCalculations});
-    EXPECT_EQ(written, (std::vector<std::size_t>{0, 1}));
-    EXPECT_EQ(toleranceBlocks, 2);
 
-    // Each result on its own numbered page of 30 lines, in this order.
+    // Pages of 30 lines, in this order.
     const std::string text = ReadBytes(listingPath);
     std::size_t at = 0;
     for (const std::string& expected :
-         {std::string("PYRALIS CALCULS TOPOMETRIQUES - CALCUL PAR INTERSECTION"),
-          "Nom de la GéoBase traitée : " + geobase, std::string("Calculs effectués le      : "),
-          std::string("Tolérance angulaire : 0.0100 Gr"), std::string("|  Calcul du point P1  |"),
-          std::string("Page 1"), std::string("CALCUL PAR INTERSECTION"), std::string("P2"),
-          std::string("Page 2")}) {
-        std::size_t found = text.find(expected, at);
-        ASSERT_NE(found, std::string::npos) << expected;
-        at = found + expected.size();
+         {std::string(80, '#') + "\n#", "PYRALIS CALCULS TOPOMETRIQUES - CALCUL PAR INTERSECTION"s,
+          "Nom de la GéoBase traitée : " + geobase, "Calculs effectués le      : "s, "Tolérance"s, "P1"s,
+          "Page 1"s, "CALCUL PAR INTERSECTION"s, "Tolérance"s, "P2"s, "Page 2"s}) {
+        at = text.find(expected, at);
+        ASSERT_NE(at, std::string::npos) << expected;
     }
-    EXPECT_NE(text.find("\n" + std::string(80, '#') + "\n#"), std::string::npos);
     EXPECT_EQ(std::count(text.begin(), text.end(), '\n'), 60);
 }
 
@@ -107,38 +81,21 @@ TEST_F(ListingFlow, ExistingPlainListingIsCompletedOnYesAndReplacedOnNo) {
     WriteBytes(listingPath, "listing d'hier\n");
 
     frontEnd.answers = {ui::Answer::Yes, ui::Answer::Yes};
-    WriteComputationListing(frontEnd, Request(ListingKind::Intersection, 1));
+    Write(ListingKind::Intersection, 1);
     EXPECT_EQ(frontEnd.questions.back(), Sprintf(kMsgListingExists, listingPath.c_str()));
     const std::string completed = ReadBytes(listingPath);
-    EXPECT_EQ(completed.rfind("listing d'hier\n", 0), 0u);
-    EXPECT_NE(completed.find("P1"), std::string::npos);
-    EXPECT_EQ(toleranceBlocks, 0);
+    EXPECT_EQ(completed.rfind("listing d'hier\nPYRALIS Calculs Topo", 0), 0u);
+    EXPECT_EQ(completed.find("Tolérance"), std::string::npos) << "EcrireTolérances=0";
 
     frontEnd.answers = {ui::Answer::Yes, ui::Answer::No};
-    WriteComputationListing(frontEnd, Request(ListingKind::Intersection, 1));
-    const std::string replaced = ReadBytes(listingPath);
-    EXPECT_EQ(replaced.find("listing d'hier"), std::string::npos);
-    EXPECT_EQ(Count(replaced, "CALCUL PAR INTERSECTION"), 1);
-    EXPECT_EQ(Count(completed, "CALCUL PAR INTERSECTION"), 1);
-}
-
-TEST_F(ListingFlow, RichTextListingIsAlwaysReplacedWithoutAQuestion) {
-    Options(false, false, false, 0);
-    const std::string listingPath = folder / "chantier.rtf";
-    WriteBytes(listingPath, "listing d'hier\n");
-
-    EXPECT_EQ(WriteComputationListing(frontEnd, Request(ListingKind::Resection, 1)), listingPath);
-    EXPECT_EQ(frontEnd.questions, std::vector<std::string>{kListingQuestionCalculations});
-    const std::string rtf = ReadBytes(listingPath);
-    EXPECT_EQ(rtf.rfind("{\\rtf1", 0), 0u);
-    EXPECT_EQ(rtf.find("listing d'hier"), std::string::npos);
-    EXPECT_NE(rtf.find("CALCUL PAR RELEVEMENT"), std::string::npos);
+    Write(ListingKind::Intersection, 1);
+    EXPECT_EQ(ReadBytes(listingPath).rfind("PYRALIS Calculs Topo", 0), 0u);
 }
 
 TEST_F(ListingFlow, FileChoiceOffersTheDefaultNameWithTheFormsFilter) {
     Options(true, false, false, 1);
     frontEnd.files = {std::optional<std::string>(folder / "autre")};
-    EXPECT_EQ(WriteComputationListing(frontEnd, Request(ListingKind::StationV0, 1)), folder / "autre.cv0");
+    EXPECT_EQ(Write(ListingKind::StationV0, 1), folder / "autre.cv0");
     ASSERT_EQ(frontEnd.fileChoices.size(), 1u);
     const ui::FileChoice& choice = frontEnd.fileChoices[0];
     EXPECT_TRUE(choice.save);
@@ -146,35 +103,32 @@ TEST_F(ListingFlow, FileChoiceOffersTheDefaultNameWithTheFormsFilter) {
     EXPECT_EQ(choice.filter, "Listing de calcul de V0 (*.cv0)|*.cv0||");
     EXPECT_EQ(choice.defaultExtension, "cv0");
     EXPECT_EQ(choice.startPath, folder / "chantier.cv0");
+}
 
-    // Cancelling keeps the default name; the recoupement offers its rich text as the intersection's.
+TEST_F(ListingFlow, RichTextListingIsAlwaysReplacedWithoutAQuestion) {
+    // Cancelling the file choice keeps the default name; the recoupement offers its rich text under the
+    // intersection's words.
     Options(true, false, false, 0);
     frontEnd.files = {std::nullopt};
-    EXPECT_EQ(WriteComputationListing(frontEnd, Request(ListingKind::Recoupement, 1)),
-              folder / "chantier.rtf");
+    WriteBytes(folder / "chantier.rtf", "listing d'hier\n");
+    EXPECT_EQ(Write(ListingKind::Recoupement, 1), folder / "chantier.rtf");
     EXPECT_EQ(frontEnd.fileChoices.back().filter, "Listing d'intersection (*.rtf)|*.rtf||");
-    EXPECT_EQ(frontEnd.fileChoices.back().defaultExtension, "rtf");
+    EXPECT_EQ(frontEnd.questions, std::vector<std::string>{kListingQuestionCalculations});
+    EXPECT_EQ(ReadBytes(folder / "chantier.rtf").rfind("{\\rtf1", 0), 0u);
 }
 
-TEST_F(ListingFlow, ShownWhenAskedAndAskedOnlyWhenNotAlreadyChosen) {
+TEST_F(ListingFlow, ShownWhenAskedAndNotWrittenWhereItCannotBeOpened) {
     Options(false, true, false, 2);
-    ListingRequest request = Request(ListingKind::EccentricStation, 1);
-    request.ask = false;
-    const std::string listingPath = WriteComputationListing(frontEnd, request);
+    const std::string listingPath = Write(ListingKind::EccentricStation, 1, false);
     EXPECT_EQ(listingPath, folder / "chantier.cex");
-    EXPECT_TRUE(frontEnd.questions.empty());
+    EXPECT_TRUE(frontEnd.questions.empty()) << "already chosen: not asked again";
     EXPECT_EQ(frontEnd.shownFiles, std::vector<std::string>{listingPath});
     EXPECT_EQ(ReadBytes(listingPath).find("Page"), std::string::npos) << "format 2 has no page count";
-}
 
-TEST_F(ListingFlow, ListingThatCannotBeOpenedIsSkippedSilently) {
-    Options(false, true, false, 1);
-    ListingRequest request = Request(ListingKind::Intersection, 1);
-    request.geobasePath = folder / "absent/chantier.geo";
-    EXPECT_EQ(WriteComputationListing(frontEnd, request), "");
+    geobase = folder / "absent/chantier.geo";
+    EXPECT_EQ(Write(ListingKind::Intersection, 1, false), "");
     EXPECT_TRUE(frontEnd.messages.empty());
-    EXPECT_TRUE(frontEnd.shownFiles.empty());
-    EXPECT_TRUE(written.empty());
+    EXPECT_EQ(frontEnd.shownFiles.size(), 1u);
 }
 
 TEST(ListingKinds, EachKindHasItsOwnExtensionAndAFilterOfThatForm) {
@@ -185,8 +139,6 @@ TEST(ListingKinds, EachKindHasItsOwnExtensionAndAFilterOfThatForm) {
         EXPECT_TRUE(extensions.insert(std::string(info.extension)).second) << info.extension;
         EXPECT_TRUE(info.label.ends_with(" (*." + std::string(info.extension) + ")")) << info.label;
     }
-    EXPECT_EQ(ListingFilter(ListingKind::RadiatedPoints, false),
-              "Listing de points rayonnés (*.cpr)|*.cpr||");
 }
 
 } // namespace

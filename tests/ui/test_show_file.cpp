@@ -4,58 +4,37 @@
 #include <cstdio>
 #include <gtest/gtest.h>
 #include <string>
-#include <sys/stat.h>
 
 namespace {
 
-// An "editor" that writes the arguments it was given into a file, one a line, and its command line as
-// $VISUAL would hold it ("sh <script> <marker>"), to check the words and the path that reach it.
-class ShowFile : public ::testing::Test {
-protected:
-    ShowFile() {
-        WriteBytes(script, "for a in \"$@\"; do printf '%s\\n' \"$a\"; done > \"$MARQUE\"\n");
-        chmod(script.c_str(), 0755);
-    }
-    ~ShowFile() override {
-        std::fclose(in);
-        std::fclose(out);
-        std::fclose(err);
-    }
-
+TEST(ShowFile, TheEditorGetsThePathAsOneArgumentOtherwiseTheFileIsNamed) {
     TempDir folder;
-    const std::string script = folder / "editeur.sh";
-    const std::string marker = folder / "marque";
-    const std::string listing = folder / "relevé d'été $HOME.cin";
-    std::FILE* in = std::tmpfile();
-    std::FILE* out = std::tmpfile();
-    std::FILE* err = std::tmpfile();
-    ScopedEnv markerEnv{"MARQUE", marker};
-    ScopedEnv visual{"VISUAL", "sh  " + script + " -x"};
-};
+    const std::string marker = folder / "marque", listing = folder / "relevé d'été $HOME.cin";
+    // An "editor" that writes the arguments it was given into the marker, one a line; $VISUAL holds its
+    // command line, words to split.
+    WriteBytes(folder / "editeur.sh", "for a in \"$@\"; do printf '%s\\n' \"$a\"; done > \"$MARQUE\"\n");
+    ScopedEnv markerEnv("MARQUE", marker);
+    ScopedEnv visual("VISUAL", "sh  " + (folder / "editeur.sh") + " -x");
+    // What the console writes on its error stream when it shows the listing.
+    const auto show = [&](bool interactive) {
+        std::FILE* streams[] = {std::tmpfile(), std::tmpfile(), std::tmpfile()};
+        pyr::ui::ConsoleFrontEnd console(streams[0], streams[1], streams[2]);
+        console.SetInteractive(interactive);
+        console.ShowFile(listing);
+        const std::string err = Contents(streams[2]);
+        for (std::FILE* stream : streams)
+            std::fclose(stream);
+        return err;
+    };
 
-TEST_F(ShowFile, APersonGetsTheEditorOnThePathAsOneArgumentAndTheCallWaitsForIt) {
-    pyr::ui::ConsoleFrontEnd console(in, out, err);
-    console.SetInteractive(true);
-    console.ShowFile(listing);
-    // The marker exists as soon as the call returns: the editor was waited for.
-    EXPECT_EQ(ReadBytes(marker), "-x\n" + listing + "\n");
-    EXPECT_EQ(Contents(err), "");
-}
+    const std::string named = "Fichier à consulter : " + listing + "\n";
+    EXPECT_EQ(show(false), named);
+    EXPECT_FALSE(std::filesystem::exists(marker)) << "nothing is run in batch";
+    EXPECT_EQ(show(true), "");
+    EXPECT_EQ(ReadBytes(marker), "-x\n" + listing + "\n") << "written before the call returned: waited for";
 
-TEST_F(ShowFile, BatchRunsNothingAndNamesTheFile) {
-    pyr::ui::ConsoleFrontEnd console(in, out, err);
-    console.SetInteractive(false);
-    console.ShowFile(listing);
-    EXPECT_FALSE(std::filesystem::exists(marker));
-    EXPECT_EQ(Contents(err), "Fichier à consulter : " + listing + "\n");
-}
-
-TEST_F(ShowFile, AnEditorThatCannotBeStartedNamesTheFile) {
     ScopedEnv missing("VISUAL", folder / "absent");
-    pyr::ui::ConsoleFrontEnd console(in, out, err);
-    console.SetInteractive(true);
-    console.ShowFile(listing);
-    EXPECT_EQ(Contents(err), "Fichier à consulter : " + listing + "\n");
+    EXPECT_EQ(show(true), named) << "an editor that cannot be started";
 }
 
 } // namespace
