@@ -127,38 +127,15 @@ TEST_F(Module, TheLastGeoBaseIsOfferedFirstUnlessAnotherIsNamed) {
     EXPECT_TRUE(frontEnd.seen[1].geoBaseNamed);
 }
 
-TEST_F(Module, BothEditorCommandsShowTheGeoBaseAndRecordItAsTheLastOne) {
-    const std::string geo = dir / "petit.geo";
-    WriteBytes(
-        geo,
-        "GEOBASE PYRALIS\t1\n1001\tS1\t1.562\t-999999\n1006\tA1\t651050.118\t6862512.447\t55.021\tXYZ\n");
-    frontEnd.files = {geo};
-    ASSERT_TRUE(Run("GeoEdit"));
-    const std::vector<std::string> first = frontEnd.lines;
-    ASSERT_GE(first.size(), 3u);
-    EXPECT_EQ(first[first.size() - 2].substr(0, 8), "000001  ");
-    EXPECT_EQ(first.back().substr(0, 8), "000002  ");
-
-    // The second editor command is offered the GéoBase just recorded.
-    frontEnd.lines.clear();
-    ASSERT_TRUE(Run("PyraGeoEdit2"));
-    EXPECT_EQ(frontEnd.lines, first);
-    EXPECT_EQ(frontEnd.seen.back().geoBase, geo);
-    EXPECT_EQ(frontEnd.results, (std::vector<DialogResult>{DialogResult::Ok, DialogResult::Ok}));
-}
-
-TEST_F(Module, TheToolbarCommandShowsTheToolbarAgainWithoutADialog) {
+TEST_F(Module, TheToolbarCommandRunsNoDialogAndTheTableOfCodesBringsTheScaleServices) {
     RegisteredServices()->ShowToolbar(kToolbarGroup, false);
     ASSERT_TRUE(Run("PyrCalTopo15"));
     EXPECT_TRUE(RegisteredServices()->IsToolbarVisible(kToolbarGroup));
     EXPECT_TRUE(frontEnd.seen.empty());
-}
 
-TEST_F(Module, TheTableOfCodesBringsTheScaleServices) {
     EXPECT_FALSE(acrxServiceIsRegistered(pyr::host::kScaleServicesName));
     ASSERT_TRUE(Run("CalTabCode"));
     EXPECT_TRUE(acrxServiceIsRegistered(pyr::host::kScaleServicesName));
-    EXPECT_EQ(frontEnd.seen.back().title, "gestion d'un table de codes");
 }
 
 } // namespace

@@ -4,6 +4,7 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
+#include <sstream>
 #include <sys/wait.h>
 
 namespace {
@@ -14,15 +15,9 @@ struct Outcome {
     std::string err;
     std::vector<std::string> OutLines() const {
         std::vector<std::string> lines;
-        std::string line;
-        for (char c : out) {
-            if (c == '\n') {
-                lines.push_back(line);
-                line.clear();
-            } else {
-                line += c;
-            }
-        }
+        std::istringstream text(out);
+        for (std::string line; std::getline(text, line);)
+            lines.push_back(line);
         return lines;
     }
 };
@@ -62,18 +57,14 @@ TEST_F(Pyralis, AloneItListsTheCommandsInRegistrationOrder) {
 }
 
 TEST_F(Pyralis, ExitStatusSaysWhetherTheCommandRanWasRefusedOrMisused) {
-    const Outcome refused = Run("CALINTER");
-    EXPECT_EQ(refused.status, 1);
-    EXPECT_TRUE(Has(refused.err, "La commande CalInter (calcul d'un point par intersections de visées) "
-                                 "n'est pas encore disponible"))
-        << refused.err;
-    EXPECT_EQ(refused.out, "");
-
     const struct {
         const char* arguments;
         int status;
         const char* said; // on standard error, or on standard output for the help
-    } cases[] = {{"CalInconnu", 2, "commande inconnue « CalInconnu »"},
+    } cases[] = {{"CALINTER", 1,
+                  "La commande CalInter (calcul d'un point par intersections de visées) n'est pas encore "
+                  "disponible"},
+                 {"CalInconnu", 2, "commande inconnue « CalInconnu »"},
                  {"CalInter --bidon", 2, "--bidon"},
                  {"--bidon CalInter", 2, "--bidon"},
                  {"CalInter --help", 0, "--geobase"},
