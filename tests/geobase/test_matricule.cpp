@@ -6,52 +6,38 @@
 #include <string>
 #include <tuple>
 #include <utility>
-#include <vector>
 
 namespace pyr {
 namespace {
 
-std::string Formed(std::string id) {
-    FormMat(id);
-    return id;
-}
-
-TEST(FormMat, DropsPaddingAndLeadingZerosAndKeepsTheRestOfTheName) {
+TEST(FormMat, NormalisesTheNameAndBuildsItFromPrefixNumberAndWidth) {
     // clang-format off
     const std::pair<std::string_view, std::string_view> cases[] = {
-        {"0000000000000012", "12"}, {"000000000000PT12", "PT12"}, {"\t A12\r\n", "A12"},
-        {std::string_view("A12\0\0\0", 6), "A12"}, {"\u00A0A12\u202F", "A12"}, {"   ", ""},
-        {"0000000000000000", "0"}, {"  00 ", "0"}, // a name of zeros keeps one
-        {"a12", "a12"}, {"A0012", "A0012"}, {"A 12", "A 12"}, {"P-12", "P-12"},
-        // One zero in front of a sign other than a letter or a digit is part of the name.
-        {"0.5", "0.5"}, {"000-1", "0-1"}, {"00\u00C91", "\u00C91"}};
+        {"0000000000000012", "12"}, {"\t A12\r\n", "A12"}, {std::string_view("A12\0\0\0", 6), "A12"},
+        {"\u00A0A12\u202F", "A12"}, {"   ", ""}, {"  00 ", "0"}, // a name of zeros keeps one
+        // Case and inner signs are kept; one zero in front of a sign other than a letter or a digit stays.
+        {"a12", "a12"}, {"A 12", "A 12"}, {"000-1", "0-1"}, {"00\u00C91", "\u00C91"}};
     // clang-format on
     for (auto [id, normal] : cases) {
-        EXPECT_EQ(Formed(std::string(id)), normal) << id;
+        std::string formed(id);
+        FormMat(formed);
+        EXPECT_EQ(formed, normal) << id;
         EXPECT_EQ(FormMatView(id), normal) << id;
-        EXPECT_EQ(Formed(std::string(normal)), normal) << id;
     }
-}
-
-TEST(FormMat, BuildsFromPrefixNumberAndWidth) {
     EXPECT_EQ(FormMat("A", 12, 4), "A0012");
     EXPECT_EQ(FormMat("A", 12345, 3), "A12345"); // never cut
-    EXPECT_EQ(FormMat(" A", 0, 3), "A000");
-    EXPECT_EQ(FormMat("", 12, 4), "12"); // padding a numeric name would make another name
-    EXPECT_EQ(FormMat("", 0, 4), "0");
+    EXPECT_EQ(FormMat("", 12, 4), "12");         // padding a numeric name would make another name
     EXPECT_EQ(FormMat("PT12B", -1, 0), "PT12B"); // no number: what ExtrMat splits builds back
 }
 
 TEST(ExtrMat, SplitsTheTrailingNumberOrGivesTheWholeName) {
     // clang-format off
     const std::tuple<std::string_view, bool, std::string_view, long long> cases[] = {
-        {"A12", true, "A", 12}, {"0012", true, "", 12}, {"0", true, "", 0}, {" A0012 ", true, "A", 12},
-        {"PT12B7", true, "PT12B", 7}, {"A-5", true, "A-", 5}, // numbers are never negative
-        {"PT12B", false, "PT12B", -1}, {"12-", false, "12-", -1}, {"", false, "", -1},
+        {"0012", true, "", 12}, {" A0012 ", true, "A", 12}, {"PT12B7", true, "PT12B", 7},
+        {"A-5", true, "A-", 5}, {"PT12B", false, "PT12B", -1}, // numbers are never negative
         // At most 18 significant digits; beyond, the digits are text.
         {"A999999999999999999", true, "A", kMaxMatNumber}, {"A0000000000000000000000000000007", true, "A", 7},
-        {"A1000000000000000000", false, "A1000000000000000000", -1},
-        {"99999999999999999999999999999", false, "99999999999999999999999999999", -1}};
+        {"A1000000000000000000", false, "A1000000000000000000", -1}};
     // clang-format on
     for (auto [id, split, wantPrefix, wantNumber] : cases) {
         // The outputs start with stale values: a refusal must overwrite them too.
@@ -63,42 +49,26 @@ TEST(ExtrMat, SplitsTheTrailingNumberOrGivesTheWholeName) {
     }
 }
 
-TEST(NextMat, KeepsPrefixAndWidthNumbersNamesWithoutNumberAndStopsAtTheLargest) {
+TEST(NextMat, SkipsUsedOnesKeepsPrefixAndWidthNumbersNamesWithoutNumberAndStopsAtTheLargest) {
+    const std::set<std::string, std::less<>> used = {"A10", "A11", "A13", "B1", "B2"};
+    auto isUsed = [&](std::string_view id) { return used.contains(id); };
     // clang-format off
     const std::pair<std::string_view, std::string_view> cases[] = {
-        {"A09", "A10"}, {"  A0009 ", "A0010"}, {"A99", "A100"}, {"A-5", "A-6"}, {"0009", "10"},
-        {"B", "B1"}, {"PT12B", "PT12B1"}, {"", "1"},
+        {"A09", "A12"}, {"  A0009 ", "A0010"}, {"A99", "A100"}, {"0009", "10"}, {"B", "B3"}, {"", "1"},
         {"A999999999999999998", "A999999999999999999"}, {"A999999999999999999", ""},
         {"A99999999999999999999999", ""}};
     // clang-format on
     for (auto [id, next] : cases)
-        EXPECT_EQ(NextMat(id, nullptr), next) << id;
-}
-
-TEST(NextMat, SkipsUsedIdentifiersAndGivesUpAfterMaxTries) {
-    const std::set<std::string, std::less<>> used = {"A10", "A11", "A13", "B1", "B2"};
-    std::vector<std::string> asked;
-    auto isUsed = [&](std::string_view id) {
-        asked.emplace_back(id);
-        return used.contains(id);
-    };
-    EXPECT_EQ(NextMat("A09", isUsed), "A12");
-    EXPECT_EQ(asked, (std::vector<std::string>{"A10", "A11", "A12"}));
-    EXPECT_EQ(NextMat("B", isUsed), "B3");
-
-    int tries = 0;
-    EXPECT_EQ(NextMat(
-                  "A1", [&tries](std::string_view) { return ++tries > 0; }, 1000),
-              "");
-    EXPECT_EQ(tries, 1000);
+        EXPECT_EQ(NextMat(id, isUsed), next) << id;
+    auto allUsed = [](std::string_view) { return true; };
+    EXPECT_EQ(NextMat("A1", allUsed, 1000), ""); // gives up after so many tries
 }
 
 TEST(IsValidMat, AcceptsUsualNamesAndRefusesWithTheReason) {
     // clang-format off
     const std::pair<std::string_view, std::string_view> cases[] = {
-        {"A12", ""}, {"0", ""}, {"P-12", ""}, {"S1.P3", ""}, {"a_b/3", ""}, {"\u00C9GL1", ""}, {" 0012 ", ""},
-        {"", msg::kMatWhyEmpty}, {"A 12", msg::kMatWhyBlank}, {"A\t12", msg::kMatWhyBlank},
-        {"A\u00A012", msg::kMatWhyBlank}, {"A\x01Z", msg::kMatWhyControl}, {"A\x7F", msg::kMatWhyControl},
+        {"P-12", ""}, {"S1.P3", ""}, {"\u00C9GL1", ""}, {" 0012 ", ""},
+        {"", msg::kMatWhyEmpty}, {"A\u00A012", msg::kMatWhyBlank}, {"A\x01Z", msg::kMatWhyControl},
         {"A\u0085", msg::kMatWhyControl}, {"A\xFF", msg::kMatWhyNotText},
         {"A;1", "il contient « ; », qui sépare les points d'une sélection"},
         {"-5", msg::kMatWhyLeadingDash}, {"5-", msg::kMatWhyTrailingDash}};
@@ -116,20 +86,14 @@ TEST(DDV_Mat, WarnsTheParentOrElseTheApplicationAboutAnEmptyOrMalformedIdentifie
     ui::ScriptedFrontEnd person;
     EXPECT_FALSE(DDV_Mat(&person, "   "));
     EXPECT_FALSE(DDV_Mat(&person, "  A 12 "));
-    EXPECT_FALSE(DDV_Mat(&person, "A,12"));
-    EXPECT_TRUE(DDV_Mat(&person, "0000000000000012"));
-    ASSERT_EQ(person.messages.size(), 3u);
+    ASSERT_EQ(person.messages.size(), 2u);
     EXPECT_EQ(person.messages[0].text, "Le matricule du point doit être indiqué !");
     EXPECT_EQ(person.messages[0].caption, "PYRALIS");
     EXPECT_EQ(person.messages[0].icon, ui::kIconWarning);
     EXPECT_EQ(person.messages[1].text, "Le matricule <A 12> n'est pas correct : il contient un espace !");
-    EXPECT_EQ(
-        person.messages[2].text,
-        "Le matricule <A,12> n'est pas correct : il contient « , », qui sépare les points d'une sélection !");
 
     EXPECT_FALSE(DDV_Mat(nullptr, ""));
     ASSERT_EQ(application.messages.size(), 1u);
-    EXPECT_EQ(application.messages[0].text, msg::kMatMissing);
 }
 
 TEST(DDX_Mat, SavingNormalisesTheFieldOrChangesNothingAndLoadingShowsTheValue) {
@@ -137,7 +101,6 @@ TEST(DDX_Mat, SavingNormalisesTheFieldOrChangesNothingAndLoadingShowsTheValue) {
     std::string field = " A 12";
     std::string value = "A11";
     EXPECT_FALSE(DDX_Mat(&person, true, field, value));
-    EXPECT_EQ(field, " A 12");
     EXPECT_EQ(value, "A11");
 
     field = "  0000000000000012 ";
@@ -148,7 +111,6 @@ TEST(DDX_Mat, SavingNormalisesTheFieldOrChangesNothingAndLoadingShowsTheValue) {
     value = "A0009";
     EXPECT_TRUE(DDX_Mat(&person, false, field, value));
     EXPECT_EQ(field, "A0009");
-    EXPECT_EQ(person.messages.size(), 1u);
 }
 
 } // namespace
