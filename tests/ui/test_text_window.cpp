@@ -1,3 +1,4 @@
+#include "TestSupport.h"
 #include "ui/ConsoleFrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -19,19 +20,6 @@ TEST(TextWindow, EachNewlineEndsALineAndATrailingOneAddsNone) {
     EXPECT_EQ(fe.lines, expected);
     EXPECT_EQ(txt.LineCount(), 4);
 }
-
-namespace {
-
-std::string Contents(std::FILE* file) {
-    std::rewind(file);
-    std::string text;
-    int c;
-    while ((c = std::fgetc(file)) != EOF)
-        text += static_cast<char>(c);
-    return text;
-}
-
-} // namespace
 
 TEST(ConsoleFrontEnd, InBatchAQuestionTakesTheAnswerGivenInAdvanceOrItsDefault) {
     std::FILE* out = std::tmpfile();
