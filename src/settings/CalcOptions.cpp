@@ -25,6 +25,11 @@ constexpr std::array kOptions = {
     OptionEntry{kSectionCalculations, "RayonV0Calcule", T::Switch, "0", 0, 1},
     OptionEntry{kSectionCalculations, "TrianguPtsRayon", T::Switch, "0", 0, 1},
     OptionEntry{kSectionCalculations, "IntersAvecHp", T::Switch, "1", 0, 1},
+    // The station reduction folds a vertical eccentric offset into the zenith angle and the distance
+    // (rather than into the target height).
+    OptionEntry{kSectionCalculations, "ExcentVertDansAngles", T::Switch, "0", 0, 1},
+    // The field instrument of a station that names none: its number in the list (0, the standard one).
+    OptionEntry{kSectionCalculations, "AppareilParDefaut", T::Integer, "0", 0, 999},
 
     // Corrections.
     OptionEntry{kSectionCorrections, "AlterLineaire", T::Real, "0", -100000, 100000},
