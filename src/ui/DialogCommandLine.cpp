@@ -94,6 +94,8 @@ std::optional<CommandLineOutcome> CheckValues(const DialogOptions& options, std:
             if (equal != std::string::npos) return Usage(command, kNoValueTaken, "--" + name);
         } else if (equal != std::string::npos) {
             if (equal + 1 == word.size()) return Usage(command, kMissingValue, "--" + name);
+        } else if (option->optional) {
+            if (i + 1 < words.size() && words[i + 1] != "--" && !LooksLikeOption(words[i + 1])) ++i;
         } else if (i + 1 == words.size() || LooksLikeOption(words[i + 1])) {
             return Usage(command, kMissingValue, "--" + name);
         } else {
@@ -121,7 +123,7 @@ CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view comman
             CLI::Option* parsed = IsSwitch(option)
                                       ? app.add_flag("--" + option.name)
                                       : app.add_option("--" + option.name)
-                                            ->expected(1)
+                                            ->expected(option.optional ? 0 : 1, 1)
                                             ->allow_extra_args(false)
                                             ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
             declared[parsed] = &option;
@@ -181,7 +183,10 @@ std::string DialogHelp(DialogModel& dialog, std::string_view command) {
     std::vector<std::pair<std::string, std::string>> entries;
     for (const auto& option : options.Options()) {
         std::string left = "--" + option.name;
-        if (!IsSwitch(option)) left += ' ' + option.valueName;
+        if (option.optional)
+            left += " [" + option.valueName + ']';
+        else if (!IsSwitch(option))
+            left += ' ' + option.valueName;
         entries.emplace_back(std::move(left),
                              option.repeatable ? option.help + std::string(kRepeatable) : option.help);
     }

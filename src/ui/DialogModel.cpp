@@ -10,6 +10,11 @@ void DialogOptions::Value(std::string name, std::string valueName, std::string h
         {std::move(name), std::move(valueName), std::move(help), repeatable, std::move(apply)});
 }
 
+void DialogOptions::OptionalValue(std::string name, std::string valueName, std::string help, Apply apply) {
+    Value(std::move(name), std::move(valueName), std::move(help), std::move(apply));
+    m_options.back().optional = true;
+}
+
 void DialogOptions::Switch(std::string name, std::string help, std::function<std::string()> action) {
     Apply apply = [action = std::move(action)](const std::string&) {
         return action ? action() : std::string();

@@ -33,7 +33,8 @@ public:
         std::string valueName; // the value's name in the help ("FICHIER"); empty for a switch
         std::string help;      // one line of French
         bool repeatable = false;
-        Apply apply;           // a switch gets an empty value
+        Apply apply;           // a switch, and an optional value not given, get an empty value
+        bool optional = false; // the value may be left out: "--listing" or "--listing FICHIER"
     };
 
     // "--name VALUE".
@@ -41,6 +42,8 @@ public:
                bool repeatable = false);
     // "--name": a switch or an action.
     void Switch(std::string name, std::string help, std::function<std::string()> action);
+    // "--name [VALUE]": an action that may be given a value (the value is empty when it is left out).
+    void OptionalValue(std::string name, std::string valueName, std::string help, Apply apply);
 
     const std::vector<Option>& Options() const { return m_options; }
 

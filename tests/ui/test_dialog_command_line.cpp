@@ -87,6 +87,39 @@ TEST(DialogCommandLine, HelpOrAFaultAppliesNothingAndTheFirstRefusalStopsTheRest
     }
 }
 
+// "--listing [FICHIER]": the value is taken when a word that is not an option follows.
+TEST(DialogCommandLine, AnOptionalValueIsTakenOnlyWhenGiven) {
+    struct ListingDialog : SightingDialog {
+        void DeclareOptions(ui::DialogOptions& options) override {
+            SightingDialog::DeclareOptions(options);
+            options.OptionalValue("fichier", "NOM", "le listing",
+                                  [this](const std::string& f) { return Record("fichier=" + f); });
+        }
+    };
+    const struct {
+        Words words;
+        Kind kind;
+        Words applied;
+    } cases[] = {
+        {{"--fichier"}, Kind::Run, {"fichier= @derniere.geo"}},
+        {{"--fichier", "l.cv0", "--point", "A"},
+         Kind::Run,
+         {"fichier=l.cv0 @derniere.geo", "A @derniere.geo"}},
+        {{"--fichier", "--point", "A"}, Kind::Run, {"fichier= @derniere.geo", "A @derniere.geo"}},
+        {{"--fichier=l.cv0"}, Kind::Run, {"fichier=l.cv0 @derniere.geo"}},
+        {{"--fichier", "a", "b"}, Kind::Usage, {}},
+        {{"--fichier", "--fichier"}, Kind::Usage, {}},
+    };
+    for (const auto& c : cases) {
+        ListingDialog dialog;
+        EXPECT_EQ(ui::ApplyCommandLine(dialog, "calvis", c.words).kind, c.kind) << c.words.size();
+        EXPECT_EQ(dialog.applied, c.applied);
+    }
+    ListingDialog dialog;
+    EXPECT_NE(ui::DialogHelp(dialog, "calvis").find("  --fichier [NOM]     le listing\n"), std::string::npos)
+        << ui::DialogHelp(dialog, "calvis");
+}
+
 TEST(ConsoleFrontEnd, ADialogsOutcomeGoesToItsStreamAndGivesTheStatus) {
     using enum DialogResult;
     // clang-format off
