@@ -8,7 +8,6 @@
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/GeoFile.h"
 #include "geobase/Matricule.h"
-#include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
 #include <cctype>
@@ -205,12 +204,6 @@ bool CCarnet::changeCommentIntoObject(CPyrTxtWnd* txt, int index) {
     Changed();
     if (txt) txt->Print(msg::kEnabled, index + 1, std::string(KindLabel(parsedKind)).c_str(), mat.c_str());
     return true;
-}
-
-bool CCarnet::Projection(std::string_view, std::string_view, ui::FrontEnd* parent) {
-    (parent ? *parent : ui::ApplicationFrontEnd())
-        .MessageBox(msg::kNoProjectionYet, ui::kCaption, ui::kIconWarning);
-    return false;
 }
 
 } // namespace pyr

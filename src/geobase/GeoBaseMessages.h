@@ -66,7 +66,5 @@ inline constexpr const char* kNotAnElementComment =
     "Elément # %d : ce commentaire ne décrit pas un élément de la GéoBase (%s) !";
 inline constexpr const char* kAlreadyComment = "Elément # %d : c'est déjà un commentaire !";
 inline constexpr const char* kNotAComment = "Elément # %d : ce n'est pas un commentaire !";
-inline constexpr const char* kNoProjectionYet =
-    "Le changement de projection des coordonnées n'est pas encore disponible dans cette version.";
 
 } // namespace pyr::msg
