@@ -1,5 +1,6 @@
 #include "host/CommandHandlers.h"
 
+#include "calc/CalculV0Sta.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
 #include "host/CommandFlow.h"
@@ -48,6 +49,10 @@ void OnGeoEdit(const CommandEntry& command) {
 
 void OnCalcOpt(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<COptionPSheet>(); });
+}
+
+void OnCalculV0(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalculV0Sta>(); });
 }
 
 void OnExport(const CommandEntry& command) {

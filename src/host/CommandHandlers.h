@@ -12,6 +12,8 @@ void OnShowToolbar(const CommandEntry& command);
 void OnGeoEdit(const CommandEntry& command);
 // "CalcOpt": the options sheet of the calculations.
 void OnCalcOpt(const CommandEntry& command);
+// "CalculV0": the orientation of stations.
+void OnCalculV0(const CommandEntry& command);
 // The eight exports of a GéoBase, told apart by their title.
 void OnExport(const CommandEntry& command);
 // "CalTabCode": the table of codes, which needs the scale services too.

@@ -41,7 +41,7 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraCalRecou", "CalRecou", "calcul d'un point par recoupement", OnPending},
     {"PyraCalExcen", "CalExcen", "calcul d'une station excentrée", OnPending},
     {"PyraCalTrian", "CalTrian", "calcul d'un point par triangulation", OnPending},
-    {"PyraCalculV0", "CalculV0", "calcul du V0 d'une station", OnPending},
+    {"PyraCalculV0", "CalculV0", "calcul du V0 d'une station", OnCalculV0},
     {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnPending},
     {"PyraCalRayon", "CalRayon", "calcul des points rayonnés", OnPending},
     {"PyraCalBloc", "CalBloc", "calcul de compensation en bloc", OnPending},

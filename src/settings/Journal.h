@@ -16,6 +16,7 @@ inline constexpr const char* kJournalIntersection = "Calcul de points par inters
 inline constexpr const char* kJournalResection = "Calcul de points par relèvement";
 inline constexpr const char* kJournalRecoupement = "Calcul de points par recoupement";
 inline constexpr const char* kJournalEccentric = "Calcul d'une station excentrée";
+inline constexpr const char* kJournalStationV0 = "Calcul des V0 de stations";
 
 // The GéoBase's path with its extension replaced by "jnl" (added when it has none).
 std::string JournalPath(std::string_view geoBasePath);

@@ -1,0 +1,209 @@
+#include "calc/CalculV0.h"
+
+#include "calc/CalculV0Texts.h"
+#include "core/Angles.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/Carnet.h"
+
+#include <cmath>
+
+namespace pyr {
+
+namespace {
+
+// The combined curvature and refraction term of a trigonometric height difference, per square metre of
+// horizontal distance: (1 - k) / 2R with k = 0.16 and R = 6 384 km, that is 0.84 / 12 768 000.
+constexpr double kCurvatureRefraction = 6.578947368421052e-08;
+// A reference closer than this to the station gives no direction.
+constexpr double kSamePlace = 0.0001;
+// Residuals below this are the rounding of the mean, not a spread of the references.
+constexpr double kNoResidual = 1e-10;
+constexpr int kV0Decimals = 6;
+
+std::string AngleText(double grads) {
+    return FormatFixed(grads, CStation::DeciAng());
+}
+
+// The trigonometric height difference from the station's ground to the reference's, measured: the
+// difference of the line of sight, the instrument and target heights, curvature and refraction. From the
+// horizontal distance as measured: the scale of the projection has nothing to do with heights.
+double MeasuredHeightDifference(double horizontal, double zenith, double hi, double hp) {
+    return horizontal * CosGrads(zenith) / SinGrads(zenith) + hi - hp +
+           kCurvatureRefraction * horizontal * horizontal;
+}
+
+void CheckReference(const V0Station& station, const V0Reference& ref, double horizontal, double zenith,
+                    double hp, const V0Settings& settings, std::vector<std::string>& warnings) {
+    const double dh = ref.measuredDistance;
+    if (IsKnown(station.z) && IsKnown(ref.z) && IsKnown(station.hi) && IsKnown(hp)) {
+        const double computed = ref.z - station.z;
+        const double measured = MeasuredHeightDifference(horizontal, zenith, station.hi, hp);
+        if (std::fabs(computed - measured) > settings.tolerances.HeightDifference(dh, zenith, kHeightTermsV0))
+            warnings.push_back(Sprintf(v0::kMsgHeightOutOfTolerance, ref.mat.c_str(), computed, measured,
+                                       computed - measured));
+    }
+    if (std::fabs(dh - ref.distance) > settings.tolerances.Distance(dh))
+        warnings.push_back(
+            Sprintf(v0::kMsgDistanceOutOfTolerance, ref.mat.c_str(), ref.distance, dh, ref.distance - dh));
+}
+
+} // namespace
+
+std::string V0Station::Designation() const {
+    return Sprintf("%s(%d)", name.c_str(), reprise);
+}
+
+V0Station StationAt(const CCarnet& carnet, int stationIndex) {
+    V0Station station;
+    station.index = stationIndex;
+    station.name = carnet.matAt(stationIndex);
+    station.reprise = carnet.RepriseAt(stationIndex);
+    if (!carnet.hasXY(station.name, station.x, station.y)) station.x = station.y = kUndefined;
+    if (!carnet.hasZ(station.name, station.z)) station.z = kUndefined;
+    station.hi = carnet.hiAt(stationIndex);
+    if (IsKnown(station.hi)) station.hi += carnet.findEV(stationIndex, -1);
+    station.previousV0 = carnet.v0At(stationIndex);
+    return station;
+}
+
+std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex) {
+    std::vector<int> offered;
+    int end = carnet.Find(kKindStation, "", stationIndex + 1);
+    if (end < 0) end = carnet.GetSize();
+    for (int i = stationIndex + 1; i < end; ++i)
+        if (IsSightingKind(carnet.GetType(i)) && carnet.hasXY(carnet.GetAt(i)->mat())) offered.push_back(i);
+    return offered;
+}
+
+std::vector<int> DefaultReferences(const CCarnet& carnet, const std::vector<int>& offered) {
+    std::vector<int> references;
+    for (int i : offered)
+        if (carnet.GetType(i) == kKindReference) references.push_back(i);
+    return references.empty() ? offered : references;
+}
+
+V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, int sighting,
+                             const V0Settings& settings, std::vector<std::string>& warnings) {
+    V0Reference ref;
+    ref.index = sighting;
+    const auto* visee = carnet.As<CVisee>(sighting);
+    if (!visee) {
+        ref.valid = false;
+        return ref;
+    }
+    ref.mat = visee->mat();
+    if (!carnet.hasXY(ref.mat, ref.x, ref.y)) ref.x = ref.y = kUndefined;
+    if (!carnet.hasZ(ref.mat, ref.z)) ref.z = kUndefined;
+    if (!station.HasPlace() || !IsKnown(ref.x)) {
+        ref.valid = false;
+        return ref;
+    }
+
+    double ah = visee->ah(), av = visee->av(), di = visee->di(), hp = visee->hp();
+    ReduceToFaceLeft(ah, av);
+    ReduceEccentricSighting(ah, av, di, hp, carnet.findER(sighting, station.index),
+                            carnet.findET(sighting, station.index), carnet.findEV(sighting, station.index),
+                            false);
+    ref.ah = ah;
+    ref.distance = std::hypot(ref.x - station.x, ref.y - station.y);
+    ref.bearing = Bearing(station.x, station.y, ref.x, ref.y);
+
+    // A distance and a zenith angle give the horizontal distance to check against the coordinates.
+    const double horizontal = di > 0.0 && IsKnown(av) ? di * SinGrads(av) : 0.0;
+    if (horizontal > 0.0) {
+        ref.measuredDistance = horizontal;
+        CorrectHorizontalDistance(ref.measuredDistance, station.x, station.y, station.z, settings.correction);
+        CheckReference(station, ref, horizontal, av, hp, settings, warnings);
+    }
+
+    if (IsKnown(ah)) ref.partialV0 = WrapGrads(ref.bearing - ah); // else dropped, with its remark
+    return ref;
+}
+
+void SolveV0(V0Result& result, const V0Settings& settings) {
+    result.weighted = settings.weighted;
+    result.computed = false;
+    result.v0 = kUndefined;
+    for (V0Reference& ref : result.references)
+        if (ref.valid && !IsKnown(ref.partialV0)) {
+            ref.valid = false;
+            result.remarks.push_back(Sprintf(v0::kRemarkNoDirection, ref.mat.c_str()));
+        }
+
+    double v0 = 0.0;
+    int n = 0;
+    while (true) {
+        n = 0;
+        double sumD = 0.0, sumDV = 0.0, sumV = 0.0, first = kUndefined;
+        for (V0Reference& ref : result.references) {
+            if (!ref.valid) continue;
+            if (ref.distance < kSamePlace) {
+                result.remarks.push_back(Sprintf(v0::kRemarkAtStation, ref.mat.c_str()));
+                ref.valid = false;
+                ref.residual = kUndefined;
+                continue;
+            }
+            // Every partial V0 is brought within half a turn of the first: 399.99 and 0.01 average to 0.
+            ref.wrappedV0 = IsKnown(first) ? NearGrads(ref.partialV0, first) : ref.partialV0;
+            if (!IsKnown(first)) first = ref.partialV0;
+            ++n;
+            sumD += ref.distance;
+            sumDV += ref.distance * ref.wrappedV0;
+            sumV += ref.wrappedV0;
+        }
+        if (n == 0) {
+            result.warnings.push_back(v0::kMsgNoValidReference);
+            result.used = 0;
+            return;
+        }
+        v0 = settings.weighted ? sumDV / sumD : sumV / n;
+
+        V0Reference* worst = nullptr;
+        for (V0Reference& ref : result.references) {
+            if (!ref.valid) continue;
+            ref.residual = v0 - ref.wrappedV0;
+            if (std::fabs(ref.residual) > kNoResidual &&
+                (!worst || std::fabs(ref.residual) > std::fabs(worst->residual)))
+                worst = &ref;
+        }
+        result.tolerance = settings.tolerances.V0(n);
+        if (settings.forced || !worst || std::fabs(worst->residual) <= result.tolerance) break;
+
+        // Only the worst goes, and the mean is made again without it.
+        result.remarks.push_back(Sprintf(v0::kRemarkOutOfTolerance, worst->mat.c_str()));
+        result.remarks.push_back(Sprintf(v0::kRemarkDeviation, AngleText(std::fabs(worst->residual)).c_str(),
+                                         AngleText(result.tolerance).c_str()));
+        worst->valid = false;
+        worst->partialV0 = worst->wrappedV0 = worst->residual = kUndefined;
+    }
+
+    if (settings.forced)
+        for (const V0Reference& ref : result.references)
+            if (ref.valid && std::fabs(ref.residual) > result.tolerance) {
+                result.remarks.push_back(Sprintf(v0::kRemarkOutOfTolerance, ref.mat.c_str()));
+                result.remarks.push_back(Sprintf(v0::kRemarkDeviation,
+                                                 AngleText(std::fabs(ref.residual)).c_str(),
+                                                 AngleText(result.tolerance).c_str()));
+            }
+    result.used = n;
+    result.v0 = RoundV0(v0);
+    result.computed = true;
+}
+
+V0Result ComputeStationV0(const CCarnet& carnet, const V0Station& station, const std::vector<int>& sightings,
+                          const V0Settings& settings) {
+    V0Result result;
+    result.station = station;
+    result.references.reserve(sightings.size());
+    for (int sighting : sightings)
+        result.references.push_back(PrepareReference(carnet, station, sighting, settings, result.warnings));
+    SolveV0(result, settings);
+    return result;
+}
+
+double RoundV0(double v0) {
+    return WrapGrads(RoundToDecimals(WrapGrads(v0), kV0Decimals));
+}
+
+} // namespace pyr

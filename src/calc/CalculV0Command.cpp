@@ -1,0 +1,179 @@
+// The dialog of the orientation of stations run from a command line: its options, and the run that
+// opens the GéoBase, applies what was asked, computes, writes and closes.
+#include "calc/CalculV0Listing.h"
+#include "calc/CalculV0Sta.h"
+#include "calc/CalculV0Texts.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/GeoBaseMessages.h"
+#include "geobase/Selection.h"
+#include "settings/ListingFlow.h"
+#include "ui/FrontEnd.h"
+
+namespace pyr {
+
+namespace {
+
+constexpr const char* kHelpType = "le type de calcul : une station, les stations d'une liste, toutes les "
+                                  "stations (par défaut, celui de la dernière fois)";
+constexpr const char* kHelpStation = "la station à orienter, S1 ou S1(2) pour sa deuxième reprise (calcul "
+                                     "unique ; par défaut la première station)";
+constexpr const char* kHelpReferences = "les points de référence à utiliser (par défaut les visées de "
+                                        "référence de la station)";
+constexpr const char* kHelpCoordinate = " de la station, quand la GéoBase ne la connaît pas";
+constexpr const char* kHelpList = "les stations à orienter, une liste de sélection (calcul d'une liste)";
+constexpr const char* kHelpWeighting = "la moyenne pondérée par les distances (1) ou non (0)";
+constexpr const char* kHelpForce = "garder toutes les références choisies, même hors tolérance";
+constexpr const char* kHelpV0 = "le V0 de la station, fixé à la main (grades), sans calcul";
+constexpr const char* kHelpSave = "écrire les V0 dans les stations et enregistrer la GéoBase";
+constexpr const char* kHelpListing = "écrire le listing sans le demander, dans FICHIER s'il est donné";
+
+// The front end of the listing when its file was named in advance: the file choice gets that name.
+class NamedListingFrontEnd : public ui::FrontEnd {
+public:
+    NamedListingFrontEnd(ui::FrontEnd& inner, std::string path) : m_inner(inner), m_path(std::move(path)) {}
+
+    void MessageBox(std::string_view text, std::string_view caption, int icon) override {
+        m_inner.MessageBox(text, caption, icon);
+    }
+    ui::Answer Ask(std::string_view text, std::string_view caption, ui::Buttons buttons, ui::Answer byDefault,
+                   int icon) override {
+        return m_inner.Ask(text, caption, buttons, byDefault, icon);
+    }
+    std::optional<std::string> ChooseFile(const ui::FileChoice& choice) override {
+        if (choice.title == kListingFileChoiceTitle) return m_path;
+        return m_inner.ChooseFile(choice);
+    }
+    void TextLine(std::string_view line) override { m_inner.TextLine(line); }
+    ui::DialogResult DoModal(ui::DialogModel& dialog) override { return m_inner.DoModal(dialog); }
+    void ShowFile(const std::string& path) override { m_inner.ShowFile(path); }
+
+private:
+    ui::FrontEnd& m_inner;
+    std::string m_path;
+};
+
+// A number of an option, or the French reason it is not one.
+std::string ReadNumber(const char* option, const std::string& text, std::optional<double>& value) {
+    double number = 0;
+    if (!ParseDouble(text, number)) return Sprintf(v0::kBadNumber, option, text.c_str());
+    value = number;
+    return {};
+}
+
+} // namespace
+
+void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
+    using Type = V0CalculationType;
+    options.Value("type", "unique|liste|toutes", kHelpType, [this](const std::string& word) {
+        const struct {
+            const char* word;
+            Type type;
+        } types[] = {{"unique", Type::Unique}, {"liste", Type::Liste}, {"toutes", Type::Toutes}};
+        for (const auto& [name, type] : types)
+            if (EqualIgnoringCase(word, name)) {
+                SetType(type);
+                return std::string();
+            }
+        return Sprintf(v0::kBadType, word.c_str());
+    });
+    options.Value("station", "NOM", kHelpStation, [this](const std::string& designation) {
+        std::string name;
+        int reprise = 0;
+        if (!CCarnet::extrStaRep(designation, name, reprise) || name.empty())
+            return Sprintf(v0::kBadStation, designation.c_str());
+        m_requests.station = designation;
+        SetType(Type::Unique);
+        return std::string();
+    });
+    options.Value("references", "SELECTION", kHelpReferences, [this](const std::string& selection) {
+        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
+        m_requests.references = selection;
+        return std::string();
+    });
+    const struct {
+        const char* name;
+        const char* valueName;
+        std::optional<double>* value;
+    } coordinates[] = {{"x", "X", &m_requests.x}, {"y", "Y", &m_requests.y}, {"z", "Z", &m_requests.z}};
+    for (const auto& [name, valueName, value] : coordinates)
+        options.Value(name, valueName, valueName + std::string(kHelpCoordinate),
+                      [this, name = name, value = value](const std::string& text) {
+                          SetType(Type::Unique);
+                          return ReadNumber(name, text, *value);
+                      });
+    options.Value("liste", "SELECTION", kHelpList, [this](const std::string& selection) {
+        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
+        m_list = selection;
+        SetType(Type::Liste);
+        return std::string();
+    });
+    options.Value("ponderation", "0|1", kHelpWeighting, [this](const std::string& text) {
+        if (text != "0" && text != "1") return Sprintf(v0::kBadSwitch, "ponderation", text.c_str());
+        SetWeighted(text == "1");
+        return std::string();
+    });
+    options.Switch("forcer", kHelpForce, [this] {
+        SetForced(true);
+        return std::string();
+    });
+    options.Value("v0", "VALEUR", kHelpV0, [this](const std::string& text) {
+        SetType(Type::Unique);
+        return ReadNumber("v0", text, m_requests.v0);
+    });
+    options.Switch("enregistrer", kHelpSave, [this] {
+        m_requests.save = true;
+        return std::string();
+    });
+    options.OptionalValue("listing", "FICHIER", kHelpListing, [this](const std::string& path) {
+        m_requests.listing = true;
+        m_requests.listingPath = path;
+        return std::string();
+    });
+}
+
+bool CCalculV0Sta::ApplyRequests() {
+    if (m_requests.station && !ChooseStation(*m_requests.station)) return false;
+    if ((m_requests.x || m_requests.y || m_requests.z) &&
+        !SetStationCoordinates(m_requests.x.value_or(kUndefined), m_requests.y.value_or(kUndefined),
+                               m_requests.z.value_or(kUndefined)))
+        return false;
+    if (m_requests.references && !ChooseReferences(*m_requests.references)) return false;
+    if (m_requests.v0 && Type() != V0CalculationType::Unique) {
+        m_frontEnd->MessageBox(v0::kMsgHandV0OnlyUnique, ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    return true;
+}
+
+ui::DialogResult CCalculV0Sta::Run(ui::FrontEnd& frontEnd) {
+    if (!Open(frontEnd) || !ApplyRequests()) return ui::DialogResult::Failed;
+    const bool done = m_requests.v0 ? EnterV0(*m_requests.v0) : Calculate();
+    const bool saved = done && m_requests.save && Enregistrer();
+    Close(saved);
+    return done && (saved || !m_requests.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+std::string CCalculV0Sta::WriteListing() {
+    std::vector<const V0Result*> results;
+    for (const V0Result& result : m_results)
+        if (result.computed) results.push_back(&result);
+    if (results.empty() || !m_frontEnd) return {};
+    ListingRequest request;
+    request.paramPath = Inputs().paramPath;
+    request.geobasePath = GeoBase();
+    request.kind = ListingKind::StationV0;
+    request.resultCount = results.size();
+    request.writeResult = [&results](CDlgCfgListing& listing, std::size_t i) {
+        WriteV0Result(listing, *results[i]);
+    };
+    request.writeTolerances = [this](CDlgCfgListing& listing) {
+        WriteV0Tolerances(listing, m_settings.tolerances, m_settings.weighted, m_settings.forced);
+    };
+    request.ask = !m_requests.listing;
+    if (m_requests.listingPath.empty()) return WriteComputationListing(*m_frontEnd, request);
+    NamedListingFrontEnd named(*m_frontEnd, m_requests.listingPath);
+    return WriteComputationListing(named, request);
+}
+
+} // namespace pyr

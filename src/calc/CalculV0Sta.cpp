@@ -1,0 +1,366 @@
+#include "calc/CalculV0Sta.h"
+
+#include "calc/CalculV0Texts.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/GeoBaseMessages.h"
+#include "geobase/Selection.h"
+#include "settings/CalcOptions.h"
+#include "settings/LastGeoBase.h"
+#include "settings/ParamStore.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+#include <algorithm>
+#include <filesystem>
+
+namespace pyr {
+
+namespace {
+
+std::string AngleText(double grads) {
+    return IsKnown(grads) ? FormatFixed(grads, CStation::DeciAng()) : std::string("-");
+}
+
+} // namespace
+
+CCalculV0Sta::CCalculV0Sta() = default;
+CCalculV0Sta::~CCalculV0Sta() = default;
+
+std::string CCalculV0Sta::Caption() const {
+    return v0::kCaption;
+}
+
+// ---- Settings ------------------------------------------------------------------------------------------
+
+void CCalculV0Sta::LoadSettings() {
+    if (m_settingsLoaded) return;
+    m_settingsLoaded = true;
+    const std::string_view path = Inputs().paramPath;
+    int type = 0, weighted = 1;
+    ReadParamInt(path, v0::kSection, v0::kKeyType, 0, 0, 2, type);
+    ReadParamInt(path, v0::kSection, v0::kKeyWeighting, 1, 0, 1, weighted);
+    m_type = static_cast<V0CalculationType>(type);
+    m_settings.weighted = weighted != 0;
+    m_settings.tolerances = Tolerances::FromOptions(path);
+    m_settings.correction = DistanceCorrection::FromOptions(path);
+}
+
+void CCalculV0Sta::WriteSettings() {
+    const std::string_view path = Inputs().paramPath;
+    WriteParamInt(path, v0::kSection, v0::kKeyType, static_cast<int>(Type()));
+    WriteParamInt(path, v0::kSection, v0::kKeyWeighting, Weighted() ? 1 : 0);
+}
+
+V0CalculationType CCalculV0Sta::Type() {
+    LoadSettings();
+    return m_type;
+}
+
+void CCalculV0Sta::SetType(V0CalculationType type) {
+    LoadSettings();
+    m_type = type;
+}
+
+bool CCalculV0Sta::Weighted() {
+    LoadSettings();
+    return m_settings.weighted;
+}
+
+void CCalculV0Sta::SetWeighted(bool weighted) {
+    LoadSettings();
+    m_settings.weighted = weighted;
+}
+
+// ---- Opening -------------------------------------------------------------------------------------------
+
+bool CCalculV0Sta::Open(ui::FrontEnd& frontEnd) {
+    m_frontEnd = &frontEnd;
+    LoadSettings();
+    ApplyStoreOptions(Inputs().paramPath);
+    const std::string& path = GeoBase();
+    if (path.empty()) {
+        frontEnd.MessageBox(v0::kMsgNoGeoBase, ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    CPyrTxtWnd txt(frontEnd);
+    if (!m_carnet.Load(&txt, path, {}, 0, &frontEnd)) return false;
+    if (m_carnet.IsEmpty()) {
+        frontEnd.MessageBox(Sprintf(v0::kMsgEmptyGeoBase, path.c_str()), ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    const int first = m_carnet.Find(kKindStation, "");
+    if (first < 0) {
+        frontEnd.MessageBox(Sprintf(v0::kMsgNoStation, path.c_str()), ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    if (const std::string why = m_settings.correction.ProjectionError(); !why.empty())
+        frontEnd.MessageBox(why, ui::kCaption, ui::kIconWarning);
+    m_journal = std::make_unique<CJournal>(path, kJournalStationV0);
+    return ChooseStationAt(first);
+}
+
+// ---- One station ---------------------------------------------------------------------------------------
+
+bool CCalculV0Sta::ChooseStation(std::string_view designation) {
+    std::string name;
+    int reprise = 1;
+    const int index =
+        CCarnet::extrStaRep(designation, name, reprise) ? m_carnet.findStaRep(name, reprise) : -1;
+    if (index < 0) {
+        if (m_frontEnd)
+            m_frontEnd->MessageBox(Sprintf(v0::kMsgStationUnknown, std::string(designation).c_str()),
+                                   ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    return ChooseStationAt(index);
+}
+
+bool CCalculV0Sta::ChooseStationAt(int stationIndex) {
+    if (m_carnet.GetType(stationIndex) != kKindStation) return false;
+    m_station = StationAt(m_carnet, stationIndex);
+    m_typedPlace = false;
+    m_offered.clear();
+    const std::vector<int> offered = OfferedReferences(m_carnet, stationIndex);
+    const std::vector<int> chosen = DefaultReferences(m_carnet, offered);
+    for (int i : offered)
+        m_offered.push_back({i, m_carnet.GetAt(i)->mat(), m_carnet.GetType(i) == kKindReference,
+                             std::find(chosen.begin(), chosen.end(), i) != chosen.end()});
+    return true;
+}
+
+bool CCalculV0Sta::SetStationCoordinates(double x, double y, double z) {
+    if (m_station.index < 0) return false;
+    if (m_carnet.hasXY(m_station.name)) {
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgStationCoordinatesKnown, m_station.name.c_str()), ui::kCaption,
+                               ui::kIconWarning);
+        return false;
+    }
+    if (!IsKnown(x) || !IsKnown(y)) {
+        m_frontEnd->MessageBox(v0::kMsgCoordinatesIncomplete, ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    m_station.x = x;
+    m_station.y = y;
+    m_station.z = z;
+    m_typedPlace = true;
+    return true;
+}
+
+void CCalculV0Sta::ChooseReference(std::size_t rank, bool chosen) {
+    if (rank < m_offered.size()) m_offered[rank].chosen = chosen;
+}
+
+bool CCalculV0Sta::ChooseReferences(std::string_view selection) {
+    std::string why;
+    const std::optional<CSelection> parsed = CSelection::Parse(selection, &why);
+    if (!parsed) {
+        m_frontEnd->MessageBox(msg::kNoSelection, ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    bool any = false;
+    for (Offered& offered : m_offered)
+        any |= offered.chosen = parsed->Contains(offered.mat);
+    if (!any)
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgReferenceNotOffered, m_station.Designation().c_str(),
+                                       std::string(selection).c_str()),
+                               ui::kCaption, ui::kIconWarning);
+    return any;
+}
+
+bool CCalculV0Sta::SetList(std::string_view selection) {
+    if (!IsValidSelString(selection)) {
+        if (m_frontEnd) m_frontEnd->MessageBox(msg::kNoSelection, ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    m_list = selection;
+    return true;
+}
+
+// ---- Computing -----------------------------------------------------------------------------------------
+
+void CCalculV0Sta::Show(const V0Result& result) {
+    CPyrTxtWnd txt(*m_frontEnd);
+    const std::string designation = result.station.Designation();
+    if (result.byHand) {
+        txt.Print(v0::kLineHandV0, designation.c_str(), AngleText(result.v0).c_str());
+        return;
+    }
+    txt.Print(v0::kLineComputed, designation.c_str(), AngleText(result.v0).c_str(), result.used,
+              static_cast<int>(result.references.size()));
+}
+
+void CCalculV0Sta::Keep(V0Result result) {
+    auto same = [&](const V0Result& kept) { return kept.station.index == result.station.index; };
+    auto found = std::find_if(m_results.begin(), m_results.end(), same);
+    if (found != m_results.end())
+        *found = std::move(result);
+    else
+        m_results.push_back(std::move(result));
+}
+
+bool CCalculV0Sta::CalculateStation() {
+    if (m_station.index < 0) return false;
+    if (!m_station.HasPlace()) {
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgStationWithoutCoordinates, m_station.Designation().c_str()),
+                               ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    std::vector<int> chosen;
+    for (const Offered& offered : m_offered)
+        if (offered.chosen) chosen.push_back(offered.index);
+    V0Result result = ComputeStationV0(m_carnet, m_station, chosen, m_settings);
+    for (const std::string& warning : result.warnings)
+        m_frontEnd->MessageBox(warning, ui::kCaption, ui::kIconWarning);
+    if (!result.computed) return false;
+    Show(result);
+    CPyrTxtWnd txt(*m_frontEnd);
+    for (const V0Reference& ref : result.references)
+        txt.Print(v0::kLineReference, ref.mat.c_str(), AngleText(ref.partialV0).c_str(),
+                  AngleText(ref.residual).c_str(), ref.valid ? "" : v0::kLineEliminated);
+    Keep(std::move(result));
+    return true;
+}
+
+int CCalculV0Sta::CalculateList() {
+    std::optional<CSelection> selection;
+    if (m_type == V0CalculationType::Liste) {
+        selection = CSelection::Parse(m_list);
+        if (!selection) {
+            m_frontEnd->MessageBox(msg::kNoSelection, ui::kCaption, ui::kIconWarning);
+            return 0;
+        }
+    }
+    CPyrTxtWnd txt(*m_frontEnd);
+    int computed = 0, named = 0;
+    m_notComputable = 0;
+    for (int i = m_carnet.Find(kKindStation, ""); i >= 0; i = m_carnet.Find(kKindStation, "", i + 1)) {
+        if (selection && !selection->Contains(m_carnet.GetAt(i)->mat())) continue;
+        ++named;
+        const V0Station station = StationAt(m_carnet, i);
+        if (!station.HasPlace()) {
+            ++m_notComputable;
+            txt.Print(v0::kLineNotComputed, station.Designation().c_str(),
+                      Sprintf(v0::kMsgStationWithoutCoordinates, station.name.c_str()).c_str());
+            continue;
+        }
+        V0Result result = ComputeStationV0(
+            m_carnet, station, DefaultReferences(m_carnet, OfferedReferences(m_carnet, i)), m_settings);
+        // One station without references does not stop the others: it is counted and named.
+        for (const std::string& warning : result.warnings)
+            if (warning != v0::kMsgNoValidReference)
+                m_frontEnd->MessageBox(warning, ui::kCaption, ui::kIconWarning);
+        if (!result.computed) {
+            ++m_notComputable;
+            txt.Print(v0::kLineNotComputed, station.Designation().c_str(), v0::kMsgNoValidReference);
+            continue;
+        }
+        Show(result);
+        Keep(std::move(result));
+        ++computed;
+    }
+    if (named == 0)
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgNoStationInList, m_list.c_str()), ui::kCaption,
+                               ui::kIconWarning);
+    else if (m_notComputable > 0)
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgStationsNotComputable, m_notComputable), ui::kCaption,
+                               ui::kIconWarning);
+    return computed;
+}
+
+bool CCalculV0Sta::Calculate() {
+    if (!m_frontEnd) return false;
+    if (Type() == V0CalculationType::Unique) return CalculateStation();
+    return CalculateList() > 0;
+}
+
+bool CCalculV0Sta::EnterV0(double v0) {
+    if (!m_frontEnd || m_station.index < 0) return false;
+    if (!(v0 >= 0.0 && v0 <= 400.0)) {
+        m_frontEnd->MessageBox(v0::kMsgHandV0OutOfRange, ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    V0Result result;
+    result.station = m_station;
+    result.computed = true;
+    result.byHand = true;
+    result.weighted = m_settings.weighted;
+    result.v0 = RoundV0(v0);
+    result.remarks.push_back(v0::kRemarkHandV0);
+    Show(result);
+    Keep(std::move(result));
+    return true;
+}
+
+const V0Result* CCalculV0Sta::StationResult() const {
+    for (const V0Result& result : m_results)
+        if (result.station.index == m_station.index) return &result;
+    return nullptr;
+}
+
+double CCalculV0Sta::V0() const {
+    const V0Result* result = StationResult();
+    return result ? result->v0 : m_station.previousV0;
+}
+
+// ---- Writing -------------------------------------------------------------------------------------------
+
+// The coordinates typed for the station become a point of the GéoBase when the person agrees.
+bool CCalculV0Sta::AddTypedStationPoint() {
+    const V0Result* result = StationResult();
+    if (!m_typedPlace || !result || !result->written || m_carnet.hasXY(m_station.name)) return false;
+    const bool withZ = IsKnown(m_station.z);
+    if (m_frontEnd->Ask(Sprintf(v0::kQuestionAddStationPoint, withZ ? 3 : 2), ui::kCaption,
+                        ui::Buttons::YesNo, ui::Answer::Yes) != ui::Answer::Yes)
+        return false;
+    auto point = std::make_unique<CPointGen>(m_station.name, kUndefined, kUndefined, kUndefined);
+    if (withZ)
+        point->setPt(m_station.x, m_station.y, m_station.z);
+    else
+        point->setPt(m_station.x, m_station.y);
+    const CPointGen kept = *point;
+    if (m_carnet.Add(std::move(point), kKindPoint) < 0) return false;
+    CPyrTxtWnd(*m_frontEnd).Print(v0::kLinePointAdded, m_station.name.c_str());
+    m_journal->AddPoint(kept.mat(), kept.x(), kept.y(), kept.z(), CPointGen::SwapXY());
+    return true;
+}
+
+bool CCalculV0Sta::Enregistrer() {
+    if (!m_frontEnd) return false;
+    int written = 0;
+    for (V0Result& result : m_results) {
+        if (!result.computed || result.written) continue;
+        auto* station = m_carnet.As<CStation>(result.station.index);
+        if (!station) continue;
+        station->setV0(result.v0);
+        result.written = true;
+        m_journal->AddStation(result.station.Designation(), result.v0);
+        ++written;
+    }
+    const bool pointAdded = AddTypedStationPoint();
+    CPyrTxtWnd txt(*m_frontEnd);
+    if (written == 0 && !pointAdded) {
+        txt.PrintText(msg::kNoChange);
+        return true;
+    }
+    const std::string& path = GeoBase();
+    m_carnet.BackUp();
+    if (!m_carnet.Save(path, m_frontEnd, false)) return false;
+    m_written = true;
+    // Recorded whole, so that the next command finds it from whatever folder it is run.
+    std::error_code error;
+    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
+    WriteLastGeoBase(Inputs().paramPath, error ? path : absolute.lexically_normal().string());
+    txt.Print(v0::kLineWritten, written);
+    txt.Print(msg::kSaved, path.c_str());
+    return true;
+}
+
+std::string CCalculV0Sta::Close(bool saved) {
+    if (saved) WriteSettings();
+    std::string listing = WriteListing();
+    if (m_written && m_journal && JournalWanted(Inputs().paramPath)) m_journal->Append();
+    return listing;
+}
+
+} // namespace pyr
