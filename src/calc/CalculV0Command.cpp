@@ -147,7 +147,8 @@ bool CCalculV0Sta::ApplyRequests() {
 }
 
 ui::DialogResult CCalculV0Sta::Run(ui::FrontEnd& frontEnd) {
-    if (!Open(frontEnd) || !ApplyRequests()) return ui::DialogResult::Failed;
+    if (!Open(frontEnd)) return m_cancelled ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
+    if (!ApplyRequests()) return ui::DialogResult::Failed;
     const bool done = m_requests.v0 ? EnterV0(*m_requests.v0) : Calculate();
     const bool saved = done && m_requests.save && Enregistrer();
     Close(saved);

@@ -4,6 +4,7 @@
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/GeoBaseMessages.h"
+#include "geobase/GeoFile.h"
 #include "geobase/Selection.h"
 #include "settings/CalcOptions.h"
 #include "settings/LastGeoBase.h"
@@ -78,6 +79,16 @@ bool CCalculV0Sta::Open(ui::FrontEnd& frontEnd) {
     m_frontEnd = &frontEnd;
     LoadSettings();
     ApplyStoreOptions(Inputs().paramPath);
+    // The last GéoBase is offered first; the person may take another.
+    if (!GeoBaseNamed() && !GeoBase().empty()) {
+        auto chosen =
+            frontEnd.ChooseFile({false, v0::kChooseGeoBase, kGeoFileFilter, kGeoFileExtension, GeoBase()});
+        if (!chosen) {
+            m_cancelled = true;
+            return false;
+        }
+        SetGeoBase(*chosen);
+    }
     const std::string& path = GeoBase();
     if (path.empty()) {
         frontEnd.MessageBox(v0::kMsgNoGeoBase, ui::kCaption, ui::kIconWarning);

@@ -44,8 +44,9 @@ public:
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
 
     // ---- Opening and closing
-    // Loads the GéoBase, reads the options and shows the first station. False, a message having said
-    // why, when there is nothing to orient.
+    // Offers the GéoBase (the last one used) to be confirmed or changed, loads it, reads the options and
+    // shows the first station. False, a message having said why, when there is nothing to orient, or when
+    // the person chose no GéoBase.
     bool Open(ui::FrontEnd& frontEnd);
     // Closes the dialog, after "&Enregistrer" (`saved`) or "Annuler": with results, the listing is
     // offered (or written at once when it was asked for); after "&Enregistrer", the settings of the
@@ -112,6 +113,7 @@ private:
     std::string WriteListing();
 
     ui::FrontEnd* m_frontEnd = nullptr;
+    bool m_cancelled = false; // the person did not choose a GéoBase
     CCarnet m_carnet;
     V0Settings m_settings;
     bool m_settingsLoaded = false;

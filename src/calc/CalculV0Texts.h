@@ -6,6 +6,8 @@ namespace pyr::v0 {
 
 inline constexpr const char* kCaption = "PYRALIS - Calcul des V0 de stations";
 
+inline constexpr const char* kChooseGeoBase = "Sélectionnez la GéoBase à traiter :";
+
 // The dialog's own settings in the parameter file.
 inline constexpr const char* kSection = "Calcul_V0";
 inline constexpr const char* kKeyType = "TypDeCalcul";
