@@ -84,8 +84,3 @@ TEST_F(Validation, CommentsAreMadeOfALabelAndAValue) {
     EXPECT_EQ(value, "TCR 705");
     EXPECT_FALSE(CCarnet::validComment("simple remarque", label, value));
 }
-
-TEST_F(Validation, ProjectionIsRefusedUntilTheProjectionLibraryIsThere) {
-    EXPECT_FALSE(c.Projection("Lambert 93", "CC49", &fe));
-    EXPECT_EQ(fe.messages.size(), 1u);
-}
