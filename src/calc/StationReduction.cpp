@@ -20,7 +20,7 @@ constexpr const char* kGroupStations = "Réduction des stations";
 constexpr const char* kGroupObservations = "Réduction des observations";
 constexpr const char* kGroupEccentrics = "Réduction des excentres et appareils";
 constexpr const char* kSwitchValueName = "0|1";
-constexpr const char* kMsgBadSwitch = "Valeur incorrecte pour --%s : <%s> (0 ou 1 attendu).";
+constexpr const char* kMsgBadSwitch = "--%s : 0 ou 1 attendu, et non « %s ».";
 
 constexpr ReductionSwitch kSwitches[] = {
     {"VisComm", &ReductionOptions::visComm, true, "Réduire les reprises à partir des visées &communes",
@@ -154,9 +154,7 @@ void CReduction_Station::MergeReprises(const std::string& name) {
         for (std::size_t k = 0; k < m_blocks[a].links.size(); ++k) {
             CRepriseBlock& other = m_blocks[m_blocks[a].links[k]];
             if (other.merged) continue;
-            const double height = StationHeight(other);
-            const double dh = IsKnown(reference) && IsKnown(height) ? reference - height : 0.0;
-            AppendReprise(false, m_blocks[a].offsets[k], dh, other);
+            AppendReprise(false, m_blocks[a].offsets[k], HeightBelow(reference, other), other);
         }
     }
     if (merged >= 0 && IsKnown(reference)) SetStationHeight(merged, reference);
@@ -170,9 +168,7 @@ void CReduction_Station::MergeReprises(const std::string& name) {
                 merged = m_merged;
                 continue;
             }
-            const double height = StationHeight(block);
-            AppendReprise(false, 0.0, IsKnown(reference) && IsKnown(height) ? reference - height : 0.0,
-                          block);
+            AppendReprise(false, 0.0, HeightBelow(reference, block), block);
         }
 
     if (m_options.suppress)
@@ -323,6 +319,7 @@ void CReduction_Station::V0Offsets(CRepriseList& blocks, int a) {
 void CReduction_Station::AppendReprise(bool withStation, double angle, double dh, CRepriseBlock& block) {
     if (!m_carnet) return;
     block.merged = 1;
+    if (withStation) m_merged = -1;
     const int end = block.endIndex;
     for (int i = withStation ? block.stationIndex : block.stationIndex + 1; i < end; ++i) {
         const int kind = KindAt(i);
@@ -411,6 +408,11 @@ double CReduction_Station::StationHeight(const CRepriseBlock& block) const {
     const double hi = m_carnet->hiAt(block.stationIndex);
     if (!IsKnown(hi)) return kUndefined;
     return hi + OffsetsAt(block.stationIndex, block.startIndex - 1).vertical;
+}
+
+double CReduction_Station::HeightBelow(double reference, const CRepriseBlock& block) const {
+    const double height = StationHeight(block);
+    return IsKnown(reference) && IsKnown(height) ? reference - height : 0.0;
 }
 
 void CReduction_Station::SetStationHeight(int index, double hi) {

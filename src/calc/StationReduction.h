@@ -126,6 +126,8 @@ private:
     void TurnToFaceLeft(int index);
     void ReduceSighting(int index, int limit, bool faceLeft);
     double StationHeight(const CRepriseBlock& block) const;
+    // How far the instrument of a set-up stands below the reference height; 0 when either is unknown.
+    double HeightBelow(double reference, const CRepriseBlock& block) const;
     void SetStationHeight(int index, double hi);
     void V0Offsets(CRepriseList& blocks, int a);
     void MergeReprises(const std::string& name);

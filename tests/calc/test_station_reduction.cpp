@@ -400,6 +400,33 @@ TEST_F(Reduction, BlocksRunFromTheOffsetsInFrontOfTheStationToItsLastSighting) {
     EXPECT_NEAR(geo.DI(6), 10.2, kTenthMm);
 }
 
+TEST_F(Reduction, TheBlocksFollowTheOffsetsDeletedBetweenCommonSightings) {
+    // Three set-ups of S1, the common sightings of A behind eccentric offsets; the second set-up's
+    // circle reads 10 gr more.
+    for (double turn : {0.0, 10.0, 20.0})
+        geo.Exc(kExcentVer, 0.1)
+            .Sta("S1", 1.5)
+            .Exc(kExcentRad, 0.2)
+            .Ref("A", 1.3, 50.0 + turn, 100.0, 40.0)
+            .Exc(kExcentRad, 0.3)
+            .Mes("P", 1.3, 150.0 + turn, 100.0, 20.0);
+    dialog.SetCarnet(&geo.carnet);
+    dialog.BuildRepriseBlocks("S1");
+    dialog.CommonSightOffset(dialog.Blocks(), 0, 1);
+
+    EXPECT_EQ(geo.Size(), 18 - 4); // the radial offsets of A and P in the first two set-ups
+    EXPECT_NEAR(geo.DI(2), 40.2, kTenthMm);
+    const CRepriseList shifted = dialog.Blocks();
+    ASSERT_EQ(shifted[0].links, std::vector<int>{1});
+    EXPECT_NEAR(shifted[0].offsets[0], 390.0, kMgon);
+    dialog.BuildRepriseBlocks("S1");
+    for (std::size_t b = 0; b < 3; ++b) {
+        EXPECT_EQ(shifted[b].startIndex, dialog.Blocks()[b].startIndex) << b;
+        EXPECT_EQ(shifted[b].stationIndex, dialog.Blocks()[b].stationIndex) << b;
+        EXPECT_EQ(shifted[b].endIndex, dialog.Blocks()[b].endIndex) << b;
+    }
+}
+
 TEST(ReductionOptionsFile, TheSwitchesAreReadWithTheirDefaultsAndWrittenOnOK) {
     TempDir dir;
     const std::string ini = dir / "Pyralis.ini";
@@ -416,8 +443,7 @@ TEST(ReductionOptionsFile, TheSwitchesAreReadWithTheirDefaultsAndWrittenOnOK) {
     ASSERT_EQ(options.Options().size(), 7u);
     EXPECT_EQ(options.Options()[0].name, "VisComm");
     EXPECT_EQ(options.Options()[0].help, "Réduire les reprises à partir des visées communes");
-    EXPECT_EQ(options.Options()[3].apply("oui"),
-              "Valeur incorrecte pour --Suppress : <oui> (0 ou 1 attendu).");
+    EXPECT_EQ(options.Options()[3].apply("oui"), "--Suppress : 0 ou 1 attendu, et non « oui ».");
     EXPECT_EQ(options.Options()[3].apply("0"), "");
     dialog.OnInitDialog();
     EXPECT_FALSE(dialog.Options().visComm);

@@ -80,7 +80,7 @@ TEST_F(EditorReduction, WithoutTheReductionNothingIsReducedAndABadSwitchIsRefuse
 
     EXPECT_EQ(Run(kTwoSetUps, {"--reduction", "--DoMeans", "oui"}), DialogResult::Failed);
     ASSERT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(frontEnd.messages[0].text, "Valeur incorrecte pour --DoMeans : <oui> (0 ou 1 attendu).");
+    EXPECT_EQ(frontEnd.messages[0].text, "--DoMeans : 0 ou 1 attendu, et non « oui ».");
 }
 
 } // namespace
