@@ -2,6 +2,7 @@
 
 #include "calc/Corrections.h"
 #include "core/Angles.h"
+#include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/Carnet.h"
 #include "settings/CalcOptions.h"
@@ -46,6 +47,11 @@ std::string HelpText(std::string_view checkBox) {
     return std::string(Trimmed(text));
 }
 
+// A value computed anew is kept to the decimals of the store's settings; one left as it was stays as read.
+double Kept(double value, double old, int decimals) {
+    return value == old ? old : RoundToDecimals(value, decimals);
+}
+
 } // namespace
 
 std::span<const ReductionSwitch> ReductionSwitches() {
@@ -74,6 +80,7 @@ void CReduction_Station::OnInitDialog() {
         ReadParamInt(path, kSectionReduction, entry.key, value, 0, 1, value);
         m_options.*entry.member = m_given[i].value_or(value != 0);
     }
+    ApplyStoreOptions(path); // the decimals the values computed are kept to
     m_foldVertical = ReadOptionSwitch(path, kSectionCalculations, kKeyFoldVertical);
     const std::vector<InstrumentOptions> instruments = ReadInstruments(path);
     const auto number =
@@ -247,7 +254,9 @@ void CReduction_Station::MeanRepeatedSightings(CRepriseBlock& block) {
             mean.Add(SightingAt(repetition));
             Remove(repetition);
         }
-        mean.WriteInto(first);
+        CMesure result(first);
+        mean.WriteInto(result);
+        StoreSighting(first, result.ah(), result.av(), result.di(), result.hp());
         first.setSym(code);
         if (reference) SetKind(i, kKindReference);
         m_changed = true;
@@ -331,17 +340,17 @@ void CReduction_Station::AppendReprise(bool withStation, double angle, double dh
         if (!IsSightingKind(kind)) continue;
         CVisee& sighting = SightingAt(copy);
         // The direction is turned even when it is unknown, as the merged set-ups always were.
-        sighting.setAH(std::fmod(sighting.ah() + angle, 400.0));
-        if (!IsKnown(sighting.hp())) continue;
-        const double av = sighting.av(), di = sighting.di();
-        if (m_foldVertical && IsKnown(av) && di > 0.0) {
+        const double ah = std::fmod(sighting.ah() + angle, 400.0);
+        double av = sighting.av(), di = sighting.di(), hp = sighting.hp();
+        if (IsKnown(hp) && m_foldVertical && IsKnown(av) && di > 0.0) {
             // The line of sight seen from dh higher: the same horizontal length, dh less to climb.
             const double h = di * SinGrads(av), v = di * CosGrads(av);
-            sighting.setAV(WrapGrads(ZenithRaised(h, v, -dh)));
-            sighting.setDI(std::hypot(h, v - dh));
-        } else {
-            sighting.setHP(sighting.hp() + dh);
+            av = WrapGrads(ZenithRaised(h, v, -dh));
+            di = std::hypot(h, v - dh);
+        } else if (IsKnown(hp)) {
+            hp += dh;
         }
+        StoreSighting(sighting, ah, av, di, hp);
     }
     EndStep(&block);
 }
@@ -350,10 +359,10 @@ void CReduction_Station::AppendReprise(bool withStation, double angle, double dh
 
 void CReduction_Station::StoreSighting(CVisee& sighting, double ah, double av, double di, double hp) {
     if (ah == sighting.ah() && av == sighting.av() && di == sighting.di() && hp == sighting.hp()) return;
-    sighting.setAH(ah);
-    sighting.setAV(av);
-    sighting.setDI(di);
-    sighting.setHP(hp);
+    sighting.setAH(Kept(ah, sighting.ah(), CVisee::DeciAng()));
+    sighting.setAV(Kept(av, sighting.av(), CVisee::DeciAng()));
+    sighting.setDI(Kept(di, sighting.di(), CVisee::DeciXY()));
+    sighting.setHP(Kept(hp, sighting.hp(), CVisee::DeciZ()));
     m_changed = true;
 }
 
@@ -418,7 +427,7 @@ double CReduction_Station::HeightBelow(double reference, const CRepriseBlock& bl
 void CReduction_Station::SetStationHeight(int index, double hi) {
     auto* station = m_carnet->As<CStation>(index);
     if (!station || station->hi() == hi) return;
-    station->setHI(hi);
+    station->setHI(Kept(hi, station->hi(), CStation::DeciZ()));
     m_changed = true;
 }
 

@@ -20,8 +20,7 @@ constexpr const char* kOpened = "GéoBase <%s> : %d élément(s).";
 constexpr int kKindColumn = 14;
 constexpr const char* kReductionOption = "reduction";
 constexpr const char* kReductionHelp =
-    "réduit les stations (réduction des reprises) avant de montrer la GéoBase ; --VisComm ... "
-    "--InAppareil y remplacent les réglages enregistrés";
+    "réduit les stations (réduction des reprises) avant de montrer la GéoBase";
 
 } // namespace
 
