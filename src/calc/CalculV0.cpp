@@ -48,6 +48,37 @@ void CheckReference(const V0Station& station, const V0Reference& ref, double hor
             Sprintf(v0::kMsgDistanceOutOfTolerance, ref.mat.c_str(), ref.distance, dh, ref.distance - dh));
 }
 
+// The planimetry and altitude of a point, each from the first of its elements that holds it: one look-up
+// when its first element holds both, as it mostly does. False when its planimetry is unknown.
+bool PlaceOf(const CCarnet& carnet, std::string_view mat, double& x, double& y, double& z) {
+    const int first = carnet.findMat(mat);
+    if (first < 0) {
+        x = y = z = kUndefined;
+        return false;
+    }
+    const auto* point = static_cast<const CPointGen*>(carnet.GetAt(first));
+    if (point->hasXY() && point->hasZ()) {
+        x = point->x(), y = point->y(), z = point->z();
+        return true;
+    }
+    if (!carnet.hasXY(mat, x, y)) x = y = kUndefined;
+    if (!carnet.hasZ(mat, z)) z = kUndefined;
+    return IsKnown(x);
+}
+
+// The sightings of a kind (or of both kinds, for 0) of the station that aim at points with known planimetry.
+std::vector<int> SightingsOfKnownPoints(const CCarnet& carnet, int stationIndex, int kind) {
+    std::vector<int> sightings;
+    int end = carnet.Find(kKindStation, "", stationIndex + 1);
+    if (end < 0) end = carnet.GetSize();
+    for (int i = stationIndex + 1; i < end; ++i) {
+        const int found = carnet.GetType(i);
+        if (IsSightingKind(found) && (kind == 0 || found == kind) && carnet.hasXY(carnet.GetAt(i)->mat()))
+            sightings.push_back(i);
+    }
+    return sightings;
+}
+
 } // namespace
 
 std::string V0Station::Designation() const {
@@ -59,8 +90,7 @@ V0Station StationAt(const CCarnet& carnet, int stationIndex) {
     station.index = stationIndex;
     station.name = carnet.matAt(stationIndex);
     station.reprise = carnet.RepriseAt(stationIndex);
-    if (!carnet.hasXY(station.name, station.x, station.y)) station.x = station.y = kUndefined;
-    if (!carnet.hasZ(station.name, station.z)) station.z = kUndefined;
+    PlaceOf(carnet, station.name, station.x, station.y, station.z);
     station.hi = carnet.hiAt(stationIndex);
     if (IsKnown(station.hi)) station.hi += carnet.findEV(stationIndex, -1);
     station.previousV0 = carnet.v0At(stationIndex);
@@ -68,19 +98,12 @@ V0Station StationAt(const CCarnet& carnet, int stationIndex) {
 }
 
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex) {
-    std::vector<int> offered;
-    int end = carnet.Find(kKindStation, "", stationIndex + 1);
-    if (end < 0) end = carnet.GetSize();
-    for (int i = stationIndex + 1; i < end; ++i)
-        if (IsSightingKind(carnet.GetType(i)) && carnet.hasXY(carnet.GetAt(i)->mat())) offered.push_back(i);
-    return offered;
+    return SightingsOfKnownPoints(carnet, stationIndex, 0);
 }
 
-std::vector<int> DefaultReferences(const CCarnet& carnet, const std::vector<int>& offered) {
-    std::vector<int> references;
-    for (int i : offered)
-        if (carnet.GetType(i) == kKindReference) references.push_back(i);
-    return references.empty() ? offered : references;
+std::vector<int> DefaultReferences(const CCarnet& carnet, int stationIndex) {
+    std::vector<int> references = SightingsOfKnownPoints(carnet, stationIndex, kKindReference);
+    return references.empty() ? OfferedReferences(carnet, stationIndex) : references;
 }
 
 V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, int sighting,
@@ -93,9 +116,7 @@ V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, in
         return ref;
     }
     ref.mat = visee->mat();
-    if (!carnet.hasXY(ref.mat, ref.x, ref.y)) ref.x = ref.y = kUndefined;
-    if (!carnet.hasZ(ref.mat, ref.z)) ref.z = kUndefined;
-    if (!station.HasPlace() || !IsKnown(ref.x)) {
+    if (!PlaceOf(carnet, ref.mat, ref.x, ref.y, ref.z) || !station.HasPlace()) {
         ref.valid = false;
         return ref;
     }

@@ -77,7 +77,7 @@ V0Station StationAt(const CCarnet& carnet, int stationIndex);
 // points whose planimetry is known, in GéoBase order.
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex);
 // Those chosen at first among them: the reference sightings (1002), or all when there is none.
-std::vector<int> DefaultReferences(const CCarnet& carnet, const std::vector<int>& offered);
+std::vector<int> DefaultReferences(const CCarnet& carnet, int stationIndex);
 
 // The partial orientation of one sighting from the station: the sighting turned to face left, reduced
 // for its eccentric offsets, its horizontal distance corrected for scale and checked, with the

@@ -132,11 +132,14 @@ bool CCalculV0Sta::ChooseStationAt(int stationIndex) {
     m_station = StationAt(m_carnet, stationIndex);
     m_typedPlace = false;
     m_offered.clear();
-    const std::vector<int> offered = OfferedReferences(m_carnet, stationIndex);
-    const std::vector<int> chosen = DefaultReferences(m_carnet, offered);
-    for (int i : offered)
-        m_offered.push_back({i, m_carnet.GetAt(i)->mat(), m_carnet.GetType(i) == kKindReference,
-                             std::find(chosen.begin(), chosen.end(), i) != chosen.end()});
+    for (int i : OfferedReferences(m_carnet, stationIndex)) {
+        const bool reference = m_carnet.GetType(i) == kKindReference;
+        m_offered.push_back({i, m_carnet.GetAt(i)->mat(), reference, reference});
+    }
+    // Without reference sightings, every sighting of a known point is chosen.
+    if (std::none_of(m_offered.begin(), m_offered.end(), [](const Offered& o) { return o.reference; }))
+        for (Offered& offered : m_offered)
+            offered.chosen = true;
     return true;
 }
 
@@ -201,13 +204,13 @@ void CCalculV0Sta::Show(const V0Result& result) {
               static_cast<int>(result.references.size()));
 }
 
+// A station computed again replaces its earlier result, in its place.
 void CCalculV0Sta::Keep(V0Result result) {
-    auto same = [&](const V0Result& kept) { return kept.station.index == result.station.index; };
-    auto found = std::find_if(m_results.begin(), m_results.end(), same);
-    if (found != m_results.end())
-        *found = std::move(result);
-    else
+    const auto [at, added] = m_resultOf.try_emplace(result.station.index, m_results.size());
+    if (added)
         m_results.push_back(std::move(result));
+    else
+        m_results[at->second] = std::move(result);
 }
 
 bool CCalculV0Sta::CalculateStation() {
@@ -255,8 +258,7 @@ int CCalculV0Sta::CalculateList() {
                       Sprintf(v0::kMsgStationWithoutCoordinates, station.name.c_str()).c_str());
             continue;
         }
-        V0Result result = ComputeStationV0(
-            m_carnet, station, DefaultReferences(m_carnet, OfferedReferences(m_carnet, i)), m_settings);
+        V0Result result = ComputeStationV0(m_carnet, station, DefaultReferences(m_carnet, i), m_settings);
         // One station without references does not stop the others: it is counted and named.
         for (const std::string& warning : result.warnings)
             if (warning != v0::kMsgNoValidReference)
@@ -304,9 +306,8 @@ bool CCalculV0Sta::EnterV0(double v0) {
 }
 
 const V0Result* CCalculV0Sta::StationResult() const {
-    for (const V0Result& result : m_results)
-        if (result.station.index == m_station.index) return &result;
-    return nullptr;
+    const auto found = m_resultOf.find(m_station.index);
+    return found == m_resultOf.end() ? nullptr : &m_results[found->second];
 }
 
 double CCalculV0Sta::V0() const {

@@ -9,6 +9,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <unordered_map>
 #include <vector>
 
 namespace pyr {
@@ -125,6 +126,7 @@ private:
     std::string m_list;
 
     std::vector<V0Result> m_results;
+    std::unordered_map<int, std::size_t> m_resultOf; // station index to its result
     int m_notComputable = 0;
     std::unique_ptr<CJournal> m_journal;
     bool m_written = false;
