@@ -166,8 +166,8 @@ void CCalculV0Sta::ChooseReference(std::size_t rank, bool chosen) {
 }
 
 bool CCalculV0Sta::ChooseReferences(std::string_view selection) {
-    std::string why;
-    const std::optional<CSelection> parsed = CSelection::Parse(selection, &why);
+    if (!m_frontEnd) return false;
+    const std::optional<CSelection> parsed = CSelection::Parse(selection);
     if (!parsed) {
         m_frontEnd->MessageBox(msg::kNoSelection, ui::kCaption, ui::kIconWarning);
         return false;
