@@ -15,17 +15,20 @@ namespace pyr {
 namespace {
 
 constexpr const char* kHelpType = "le type de calcul : une station, les stations d'une liste, toutes les "
-                                  "stations (par défaut, celui de la dernière fois)";
+                                  "stations (par défaut, celui de la dernière fois) ; en liste et toutes, "
+                                  "chaque station prend ses visées de référence";
 constexpr const char* kHelpStation = "la station à orienter, S1 ou S1(2) pour sa deuxième reprise (calcul "
                                      "unique ; par défaut la première station)";
 constexpr const char* kHelpReferences = "les points de référence à utiliser (par défaut les visées de "
                                         "référence de la station)";
 constexpr const char* kHelpCoordinate = " de la station, quand la GéoBase ne la connaît pas";
-constexpr const char* kHelpList = "les stations à orienter, une liste de sélection (calcul d'une liste)";
+constexpr const char* kHelpList = "les stations à orienter, toutes leurs reprises (calcul d'une liste) ; "
+                                  "celles sans coordonnées ou sans référence valide sont nommées et comptées";
 constexpr const char* kHelpWeighting = "la moyenne pondérée par les distances (1) ou non (0)";
 constexpr const char* kHelpForce = "garder toutes les références choisies, même hors tolérance";
-constexpr const char* kHelpV0 = "le V0 de la station, fixé à la main (grades), sans calcul";
-constexpr const char* kHelpSave = "écrire les V0 dans les stations et enregistrer la GéoBase";
+constexpr const char* kHelpV0 = "le V0 de la station fixé à la main (grades), écrit comme un V0 calculé";
+constexpr const char* kHelpSave = "écrire les V0 dans les stations et enregistrer la GéoBase (avec des "
+                                  "coordonnées tapées, propose d'y ajouter le point de la station)";
 constexpr const char* kHelpListing = "écrire le listing sans le demander, dans FICHIER s'il est donné";
 
 // The front end of the listing when its file was named in advance: the file choice gets that name.
