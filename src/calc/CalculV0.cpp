@@ -1,6 +1,7 @@
 #include "calc/CalculV0.h"
 
 #include "calc/CalculV0Texts.h"
+#include "calc/Corrections.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -12,9 +13,6 @@ namespace pyr {
 
 namespace {
 
-// The combined curvature and refraction term of a trigonometric height difference, per square metre of
-// horizontal distance: (1 - k) / 2R with k = 0.16 and R = 6 384 km, that is 0.84 / 12 768 000.
-constexpr double kCurvatureRefraction = 6.578947368421052e-08;
 // A reference closer than this to the station gives no direction.
 constexpr double kSamePlace = 0.0001;
 // Residuals below this are the rounding of the mean, not a spread of the references.
@@ -26,19 +24,18 @@ std::string AngleText(double grads) {
 }
 
 // The trigonometric height difference from the station's ground to the reference's, measured: the
-// difference of the line of sight, the instrument and target heights, curvature and refraction. From the
-// horizontal distance as measured: the scale of the projection has nothing to do with heights.
+// difference of the line of sight over the corrected horizontal distance, the instrument and target
+// heights, curvature and refraction.
 double MeasuredHeightDifference(double horizontal, double zenith, double hi, double hp) {
-    return horizontal * CosGrads(zenith) / SinGrads(zenith) + hi - hp +
-           kCurvatureRefraction * horizontal * horizontal;
+    return horizontal * CosGrads(zenith) / SinGrads(zenith) + hi - hp + CurvatureRefraction(horizontal);
 }
 
-void CheckReference(const V0Station& station, const V0Reference& ref, double horizontal, double zenith,
-                    double hp, const V0Settings& settings, std::vector<std::string>& warnings) {
+void CheckReference(const V0Station& station, const V0Reference& ref, double zenith, double hp,
+                    const V0Settings& settings, std::vector<std::string>& warnings) {
     const double dh = ref.measuredDistance;
     if (IsKnown(station.z) && IsKnown(ref.z) && IsKnown(station.hi) && IsKnown(hp)) {
         const double computed = ref.z - station.z;
-        const double measured = MeasuredHeightDifference(horizontal, zenith, station.hi, hp);
+        const double measured = MeasuredHeightDifference(dh, zenith, station.hi, hp);
         if (std::fabs(computed - measured) > settings.tolerances.HeightDifference(dh, zenith, kHeightTermsV0))
             warnings.push_back(Sprintf(v0::kMsgHeightOutOfTolerance, ref.mat.c_str(), computed, measured,
                                        computed - measured));
@@ -135,7 +132,7 @@ V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, in
     if (horizontal > 0.0) {
         ref.measuredDistance = horizontal;
         CorrectHorizontalDistance(ref.measuredDistance, station.x, station.y, station.z, settings.correction);
-        CheckReference(station, ref, horizontal, av, hp, settings, warnings);
+        CheckReference(station, ref, av, hp, settings, warnings);
     }
 
     if (IsKnown(ah)) ref.partialV0 = WrapGrads(ref.bearing - ah); // else dropped, with its remark

@@ -31,31 +31,6 @@ constexpr const char* kHelpSave = "écrire les V0 dans les stations et enregistr
                                   "coordonnées tapées, propose d'y ajouter le point de la station)";
 constexpr const char* kHelpListing = "écrire le listing sans le demander, dans FICHIER s'il est donné";
 
-// The front end of the listing when its file was named in advance: the file choice gets that name.
-class NamedListingFrontEnd : public ui::FrontEnd {
-public:
-    NamedListingFrontEnd(ui::FrontEnd& inner, std::string path) : m_inner(inner), m_path(std::move(path)) {}
-
-    void MessageBox(std::string_view text, std::string_view caption, int icon) override {
-        m_inner.MessageBox(text, caption, icon);
-    }
-    ui::Answer Ask(std::string_view text, std::string_view caption, ui::Buttons buttons, ui::Answer byDefault,
-                   int icon) override {
-        return m_inner.Ask(text, caption, buttons, byDefault, icon);
-    }
-    std::optional<std::string> ChooseFile(const ui::FileChoice& choice) override {
-        if (choice.title == kListingFileChoiceTitle) return m_path;
-        return m_inner.ChooseFile(choice);
-    }
-    void TextLine(std::string_view line) override { m_inner.TextLine(line); }
-    ui::DialogResult DoModal(ui::DialogModel& dialog) override { return m_inner.DoModal(dialog); }
-    void ShowFile(const std::string& path) override { m_inner.ShowFile(path); }
-
-private:
-    ui::FrontEnd& m_inner;
-    std::string m_path;
-};
-
 // A number of an option, or the French reason it is not one.
 std::string ReadNumber(const char* option, const std::string& text, std::optional<double>& value) {
     double number = 0;
@@ -175,9 +150,8 @@ std::string CCalculV0Sta::WriteListing() {
         WriteV0Tolerances(listing, m_settings.tolerances, m_settings.weighted, m_settings.forced);
     };
     request.ask = !m_requests.listing;
-    if (m_requests.listingPath.empty()) return WriteComputationListing(*m_frontEnd, request);
-    NamedListingFrontEnd named(*m_frontEnd, m_requests.listingPath);
-    return WriteComputationListing(named, request);
+    request.path = m_requests.listingPath;
+    return WriteComputationListing(*m_frontEnd, request);
 }
 
 } // namespace pyr

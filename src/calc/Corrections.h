@@ -25,6 +25,12 @@ bool ReduceToFaceLeft(double& ah, double& av);
 void ReduceEccentricSighting(double& ah, double& av, double& di, double& hp, double er, double et, double ev,
                              bool foldVertical);
 
+// The combined curvature and refraction term of a trigonometric height difference over a horizontal
+// distance Dh, in metres: Dh² (1 - k) / 2R with k = 0.16 and R = 6 384 km, that is 0.84 / 12 768 000 Dh².
+constexpr double CurvatureRefraction(double dh) {
+    return dh * dh * 6.578947368421052e-08;
+}
+
 // The scale correction of horizontal distances, as the corrections options set it.
 struct DistanceCorrection {
     bool automatic = false;        // "CorrAuto": from the projection and the height of the place

@@ -48,7 +48,9 @@ std::string WriteComputationListing(ui::FrontEnd& frontEnd, const ListingRequest
     const std::string extension = ListingExtension(request.kind, richText);
     std::string path = CDlgCfgListing::GetListingName(request.geobasePath, extension);
 
-    if (ReadOptionSwitch(request.paramPath, kSectionListings, kKeyChooseListingName)) {
+    if (!request.path.empty()) {
+        path = WithExtension(request.path, extension);
+    } else if (ReadOptionSwitch(request.paramPath, kSectionListings, kKeyChooseListingName)) {
         ui::FileChoice choice;
         choice.save = true;
         choice.title = kListingFileChoiceTitle;

@@ -25,6 +25,9 @@ struct ListingRequest {
     std::function<void(CDlgCfgListing&)> writeTolerances;
     // False when the person already asked for the listing ("Fin + Listing"): no question.
     bool ask = true;
+    // The listing's file when it was named in advance (on a command line): no file choice, whatever
+    // "ChoixNomListing" says. A name without an extension takes the listing's.
+    std::string path;
 };
 
 // Writes the listing and returns its path, or "" when nothing was written (no result, No to the

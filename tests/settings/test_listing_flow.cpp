@@ -24,10 +24,11 @@ protected:
     }
 
     // Each result writes its point's name; the tolerances, a line of their own.
-    std::string Write(ListingKind kind, std::size_t results, bool ask = true) {
+    std::string Write(ListingKind kind, std::size_t results, bool ask = true, std::string named = {}) {
         auto result = [](CDlgCfgListing& listing, std::size_t i) { listing.WriteLine("P%zu\n", i + 1); };
         auto tolerances = [](CDlgCfgListing& listing) { listing.WriteLine("Tolérance : 0.0100 Gr\n"); };
-        return WriteComputationListing(frontEnd, {path, geobase, kind, results, result, tolerances, ask});
+        return WriteComputationListing(frontEnd,
+                                       {path, geobase, kind, results, result, tolerances, ask, named});
     }
 
     std::string geobase = folder / "chantier.geo";
@@ -90,6 +91,10 @@ TEST_F(ListingFlow, FileChoiceOffersTheDefaultNameWithTheFormsFilter) {
     EXPECT_TRUE(frontEnd.fileChoices[0].save);
     EXPECT_EQ(frontEnd.fileChoices[0].filter, "Listing de calcul de V0 (*.cv0)|*.cv0||");
     EXPECT_EQ(frontEnd.fileChoices[0].startPath, folder / "chantier.cv0");
+
+    // A file named in advance is taken as it is, without the choice.
+    EXPECT_EQ(Write(ListingKind::StationV0, 1, false, folder / "nommé"), folder / "nommé.cv0");
+    EXPECT_EQ(frontEnd.fileChoices.size(), 1u);
 }
 
 TEST_F(ListingFlow, RichTextListingIsAlwaysReplacedWithoutAQuestion) {
