@@ -24,12 +24,17 @@ release: deps
 	cmake -S . -B $(RELEASE_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Release -DPYR_TESTS=OFF -DPYR_BENCH=ON
 	cmake --build $(RELEASE_DIR) -j $(JOBS)
 
-# The commands of the module, then the GéoBase editor on the bundled job, with a parameter file of the
-# demo's own (the user's settings are left alone).
+# The commands of the module, then the GéoBase editor on a copy of the bundled job, then the orientation
+# of every station with its listing, with a parameter file of the demo's own (the user's settings are
+# left alone).
 demo: release
-	@mkdir -p $(DEMO_DIR)
+	@rm -rf $(DEMO_DIR) && mkdir -p $(DEMO_DIR)
+	@cp data/chantier-demo.geo $(DEMO_DIR)/
 	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini </dev/null
-	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini GeoEdit --geobase data/chantier-demo.geo
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini GeoEdit --geobase $(DEMO_DIR)/chantier-demo.geo
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalculV0 \
+		--geobase $(DEMO_DIR)/chantier-demo.geo --type toutes --enregistrer --listing $(DEMO_DIR)/chantier-demo.cv0
+	@cat $(DEMO_DIR)/chantier-demo.cv0
 
 check: deps
 	cmake -S . -B $(CHECK_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPYR_SANITIZE=ON -DPYR_WERROR=ON

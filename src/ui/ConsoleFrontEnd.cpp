@@ -94,7 +94,9 @@ bool RunEditor(const char* command, const std::string& path) {
 // Hands the file to the desktop's viewer without waiting for it: an intermediate process starts it and
 // ends at once, so that the viewer belongs to no one here and leaves no zombie behind.
 bool OpenWithDesktop(const std::string& path) {
-    std::vector<std::string> words = {"xdg-open", path};
+    std::vector<std::string> words;
+    words.emplace_back("xdg-open");
+    words.push_back(path);
     std::vector<char*> argv = Argv(words);
     pid_t intermediate = fork();
     if (intermediate < 0) return false;
@@ -115,7 +117,7 @@ ConsoleFrontEnd::ConsoleFrontEnd(std::FILE* in, std::FILE* out, std::FILE* err)
 
 void ConsoleFrontEnd::MessageBox(std::string_view text, std::string_view caption, int icon) {
     const char* word = IconWord(icon);
-    std::fprintf(m_err, "%.*s%s%s : %.*s\n", static_cast<int>(caption.size()), caption.data(),
+    std::fprintf(Err(), "%.*s%s%s : %.*s\n", static_cast<int>(caption.size()), caption.data(),
                  word ? " - " : "", word ? word : "", static_cast<int>(text.size()), text.data());
     std::fflush(m_err);
 }
@@ -123,17 +125,17 @@ void ConsoleFrontEnd::MessageBox(std::string_view text, std::string_view caption
 Answer ConsoleFrontEnd::Ask(std::string_view text, std::string_view caption, Buttons buttons,
                             Answer byDefault, int) {
     const bool cancel = buttons == Buttons::YesNoCancel;
-    std::fprintf(m_err, "%.*s : %.*s\n", static_cast<int>(caption.size()), caption.data(),
+    std::fprintf(Err(), "%.*s : %.*s\n", static_cast<int>(caption.size()), caption.data(),
                  static_cast<int>(text.size()), text.data());
     if (!m_interactive) {
         Answer answer = m_batchAnswer.value_or(byDefault);
         if (answer == Answer::Cancel && !cancel) answer = byDefault;
-        std::fprintf(m_err, "Réponse : %s\n", AnswerWord(answer));
+        std::fprintf(Err(), "Réponse : %s\n", AnswerWord(answer));
         std::fflush(m_err);
         return answer;
     }
     while (true) {
-        std::fprintf(m_err, "(o)ui / (n)on%s [%s] ? ", cancel ? " / (a)nnuler" : "", AnswerWord(byDefault));
+        std::fprintf(Err(), "(o)ui / (n)on%s [%s] ? ", cancel ? " / (a)nnuler" : "", AnswerWord(byDefault));
         std::fflush(m_err);
         std::string line = ReadLine(m_in);
         if (line == "\x04" || line.empty()) return byDefault;
@@ -147,10 +149,10 @@ Answer ConsoleFrontEnd::Ask(std::string_view text, std::string_view caption, But
 std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice) {
     if (!m_interactive) {
         if (choice.startPath.empty()) return std::nullopt;
-        std::fprintf(m_err, "%s %s\n", choice.title.c_str(), choice.startPath.c_str());
+        std::fprintf(Err(), "%s %s\n", choice.title.c_str(), choice.startPath.c_str());
         return choice.startPath;
     }
-    std::fprintf(m_err, "%s [%s] ", choice.title.c_str(), choice.startPath.c_str());
+    std::fprintf(Err(), "%s [%s] ", choice.title.c_str(), choice.startPath.c_str());
     std::fflush(m_err);
     std::string line = ReadLine(m_in);
     if (line == "\x04") return std::nullopt;
@@ -160,7 +162,7 @@ std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice)
 }
 
 std::optional<std::string> ConsoleFrontEnd::Prompt(std::string_view prompt) {
-    std::fprintf(m_err, "%.*s", static_cast<int>(prompt.size()), prompt.data());
+    std::fprintf(Err(), "%.*s", static_cast<int>(prompt.size()), prompt.data());
     std::fflush(m_err);
     std::string line = ReadLine(m_in);
     if (line == "\x04") return std::nullopt;
@@ -178,7 +180,7 @@ void ConsoleFrontEnd::ShowFile(const std::string& path) {
         const char* command = visual && *visual ? visual : editor && *editor ? editor : nullptr;
         if (command ? RunEditor(command, path) : OpenWithDesktop(path)) return;
     }
-    std::fprintf(m_err, "Fichier à consulter : %s\n", path.c_str());
+    std::fprintf(Err(), "Fichier à consulter : %s\n", path.c_str());
     std::fflush(m_err);
 }
 
@@ -199,7 +201,7 @@ DialogResult ConsoleFrontEnd::DoModal(DialogModel& dialog) {
         result = DialogResult::Cancel;
         break;
     case CommandLineOutcome::Kind::Usage:
-        std::fprintf(m_err, "pyralis %s : %s\n", m_command.c_str(), outcome.text.c_str());
+        std::fprintf(Err(), "pyralis %s : %s\n", m_command.c_str(), outcome.text.c_str());
         std::fflush(m_err);
         status = 2;
         break;

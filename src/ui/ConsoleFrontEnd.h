@@ -39,6 +39,13 @@ public:
     void ShowFile(const std::string& path) override;
 
 private:
+    // The error stream, after what the text window wrote: both keep their order when they go to one
+    // place (a terminal, a log).
+    std::FILE* Err() {
+        std::fflush(m_out);
+        return m_err;
+    }
+
     std::FILE* m_in;
     std::FILE* m_out;
     std::FILE* m_err;
