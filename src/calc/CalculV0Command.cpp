@@ -86,11 +86,7 @@ void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
         SetType(Type::Liste);
         return std::string();
     });
-    options.Value("ponderation", "0|1", kHelpWeighting, [this](const std::string& text) {
-        if (text != "0" && text != "1") return Sprintf(v0::kBadSwitch, "ponderation", text.c_str());
-        SetWeighted(text == "1");
-        return std::string();
-    });
+    options.ZeroOrOne("ponderation", kHelpWeighting, [this](bool weighted) { SetWeighted(weighted); });
     options.Switch("forcer", kHelpForce, [this] {
         SetForced(true);
         return std::string();

@@ -43,7 +43,6 @@ inline constexpr const char* kMsgHandV0OnlyUnique = "Un V0 fixé ne s'entre que 
 
 // The command line.
 inline constexpr const char* kBadType = "Type de calcul inconnu : « %s » (unique, liste ou toutes).";
-inline constexpr const char* kBadSwitch = "--%s : 0 ou 1 attendu, et non « %s ».";
 inline constexpr const char* kBadNumber = "--%s : « %s » n'est pas un nombre.";
 inline constexpr const char* kBadStation =
     "Désignation de station incorrecte : « %s » (S1, ou S1(2) pour une reprise).";

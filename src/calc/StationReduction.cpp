@@ -20,8 +20,6 @@ namespace {
 constexpr const char* kGroupStations = "Réduction des stations";
 constexpr const char* kGroupObservations = "Réduction des observations";
 constexpr const char* kGroupEccentrics = "Réduction des excentres et appareils";
-constexpr const char* kSwitchValueName = "0|1";
-constexpr const char* kMsgBadSwitch = "--%s : 0 ou 1 attendu, et non « %s ».";
 
 constexpr ReductionSwitch kSwitches[] = {
     {"VisComm", &ReductionOptions::visComm, true, "Réduire les reprises à partir des visées &communes",
@@ -63,12 +61,7 @@ std::span<const ReductionSwitch> ReductionSwitches() {
 void CReduction_Station::DeclareOptions(ui::DialogOptions& options) {
     for (std::size_t i = 0; i < std::size(kSwitches); ++i) {
         const ReductionSwitch& entry = kSwitches[i];
-        options.Value(entry.key, kSwitchValueName, HelpText(entry.checkBox),
-                      [this, i, key = entry.key](const std::string& value) {
-                          if (value != "0" && value != "1") return Sprintf(kMsgBadSwitch, key, value.c_str());
-                          m_given[i] = value == "1";
-                          return std::string();
-                      });
+        options.ZeroOrOne(entry.key, HelpText(entry.checkBox), [this, i](bool on) { m_given[i] = on; });
     }
 }
 

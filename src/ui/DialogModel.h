@@ -44,6 +44,8 @@ public:
     void Switch(std::string name, std::string help, std::function<std::string()> action);
     // "--name [VALUE]": an action that may be given a value (the value is empty when it is left out).
     void OptionalValue(std::string name, std::string valueName, std::string help, Apply apply);
+    // "--name 0|1": a check box of the dialog; any other value is refused.
+    void ZeroOrOne(std::string name, std::string help, std::function<void(bool)> set);
 
     const std::vector<Option>& Options() const { return m_options; }
 
