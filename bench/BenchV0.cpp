@@ -2,6 +2,7 @@
 // stations, each found with its references through the store's index, never by a scan of the GéoBase.
 #include "JobGenerator.h"
 #include "calc/CalculV0Sta.h"
+#include "calc/Corrections.h"
 #include "core/Angles.h"
 #include "geobase/Elements.h"
 #include "geobase/Kinds.h"
@@ -34,7 +35,6 @@ public:
 // The job's reference sightings read again as a good instrument would read them from the coordinates:
 // each station's circle turned by a V0 of its own, the directions off by at most 0.1 mgon.
 void ReadReferencesFromCoordinates(CCarnet& carnet) {
-    constexpr double kCurvature = 6.578947368421052e-08;
     double sx = 0, sy = 0, sz = 0, hi = 0, v0 = 0;
     bool placed = false;
     for (int i = 0; i < carnet.GetSize(); ++i) {
@@ -50,7 +50,7 @@ void ReadReferencesFromCoordinates(CCarnet& carnet) {
         auto* sighting = carnet.As<CVisee>(i);
         if (!carnet.hasXY(sighting->mat(), tx, ty) || !carnet.hasZ(sighting->mat(), tz)) continue;
         const double horizontal = std::hypot(tx - sx, ty - sy);
-        const double rise = tz + sighting->hp() - sz - hi - kCurvature * horizontal * horizontal;
+        const double rise = tz + sighting->hp() - sz - hi - CurvatureRefraction(horizontal);
         const double noise = ((i * 7919) % 21 - 10) * 1e-5;
         sighting->setAH(WrapGrads(Bearing(sx, sy, tx, ty) - v0 + noise));
         sighting->setAV(RadiansToGrads(std::atan2(horizontal, rise)));
