@@ -78,6 +78,16 @@ bool LooksLikeOption(const std::string& word) {
            (word[1] == '-' || std::isalpha(static_cast<unsigned char>(word[1])));
 }
 
+// Steps over the `count` values that follow words[i]; false when the words end first or an option
+// stands in their place.
+bool TakeValues(const std::vector<std::string>& words, std::size_t& i, int count) {
+    for (int n = 0; n < count; ++n) {
+        if (i + 1 == words.size() || LooksLikeOption(words[i + 1])) return false;
+        ++i;
+    }
+    return true;
+}
+
 // The faults of values: a value option last or followed by another option, "--x=" with nothing after
 // it, a switch given a value. Unknown options and stray words are left to the parse.
 std::optional<CommandLineOutcome> CheckValues(const DialogOptions& options, std::string_view command,
@@ -93,13 +103,13 @@ std::optional<CommandLineOutcome> CheckValues(const DialogOptions& options, std:
         if (IsSwitch(*option)) {
             if (equal != std::string::npos) return Usage(command, kNoValueTaken, "--" + name);
         } else if (equal != std::string::npos) {
-            if (equal + 1 == word.size()) return Usage(command, kMissingValue, "--" + name);
+            // "--x=v" gives the first value; the others follow.
+            if (equal + 1 == word.size() || !TakeValues(words, i, option->count - 1))
+                return Usage(command, kMissingValue, "--" + name);
         } else if (option->optional) {
             if (i + 1 < words.size() && words[i + 1] != "--" && !LooksLikeOption(words[i + 1])) ++i;
-        } else if (i + 1 == words.size() || LooksLikeOption(words[i + 1])) {
+        } else if (!TakeValues(words, i, option->count)) {
             return Usage(command, kMissingValue, "--" + name);
-        } else {
-            ++i; // its value
         }
     }
     return std::nullopt;
@@ -123,7 +133,7 @@ CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view comman
             CLI::Option* parsed = IsSwitch(option)
                                       ? app.add_flag("--" + option.name)
                                       : app.add_option("--" + option.name)
-                                            ->expected(option.optional ? 0 : 1, 1)
+                                            ->expected(option.optional ? 0 : option.count, option.count)
                                             ->allow_extra_args(false)
                                             ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll);
             declared[parsed] = &option;
@@ -142,36 +152,57 @@ CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view comman
         return Usage(command, kBadLine, "");
     }
 
-    // The extras keep the "--" that ends the options; what follows it is only words, whatever their
-    // first character.
-    std::vector<std::string> extras = app.remaining();
-    if (!extras.empty()) {
-        const bool words = extras.front() == "--";
-        if (words) extras.erase(extras.begin());
-        if (!extras.empty()) {
-            const std::string& word = extras.front();
-            if (!words && word.size() > 1 && word[0] == '-')
-                return Usage(command, kUnknownOption, word.substr(0, word.find('=')));
-            return Usage(command, kUnexpectedArgument, word);
+    // The extras are the positional words, in their order; they keep the "--" that ends the options,
+    // and what follows it is only words, whatever their first character.
+    std::vector<std::string> positionals;
+    bool words = false;
+    for (const std::string& word : app.remaining()) {
+        if (!words && word == "--") {
+            words = true;
+            continue;
         }
+        if (!words && word.size() > 1 && word[0] == '-')
+            return Usage(command, kUnknownOption, word.substr(0, word.find('=')));
+        if (positionals.size() == options.Positionals().size())
+            return Usage(command, kUnexpectedArgument, word);
+        positionals.push_back(word);
     }
 
-    // Each occurrence in the order given, with its value: the n-th occurrence of a value option holds
-    // its n-th result.
-    std::vector<std::pair<const Option*, std::string>> given;
+    // Each occurrence in the order given, with its values. The parse names an option once for each value
+    // it took: the n-th occurrence of an option of k values holds the results n*k to n*k + k - 1.
+    std::vector<std::pair<const Option*, std::vector<std::string>>> given;
     std::map<const CLI::Option*, std::size_t> seen;
     for (const CLI::Option* parsed : app.parse_order()) {
         auto found = declared.find(parsed);
         if (found == declared.end()) continue;
         const Option& option = *found->second;
-        std::size_t occurrence = seen[parsed]++;
+        const std::size_t count = static_cast<std::size_t>(option.count);
+        const std::size_t entry = seen[parsed]++;
+        if (entry % count != 0) continue; // a further value of the same occurrence
+        const std::size_t occurrence = entry / count;
         if (occurrence > 0 && !option.repeatable) return Usage(command, kGivenTwice, "--" + option.name);
-        given.emplace_back(&option, IsSwitch(option) ? std::string() : parsed->results().at(occurrence));
+        std::vector<std::string> values;
+        if (IsSwitch(option)) {
+            values.emplace_back();
+        } else {
+            for (std::size_t k = 0; k < count; ++k)
+                values.push_back(parsed->results().at(occurrence * count + k));
+        }
+        given.emplace_back(&option, std::move(values));
     }
 
-    for (const auto& [option, value] : given) {
-        if (!option->apply) continue;
-        std::string refusal = option->apply(value);
+    // The positional words first: they name what the command works on; the options then say how.
+    for (std::size_t i = 0; i < positionals.size(); ++i) {
+        const auto& apply = options.Positionals()[i].apply;
+        std::string refusal = apply ? apply(positionals[i]) : std::string();
+        if (!refusal.empty()) return {CommandLineOutcome::Kind::Refused, std::move(refusal)};
+    }
+    for (const auto& [option, values] : given) {
+        std::string refusal;
+        if (option->applyValues)
+            refusal = option->applyValues(values);
+        else if (option->apply)
+            refusal = option->apply(values.front());
         if (!refusal.empty()) return {CommandLineOutcome::Kind::Refused, std::move(refusal)};
     }
     return {};
@@ -181,6 +212,8 @@ std::string DialogHelp(DialogModel& dialog, std::string_view command) {
     const DialogOptions options = AllOptions(dialog);
 
     std::vector<std::pair<std::string, std::string>> entries;
+    for (const auto& positional : options.Positionals())
+        entries.emplace_back(positional.valueName, positional.help);
     for (const auto& option : options.Options()) {
         std::string left = "--" + option.name;
         if (option.optional)
@@ -200,6 +233,8 @@ std::string DialogHelp(DialogModel& dialog, std::string_view command) {
     text += kProgram;
     text += ' ';
     text += command;
+    for (const auto& positional : options.Positionals())
+        text += " [" + positional.valueName + ']';
     text += " [options]\n";
     if (!dialog.Inputs().title.empty()) text += dialog.Inputs().title + '\n';
     text += "\nOptions :\n";

@@ -8,15 +8,16 @@
 
 // The one mechanism that drives a dialog from a command line: the dialog's declared options, plus
 // "--geobase FICHIER" (the GéoBase instead of the last one used) and "--help", parsed with their
-// values and applied to the dialog in the order they were given.
+// values and applied to the dialog in the order they were given, after the words that are no option
+// (the positional arguments the dialog declares: "pyralis LecWild CARNET").
 namespace pyr::ui {
 
 struct CommandLineOutcome {
     enum class Kind {
-        Run,     // every option applied: run the dialog
-        Help,    // "--help" was asked: `text` is the help, nothing was applied
-        Usage,   // the words do not parse (unknown option, missing value): `text` says why
-        Refused  // the dialog refused a value: `text` is its reason; what came before was applied
+        Run,    // every option applied: run the dialog
+        Help,   // "--help" was asked: `text` is the help, nothing was applied
+        Usage,  // the words do not parse (unknown option, missing value): `text` says why
+        Refused // the dialog refused a value: `text` is its reason; what came before was applied
     };
     Kind kind = Kind::Run;
     std::string text;

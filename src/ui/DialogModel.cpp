@@ -14,8 +14,13 @@ void DialogOptions::Value(std::string name, std::string valueName, std::string h
                           bool repeatable) {
     // An option without a value name would read as a switch: it takes a value, so it gets a name.
     if (valueName.empty()) valueName = "VALEUR";
-    m_options.push_back(
-        {std::move(name), std::move(valueName), std::move(help), repeatable, std::move(apply)});
+    Option option;
+    option.name = std::move(name);
+    option.valueName = std::move(valueName);
+    option.help = std::move(help);
+    option.repeatable = repeatable;
+    option.apply = std::move(apply);
+    m_options.push_back(std::move(option));
 }
 
 void DialogOptions::OptionalValue(std::string name, std::string valueName, std::string help, Apply apply) {
@@ -32,11 +37,30 @@ void DialogOptions::ZeroOrOne(std::string name, std::string help, std::function<
     Value(std::move(name), "0|1", std::move(help), std::move(apply));
 }
 
+void DialogOptions::Values(std::string name, std::vector<std::string> valueNames, std::string help,
+                           ApplyValues apply) {
+    std::string shown;
+    for (const auto& valueName : valueNames)
+        shown += (shown.empty() ? "" : " ") + valueName;
+    const int count = static_cast<int>(valueNames.size());
+    Value(std::move(name), std::move(shown), std::move(help), nullptr);
+    m_options.back().count = count < 1 ? 1 : count;
+    m_options.back().applyValues = std::move(apply);
+}
+
+void DialogOptions::Positional(std::string valueName, std::string help, Apply apply) {
+    m_positionals.push_back({std::move(valueName), std::move(help), std::move(apply)});
+}
+
 void DialogOptions::Switch(std::string name, std::string help, std::function<std::string()> action) {
     Apply apply = [action = std::move(action)](const std::string&) {
         return action ? action() : std::string();
     };
-    m_options.push_back({std::move(name), std::string(), std::move(help), false, std::move(apply)});
+    Option option;
+    option.name = std::move(name);
+    option.help = std::move(help);
+    option.apply = std::move(apply);
+    m_options.push_back(std::move(option));
 }
 
 } // namespace pyr::ui

@@ -27,14 +27,26 @@ public:
     // Applies an option: an empty text when accepted, else the French reason of the refusal (shown
     // to the person, and the dialog is not run).
     using Apply = std::function<std::string(const std::string& value)>;
+    // The same for an option that takes several values, given in their order.
+    using ApplyValues = std::function<std::string(const std::vector<std::string>& values)>;
 
     struct Option {
         std::string name;      // long name without its dashes: "geobase"
         std::string valueName; // the value's name in the help ("FICHIER"); empty for a switch
         std::string help;      // one line of French
         bool repeatable = false;
-        Apply apply;           // a switch, and an optional value not given, get an empty value
-        bool optional = false; // the value may be left out: "--listing" or "--listing FICHIER"
+        Apply apply;             // a switch, and an optional value not given, get an empty value
+        bool optional = false;   // the value may be left out: "--listing" or "--listing FICHIER"
+        int count = 1;           // the number of values of a value option: "--lecture FORMAT CARNET" has 2
+        ApplyValues applyValues; // for an option of several values, instead of `apply`
+    };
+
+    // A word of the command line that is no option: "pyralis LecWild CARNET". Words are given to the
+    // positional arguments in the order they are declared; each may be left out.
+    struct PositionalArgument {
+        std::string valueName; // "CARNET"
+        std::string help;
+        Apply apply;
     };
 
     // "--name VALUE".
@@ -46,11 +58,17 @@ public:
     void OptionalValue(std::string name, std::string valueName, std::string help, Apply apply);
     // "--name 0|1": a check box of the dialog; any other value is refused.
     void ZeroOrOne(std::string name, std::string help, std::function<void(bool)> set);
+    // "--name VALUE1 VALUE2 ...": an option that takes several values, one name for each.
+    void Values(std::string name, std::vector<std::string> valueNames, std::string help, ApplyValues apply);
+    // "VALUE": the next word of the command line that is no option.
+    void Positional(std::string valueName, std::string help, Apply apply);
 
     const std::vector<Option>& Options() const { return m_options; }
+    const std::vector<PositionalArgument>& Positionals() const { return m_positionals; }
 
 private:
     std::vector<Option> m_options;
+    std::vector<PositionalArgument> m_positionals;
 };
 
 // What every command hands to its dialog before it opens (the last GéoBase, the current parameter
