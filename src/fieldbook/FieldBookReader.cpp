@@ -1,0 +1,181 @@
+#include "fieldbook/FieldBookReader.h"
+
+#include "core/Files.h"
+#include "core/Lines.h"
+#include "core/Strings.h"
+#include "core/TextEncoding.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/TableCode.h"
+#include "geobase/Carnet.h"
+#include "settings/CalcOptions.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+namespace pyr {
+
+namespace {
+
+// How often the clock is looked at, in lines, and how long a conversion runs before it shows where it is.
+constexpr int kProgressStride = 8192;
+constexpr auto kProgressDelay = std::chrono::seconds(1);
+
+const ReadingChoices& NoChoices() {
+    static const ReadingChoices none;
+    return none;
+}
+
+} // namespace
+
+std::unique_ptr<CAppareil> MakeInstrument(const InstrumentOptions& instrument) {
+    auto element = std::make_unique<CAppareil>(instrument.name, instrument.verticalCollimation,
+                                               instrument.prismConstant);
+    element->setSigmaAh(instrument.sigmaAh);
+    element->setSigmaAv(instrument.sigmaAv);
+    element->setSigmaDi(instrument.sigmaDi);
+    element->setSigmaPpm(instrument.sigmaPpm);
+    return element;
+}
+
+CFieldBookReader::CFieldBookReader() = default;
+CFieldBookReader::~CFieldBookReader() = default;
+
+const ReadingChoices& CFieldBookReader::Choices() const {
+    return m_choices ? *m_choices : NoChoices();
+}
+
+std::string CFieldBookReader::OpenFailure(const std::string&) const {
+    return fb::kMsgCannotOpenCarnet;
+}
+
+bool CFieldBookReader::Read(const std::string& path, CCarnet& result) {
+    std::string bytes;
+    if (!ReadWholeFile(path, bytes)) {
+        ui::FrontEnd& frontEnd = m_parent ? *m_parent : ui::ApplicationFrontEnd();
+        frontEnd.MessageBox(OpenFailure(path), ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    m_path = path;
+    ReadText(bytes, result);
+    return true;
+}
+
+void CFieldBookReader::ReadText(std::string_view bytes, CCarnet& result) {
+    bool windows1252 = false;
+    const std::string text = FileBytesToUtf8(bytes, &windows1252);
+    if (windows1252 && !m_path.empty() && m_txt) m_txt->Print(fb::kReadAsWindows1252, m_path.c_str());
+    Run(text, result);
+}
+
+void CFieldBookReader::Run(std::string_view text, CCarnet& result) {
+    m_result = &result;
+    if (m_announced) Print(fb::kCreating);
+    m_start = m_lastProgress = std::chrono::steady_clock::now();
+    BeginReading();
+    if (Choices().writeInstrument) AddInstrument();
+    ForEachLine(text, [&](std::string_view line, int number) {
+        ReadLine(line, number);
+        if (number % kProgressStride == 0)
+            ShowProgress(number, static_cast<std::size_t>(line.data() - text.data()) + line.size(),
+                         text.size());
+    });
+    EndReading();
+    if (m_announced && m_txt) m_txt->Print(fb::kFinished, result.GetSize());
+    m_result = nullptr;
+}
+
+void CFieldBookReader::ShowProgress(int number, std::size_t offset, std::size_t size) {
+    const auto now = std::chrono::steady_clock::now();
+    if (!m_txt || now - m_start < kProgressDelay || now - m_lastProgress < kProgressDelay) return;
+    m_lastProgress = now;
+    const int percent = size ? static_cast<int>(offset * 100 / size) : 100;
+    m_txt->Print(fb::kProgress, number, percent);
+}
+
+void CFieldBookReader::AddInstrument() {
+    const auto& instruments = Choices().instruments;
+    const InstrumentOptions* chosen = nullptr;
+    for (const auto& instrument : instruments)
+        if (instrument.name == Choices().instrumentName) chosen = &instrument;
+    // The combo shows the first instrument when none has the name asked for.
+    const InstrumentOptions standard{kStandardInstrument};
+    if (!chosen) chosen = instruments.empty() ? &standard : &instruments.front();
+    Result().Add(MakeInstrument(*chosen), kKindAppareil);
+}
+
+// ---- Reports ---------------------------------------------------------------------------------------------
+
+bool CFieldBookReader::CheckLength(int number, std::string_view line, int expected) {
+    const int length = static_cast<int>(Utf8Length(line));
+    if (length == expected) return true;
+    if (m_txt) m_txt->Print(fb::kBadLength, number, length, expected);
+    return false;
+}
+
+void CFieldBookReader::LineUnrecognised(int number) {
+    LineError(fb::kUnrecognised, number);
+}
+
+void CFieldBookReader::LineMissing(int number, std::string_view datum) {
+    if (m_txt) m_txt->Print(fb::kMissingDatum, number, std::string(datum).c_str());
+}
+
+void CFieldBookReader::LineError(const char* format, int number) {
+    if (m_txt) m_txt->PrintText(Sprintf(format, number));
+}
+
+void CFieldBookReader::Print(std::string_view text) {
+    if (m_txt) m_txt->PrintText(text);
+}
+
+// ---- Elements --------------------------------------------------------------------------------------------
+
+CStation* CFieldBookReader::AddStation(std::string name, double hi, double v0, std::string code) {
+    return Result().validStation(m_txt, std::make_unique<CStation>(std::move(name), hi, v0, std::move(code)));
+}
+
+CReference* CFieldBookReader::AddReference(std::string point, double hp, double ah, double av, double di,
+                                           std::string code) {
+    return Result().validReference(
+        m_txt, std::make_unique<CReference>(std::move(point), hp, ah, av, di, std::move(code)));
+}
+
+CMesure* CFieldBookReader::AddMesure(std::string point, double hp, double ah, double av, double di,
+                                     std::string code) {
+    return Result().validMesure(m_txt,
+                                std::make_unique<CMesure>(std::move(point), hp, ah, av, di, std::move(code)));
+}
+
+CPointGen* CFieldBookReader::AddPoint(std::string name, double x, double y, double z, std::string code) {
+    return Result().validPoint(m_txt, std::make_unique<CPointGen>(std::move(name), x, y, z, std::move(code)));
+}
+
+void CFieldBookReader::AddHeaderComment(std::string_view label, std::string_view value) {
+    Result().validComment(kHeaderLabelWidth, label, value);
+}
+
+void CFieldBookReader::AddComment(std::string text) {
+    Result().Add(std::make_unique<CComment>(std::move(text)), kKindComment);
+}
+
+void CFieldBookReader::AddCode(std::string_view code) {
+    code = Trimmed(code);
+    if (code.empty()) return;
+    if (Choices().interpret && m_table) {
+        std::vector<std::string> words;
+        m_table->Make_str_cmd(code, words);
+        int kind = 0;
+        if (auto command = m_table->InterpreteTexte(words, kind);
+            command && Result().Add(std::move(command), kind) >= 0)
+            return;
+    }
+    Result().Add(std::make_unique<CCommande>(std::string(code)), kKindCommand);
+}
+
+void CFieldBookReader::SplitNameAndCode(std::string_view field, std::string& name, std::string& code) const {
+    const std::size_t start =
+        m_table ? std::min(CodePosition(field, m_table->Separator()), field.size()) : field.size();
+    name = std::string(Trimmed(field.substr(0, start)));
+    code = std::string(Trimmed(field.substr(start)));
+}
+
+} // namespace pyr

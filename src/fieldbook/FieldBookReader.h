@@ -1,0 +1,155 @@
+#pragma once
+
+#include "core/Undefined.h"
+#include "settings/OptionInstruments.h"
+
+#include <chrono>
+#include <memory>
+#include <string>
+#include <string_view>
+#include <vector>
+
+// The skeleton that every field-book reader shares. A reader of a format derives from CFieldBookReader
+// and gives ReadLine (and, when it needs them, BeginReading and EndReading); the skeleton opens the file,
+// announces the creation, writes the instrument first when asked, numbers the lines, shows the progress of
+// a long conversion, and counts what was written. The reader builds its elements through the Add...
+// operations below, which check them with the store's validation and normalise their identifiers, and it
+// reports the lines it cannot use with the Line... operations, which never stop a conversion.
+//
+//     class CLecMyFormat : public CFieldBookReader {
+//         double m_hi = kUndefined;
+//         void BeginReading() override { m_hi = kUndefined; }
+//         void ReadLine(std::string_view line, int number) override {
+//             if (line.starts_with("ST ")) AddStation(Field(line, 1), m_hi);
+//             else LineUnrecognised(number);
+//         }
+//     };
+namespace pyr {
+
+class CAppareil;
+class CCarnet;
+class CMesure;
+class CParamDriver;
+class CPointGen;
+class CPyrTxtWnd;
+class CReference;
+class CStation;
+class CTableCode;
+namespace ui {
+class FrontEnd;
+}
+
+// What the reading dialog hands a reader.
+struct ReadingChoices {
+    std::string carnet;                         // the field book, as the person named it
+    bool interpret = false;                     // codes interpreted through the code table
+    bool writeInstrument = false;               // an instrument element at the head of the result
+    std::string instrumentName;                 // the configuration of the field instrument
+    std::vector<InstrumentOptions> instruments; // the instruments of the options
+};
+
+// The width to which the labels of header comments are padded before " = ".
+inline constexpr int kHeaderLabelWidth = 20;
+
+class CFieldBookReader {
+public:
+    CFieldBookReader();
+    virtual ~CFieldBookReader();
+    CFieldBookReader(const CFieldBookReader&) = delete;
+    CFieldBookReader& operator=(const CFieldBookReader&) = delete;
+
+    // ---- Set up by the conversion before reading
+    void SetChoices(const ReadingChoices& choices) { m_choices = &choices; }
+    // The code table (may be null: the codes are then kept as they stand).
+    void SetCodeTable(const CTableCode* table) { m_table = table; }
+    // The format's parameter set (null for a format without one).
+    void SetDriver(const CParamDriver* driver) { m_driver = driver; }
+    // Where the lines go (null: nothing is printed) and who shows the message boxes (null: the
+    // application's front end).
+    void SetTextWindow(CPyrTxtWnd* txt) { m_txt = txt; }
+    void SetParent(ui::FrontEnd* parent) { m_parent = parent; }
+    // Whether "Création de la GéoBase en cours ..." and the count of lines written are printed: not
+    // when the reader serves another one (the Quendal reader behind the delimited formats).
+    void SetAnnounced(bool announced) { m_announced = announced; }
+
+    // Reads the field book at `path` into `result` (appended to what it holds). False when the file
+    // cannot be opened: the message is shown and nothing is added.
+    virtual bool Read(const std::string& path, CCarnet& result);
+    // Reads a field book already in memory (UTF-8 or Windows-1252 bytes): the same steps but the opening.
+    void ReadText(std::string_view bytes, CCarnet& result);
+
+protected:
+    // ---- What a format gives
+    // The message when the file cannot be opened (the path given for those that name it).
+    virtual std::string OpenFailure(const std::string& path) const;
+    // Before the first line: every pending value back to kUndefined, the pending texts emptied.
+    virtual void BeginReading() {}
+    // One line, without its end, numbered from 1.
+    virtual void ReadLine(std::string_view line, int number) = 0;
+    // After the last line: what is still pending is written.
+    virtual void EndReading() {}
+
+    // ---- Reports in the text window; a line reported is skipped, the reading goes on
+    // A fixed-width line of another length: "Attention : ligne %d de longueur incorrecte (%d / %d) !".
+    // True when the length is the expected one.
+    bool CheckLength(int number, std::string_view line, int expected);
+    // "Erreur ligne %d : donnée non reconnue !"
+    void LineUnrecognised(int number);
+    // "Erreur ligne %d : donnée manquante pour %s !" with the datum's name.
+    void LineMissing(int number, std::string_view datum);
+    // Any other sentence of a line, a format with one %d for the line number ("Erreur ligne %d : pas de
+    // station pour cette hauteur d'instrument !").
+    void LineError(const char* format, int number);
+    void Print(std::string_view text);
+
+    // ---- Elements. Each normalises the identifier, checks the element through the store (which says
+    // in the text window why it refuses one) and appends it; the element kept, or null.
+    CStation* AddStation(std::string name, double hi = 0.0, double v0 = kUndefined, std::string code = {});
+    CReference* AddReference(std::string point, double hp, double ah, double av, double di,
+                             std::string code = {});
+    CMesure* AddMesure(std::string point, double hp, double ah, double av, double di, std::string code = {});
+    CPointGen* AddPoint(std::string name, double x, double y, double z, std::string code = {});
+    // Header information (file name, version, dates, units, serial number ...): a comment
+    // "label<blanks> = value".
+    void AddHeaderComment(std::string_view label, std::string_view value);
+    // A comment line as it stands.
+    void AddComment(std::string text);
+    // A field code: with interpretation on, split into its words and interpreted through the code table;
+    // the command it stands for is appended with its kind. Otherwise, or when the table knows no such
+    // code, the text is kept as it stands as an uninterpreted command (1009). An empty code adds nothing.
+    void AddCode(std::string_view code);
+    // Splits a field holding a point's name followed by its code at the code position of the table's
+    // separator; without a table the whole field is the name.
+    void SplitNameAndCode(std::string_view field, std::string& name, std::string& code) const;
+
+    // ---- What the reader may consult
+    CCarnet& Result() { return *m_result; }
+    const ReadingChoices& Choices() const;
+    const CTableCode* CodeTable() const { return m_table; }
+    const CParamDriver* Driver() const { return m_driver; }
+    CPyrTxtWnd* TextWindow() const { return m_txt; }
+    ui::FrontEnd* Parent() const { return m_parent; }
+    // The field book being read ("" for text given in memory).
+    const std::string& Path() const { return m_path; }
+
+private:
+    void Run(std::string_view text, CCarnet& result);
+    void AddInstrument();
+    void ShowProgress(int number, std::size_t offset, std::size_t size);
+
+    const ReadingChoices* m_choices = nullptr;
+    const CTableCode* m_table = nullptr;
+    const CParamDriver* m_driver = nullptr;
+    CPyrTxtWnd* m_txt = nullptr;
+    ui::FrontEnd* m_parent = nullptr;
+    CCarnet* m_result = nullptr;
+    std::string m_path;
+    bool m_announced = true;
+    std::chrono::steady_clock::time_point m_start;
+    std::chrono::steady_clock::time_point m_lastProgress;
+};
+
+// The instrument element of a configuration of the options: its name and constants.
+std::unique_ptr<CAppareil> MakeInstrument(const InstrumentOptions& instrument);
+
+} // namespace pyr

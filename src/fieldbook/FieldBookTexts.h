@@ -1,0 +1,83 @@
+#pragma once
+
+// The texts that the reading of field books shows in message boxes and writes in the text window. Those
+// with %s or %d are printf formats.
+namespace pyr::fb {
+
+// ---- Message boxes of a conversion
+inline constexpr const char* kMsgCannotOpenCarnet = "Impossible d'ouvrir le fichier carnet !";
+inline constexpr const char* kMsgCannotOpenCarnetForReading =
+    "Impossible d'ouvrir le fichier carnet en lecture !\n(%s)";
+inline constexpr const char* kMsgNoCodeTableLoaded = "Pas de table de codes actuellement chargée !!!";
+inline constexpr const char* kMsgImpossibleCase = "Cas impossible en théorie !!!";
+inline constexpr const char* kMsgZeroPrismHeight =
+    "Certaines observations ont une hauteur de prisme à zéro !";
+inline constexpr const char* kMsgPreformatMissing =
+    "Impossible de trouver le programme de préformattage :\n%s";
+inline constexpr const char* kMsgReaderMissing =
+    "La lecture des carnets %s n'est pas encore disponible dans cette version de PYRALIS Calculs Topo.";
+inline constexpr const char* kMsgCodeTableUnreadable = "La table de codes <%s> ne peut pas être lue !";
+inline constexpr const char* kMsgCannotWriteTemporary = "Impossible d'écrire le fichier temporaire <%s> !";
+
+// ---- The reading dialog
+inline constexpr const char* kCaption = "Lecture du carnet";
+inline constexpr const char* kMsgCarnetMissing = "Le fichier carnet indiqué n'existe pas !";
+inline constexpr const char* kMsgParamFileMissing = "Le fichier de paramétrage indiqué n'existe pas !";
+inline constexpr const char* kAskCreateParamFile = "%s\nVoulez-vous en créer un nouveau ?";
+inline constexpr const char* kAskCodeTable = "%s%s";
+inline constexpr const char* kNoCodeTableNamed = "Aucune table de codes n'est indiquée.";
+inline constexpr const char* kCodeTableMissing = "La table de codes indiquée n'existe pas.";
+inline constexpr const char* kAskNoInterpretation = "\nVoulez-vous qu'aucune commande ne soit interprétée ?";
+inline constexpr const char* kAskReplaceGeoBase = "%s\n%s";
+inline constexpr const char* kGeoBaseExists = "La GéoBase indiquée existe déjà !";
+inline constexpr const char* kReplaceIt = "Voulez-vous la remplacer ?";
+inline constexpr const char* kMsgUnknownInstrument =
+    "L'appareil « %s » n'est pas dans la liste des appareils des options.";
+
+// File choices of the dialog: titles and filters.
+inline constexpr const char* kChooseCarnet = "Sélectionnez le fichier carnet à traiter :";
+inline constexpr const char* kCarnetFilter = "Tous les fichiers (*.*)|*.*||";
+inline constexpr const char* kChooseGeoBase = "Nom de la GéoBase à créer :";
+inline constexpr const char* kChooseParamFile = "Sélectionnez le fichier de paramétrage à utiliser :";
+inline constexpr const char* kChooseCodeTable = "Nom de la table à utiliser :";
+
+// ---- The parameter set of a format ("Parametrage")
+inline constexpr const char* kMsgParamUnreadable =
+    "Impossible de lire le fichier de paramétrage <%s> !\n(%s)";
+inline constexpr const char* kMsgParamBadWord =
+    "Fichier de paramétrage <%s> :\nvaleur « %s » incorrecte pour %s (valeurs possibles : %s) !";
+inline constexpr const char* kMsgParamBadCount =
+    "Fichier de paramétrage <%s> :\nvaleur « %s » incorrecte pour %s (un nombre entier de 0 à %d) !";
+inline constexpr const char* kMsgParamBadText = "Fichier de paramétrage <%s> :\n%s incorrect : %s !";
+inline constexpr const char* kWhyEmptySeparator = "le séparateur est vide";
+inline constexpr const char* kWhyUnknownField = "champ inconnu « %s »";
+inline constexpr const char* kWhyFieldTwice = "champ « %s » donné deux fois";
+inline constexpr const char* kWhyFieldNotHere = "champ « %s » inattendu pour ce type d'enregistrement";
+inline constexpr const char* kWhyNoColumns = "champ « %s » sans ses colonnes (%s:début-fin)";
+inline constexpr const char* kWhyBadColumns = "colonnes incorrectes pour le champ « %s »";
+inline constexpr const char* kWhyColumnsInDelimited =
+    "colonnes données au champ « %s » d'un format séparateur";
+inline constexpr const char* kWhyNoMatricule = "le champ MATRICULE manque";
+inline constexpr const char* kWhyTypeEverywhere =
+    "le champ TYPE doit figurer dans toutes les listes ou dans aucune";
+
+// ---- The editor's reading menu
+inline constexpr const char* kAskAppendToGeoBase =
+    "La GéoBase courante n'est pas vide !\nVoulez-vous ajouter les nouvelles données à la fin de celle-ci "
+    "?\n(Répondez par NON pour créer une nouvelle GéoBase.)";
+inline constexpr const char* kMsgUnknownFormat = "Format de carnet inconnu : « %s » (formats : %s).";
+
+// ---- The text window
+inline constexpr const char* kCreating = "\nCréation de la GéoBase en cours ...";
+inline constexpr const char* kFinished = " ... terminée : %d lignes écrites.";
+inline constexpr const char* kProgress = "   ... %d lignes lues (%d %%)";
+inline constexpr const char* kBadLength = "Attention : ligne %d de longueur incorrecte (%d / %d) !";
+inline constexpr const char* kUnrecognised = "Erreur ligne %d : donnée non reconnue !";
+inline constexpr const char* kMissingDatum = "Erreur ligne %d : donnée manquante pour %s !";
+inline constexpr const char* kNoStationForHI =
+    "Erreur ligne %d : pas de station pour cette hauteur d'instrument !";
+inline constexpr const char* kIncompleteCommand = "Erreur ligne %d : la commande est incomplète !";
+inline constexpr const char* kStringRead = " -> Chaîne lue = <%s>";
+inline constexpr const char* kReadAsWindows1252 = "Carnet <%s> : fichier lu en Windows-1252.";
+
+} // namespace pyr::fb
