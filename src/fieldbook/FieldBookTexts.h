@@ -14,10 +14,11 @@ inline constexpr const char* kMsgZeroPrismHeight =
     "Certaines observations ont une hauteur de prisme à zéro !";
 inline constexpr const char* kMsgPreformatMissing =
     "Impossible de trouver le programme de préformattage :\n%s";
+inline constexpr const char* kMsgPreformatFailed = "Impossible de lancer le programme de préformattage :\n%s";
 inline constexpr const char* kMsgReaderMissing =
     "La lecture des carnets %s n'est pas encore disponible dans cette version de PYRALIS Calculs Topo.";
 inline constexpr const char* kMsgCodeTableUnreadable = "La table de codes <%s> ne peut pas être lue !";
-inline constexpr const char* kMsgCannotWriteTemporary = "Impossible d'écrire le fichier temporaire <%s> !";
+inline constexpr const char* kMsgCannotWriteFile = "Impossible d'écrire le fichier <%s> !";
 
 // ---- The reading dialog
 inline constexpr const char* kCaption = "Lecture du carnet";
@@ -78,6 +79,10 @@ inline constexpr const char* kNoStationForHI =
     "Erreur ligne %d : pas de station pour cette hauteur d'instrument !";
 inline constexpr const char* kIncompleteCommand = "Erreur ligne %d : la commande est incomplète !";
 inline constexpr const char* kStringRead = " -> Chaîne lue = <%s>";
+inline constexpr const char* kBadNumber = "Erreur ligne %d : valeur numérique incorrecte <%s> !";
+inline constexpr const char* kExtraFields = "Attention : ligne %d : %d champ(s) en trop, ignoré(s).";
+inline constexpr const char* kNewerQuendal = "Attention : ligne %d : carnet Quendal-Pc de version %d, plus "
+                                             "récente que celle de ce programme (%d) ; il est lu quand même.";
 inline constexpr const char* kReadAsWindows1252 = "Carnet <%s> : fichier lu en Windows-1252.";
 
 } // namespace pyr::fb
