@@ -1,0 +1,39 @@
+#include "fieldbook/FieldBookReaders.h"
+
+#include "fieldbook/QuendalPivot.h"
+#include "fieldbook/QuendalReader.h"
+
+namespace pyr {
+
+namespace {
+
+// The importers of the delimited and columnar layouts (CDlgConfigSep::Import, CDlgConfigCol::Import):
+// none yet.
+RecordImporter DelimitedImporter() {
+    return nullptr;
+}
+RecordImporter ColumnarImporter() {
+    return nullptr;
+}
+
+std::unique_ptr<CFieldBookReader> Pivot(RecordImporter importer) {
+    if (!importer) return nullptr;
+    return std::make_unique<CQuendalPivot>(std::move(importer));
+}
+
+} // namespace
+
+std::unique_ptr<CFieldBookReader> MakeFieldBookReader(FieldBookFormat format) {
+    switch (format) {
+    case FieldBookFormat::Quendal:
+        return std::make_unique<CQuendalReader>();
+    case FieldBookFormat::Separateur:
+        return Pivot(DelimitedImporter());
+    case FieldBookFormat::Colonne:
+        return Pivot(ColumnarImporter());
+    default:
+        return nullptr;
+    }
+}
+
+} // namespace pyr

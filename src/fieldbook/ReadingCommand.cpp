@@ -1,0 +1,25 @@
+#include "fieldbook/ReadingCommand.h"
+
+#include "fieldbook/FieldBookConverter.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+namespace pyr {
+
+void CFieldBookCommand::DeclareOptions(ui::DialogOptions& options) {
+    DeclareReadingOptions(options, m_requests, FormatInfo(m_format).parameterFile != nullptr);
+}
+
+ui::DialogResult CFieldBookCommand::Run(ui::FrontEnd& frontEnd) {
+    CPyrTxtWnd txt(frontEnd);
+    FieldBookConverter converter(m_format, &frontEnd, Inputs().paramPath, Inputs().configFolder, &txt);
+    ReadingRequests requests = m_requests;
+    if (GeoBaseNamed()) requests.geoBase = GeoBase();
+    converter.showDialog = [&frontEnd, &requests](CLectCarnet& dialog) {
+        dialog.SetRequests(requests);
+        return dialog.Run(frontEnd);
+    };
+    return RunConversion(converter, nullptr);
+}
+
+} // namespace pyr
