@@ -1,11 +1,16 @@
 #include "editor/GeoEditor.h"
 
+#include "core/Files.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
+#include "fieldbook/FieldBookConverter.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/TableCode.h"
 #include "geobase/Carnet.h"
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/GeoFile.h"
 #include "settings/LastGeoBase.h"
+#include "settings/ParamStore.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
@@ -21,6 +26,30 @@ constexpr int kKindColumn = 14;
 constexpr const char* kReductionOption = "reduction";
 constexpr const char* kReductionHelp =
     "réduit les stations (réduction des reprises) avant de montrer la GéoBase";
+constexpr const char* kGeoBaseHelp = "la GéoBase à éditer (au lieu de la dernière utilisée)";
+constexpr const char* kReadingOption = "lecture";
+constexpr const char* kReadingHelp = "lit un carnet de ce format, l'ajoute à la GéoBase et l'enregistre";
+constexpr const char* kReadingDone = "GéoBase <%s> : %d élément(s), dont %d lu(s) dans le carnet.";
+
+// A GéoBase is recorded as the last one whole, so that the next command finds it from whatever folder it
+// is run.
+std::string WholePath(const std::string& path) {
+    std::error_code error;
+    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
+    return error ? path : absolute.lexically_normal().string();
+}
+
+// The code table the editor holds for a GéoBase: the one it goes with, else the job's table of the
+// settings; none when neither can be read.
+std::unique_ptr<CTableCode> EditorCodeTable(const CCarnet& carnet, std::string_view paramPath,
+                                            CPyrTxtWnd& txt) {
+    std::string path = carnet.Configuration();
+    if (path.empty()) ReadParamString(paramPath, kSectionGeocodification, kKeyTableDeCode, "", path);
+    if (path.empty() || !FileExists(path)) return nullptr;
+    auto table = std::make_unique<CTableCode>();
+    if (!table->Init(path, &txt)) return nullptr;
+    return table;
+}
 
 } // namespace
 
@@ -37,11 +66,70 @@ std::string EditorLine(const CCarnet& carnet, int index) {
 }
 
 void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
+    options.Positional("GEOBASE", kGeoBaseHelp, [this](const std::string& path) {
+        SetGeoBase(path);
+        return std::string();
+    });
     options.Switch(kReductionOption, kReductionHelp, [this] {
         m_reduce = true;
         return std::string();
     });
     m_reduction.DeclareOptions(options);
+    options.Values(
+        kReadingOption, {"FORMAT", "CARNET"}, kReadingHelp, [this](const std::vector<std::string>& values) {
+            const std::optional<FieldBookFormat> format = FindFieldBookFormat(values.at(0));
+            if (!format)
+                return Sprintf(fb::kMsgUnknownFormat, values.at(0).c_str(), FieldBookFormatNames().c_str());
+            m_reading = Reading{*format, values.at(1)};
+            return std::string();
+        });
+    DeclareReadingOptions(options, m_readingRequests, true, false);
+}
+
+ui::DialogResult CGeoEditor::ReadFieldBook(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
+    CCarnet fresh;
+    CCarnet* target = &carnet;
+    if (!carnet.IsEmpty()) {
+        const ui::Answer answer =
+            frontEnd.Ask(fb::kAskAppendToGeoBase, ui::kCaption, ui::Buttons::YesNoCancel, ui::Answer::Cancel);
+        if (answer == ui::Answer::Cancel) return ui::DialogResult::Cancel;
+        if (answer == ui::Answer::No) {
+            // A new GéoBase, named after the field book; the open one stays as it is.
+            const std::string path = BesideCarnet(m_reading->carnet, kGeoFileExtension);
+            if (FileExists(path) &&
+                frontEnd.Ask(Sprintf(fb::kAskReplaceGeoBase, fb::kGeoBaseExists, fb::kReplaceIt),
+                             ui::kCaption, ui::Buttons::YesNo, ui::Answer::No) != ui::Answer::Yes)
+                return ui::DialogResult::Cancel;
+            fresh.SetPathName(path);
+            target = &fresh;
+        }
+    }
+    const std::string paramPath = Inputs().paramPath;
+    std::unique_ptr<CTableCode> table = EditorCodeTable(*target, paramPath, txt);
+    EditorDocument document{table.get(), ReadInstruments(paramPath)};
+    FieldBookConverter converter(m_reading->format, &frontEnd, paramPath, Inputs().configFolder, &txt,
+                                 &document);
+    ReadingRequests requests = m_readingRequests;
+    requests.carnet = m_reading->carnet;
+    converter.showDialog = [&frontEnd, &requests](CLectCarnet& dialog) {
+        dialog.SetRequests(requests);
+        return dialog.Run(frontEnd);
+    };
+    const int former = target->GetSize();
+    const ui::DialogResult read = RunConversion(converter, target);
+    if (read != ui::DialogResult::Ok) return read;
+
+    if (target == &fresh) carnet = std::move(fresh);
+    const std::string path = carnet.PathName();
+    carnet.BackUp();
+    if (!carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
+    txt.Print(msg::kSaved, path.c_str());
+    WriteLastGeoBase(paramPath, WholePath(path));
+    // The view refreshed from the former end of the GéoBase on.
+    txt.Print(kReadingDone, path.c_str(), carnet.GetSize(), carnet.GetSize() - former);
+    for (int i = former; i < carnet.GetSize(); ++i)
+        txt.PrintText(EditorLine(carnet, i));
+    return ui::DialogResult::Ok;
 }
 
 bool CGeoEditor::ReduceStations(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
@@ -71,13 +159,14 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
 
     CPyrTxtWnd txt(frontEnd);
     CCarnet carnet;
-    if (!carnet.Load(&txt, path, {}, 0, &frontEnd)) return ui::DialogResult::Failed;
-    // Recorded whole, so that the next command finds it from whatever folder it is run.
-    std::error_code error;
-    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
-    WriteLastGeoBase(Inputs().paramPath, error ? path : absolute.lexically_normal().string());
+    if (m_reading && !FileExists(path))
+        carnet.SetPathName(path); // a new GéoBase, made by the reading
+    else if (!carnet.Load(&txt, path, {}, 0, &frontEnd))
+        return ui::DialogResult::Failed;
+    WriteLastGeoBase(Inputs().paramPath, WholePath(path));
 
     if (m_reduce && !ReduceStations(carnet, txt, frontEnd)) return ui::DialogResult::Failed;
+    if (m_reading) return ReadFieldBook(carnet, txt, frontEnd);
     txt.Print(kOpened, path.c_str(), carnet.GetSize());
     for (int i = 0; i < carnet.GetSize(); ++i)
         txt.PrintText(EditorLine(carnet, i));

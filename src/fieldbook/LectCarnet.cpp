@@ -33,9 +33,11 @@ std::string Assign(std::optional<std::string>& slot, const std::string& value) {
 
 } // namespace
 
-void DeclareReadingOptions(ui::DialogOptions& options, ReadingRequests& requests, bool withParamFile) {
-    options.Positional("CARNET", kHelpCarnet,
-                       [&requests](const std::string& path) { return Assign(requests.carnet, path); });
+void DeclareReadingOptions(ui::DialogOptions& options, ReadingRequests& requests, bool withParamFile,
+                           bool withCarnet) {
+    if (withCarnet)
+        options.Positional("CARNET", kHelpCarnet,
+                           [&requests](const std::string& path) { return Assign(requests.carnet, path); });
     if (withParamFile)
         options.Value("parametrage", "FICHIER", kHelpParamFile,
                       [&requests](const std::string& path) { return Assign(requests.paramFile, path); });

@@ -27,11 +27,12 @@ struct ReadingRequests {
     bool editParams = false;
 };
 
-// The options of a reading: "CARNET" (the positional word), "--parametrage", "--interpretation",
-// "--table", "--appareil", "--ecrire-appareil" and "--editer-parametres" (the last two parameter ones only
-// for a format that has a parameter file). "--geobase", common to every dialog, names the GéoBase to
-// create.
-void DeclareReadingOptions(ui::DialogOptions& options, ReadingRequests& requests, bool withParamFile);
+// The options of a reading: "CARNET" (the positional word, unless the caller names the field book
+// otherwise), "--parametrage", "--interpretation", "--table", "--appareil", "--ecrire-appareil" and
+// "--editer-parametres" (the two of the parameter file only for a format that has one, or when the format
+// is not known yet). "--geobase", common to every dialog, names the GéoBase to create.
+void DeclareReadingOptions(ui::DialogOptions& options, ReadingRequests& requests, bool withParamFile,
+                           bool withCarnet = true);
 
 // The reading dialog: the field book, the GéoBase to create (hidden when the elements go into the
 // GéoBase open in the editor), the format's parameter file, the code table and its interpretation, the

@@ -6,6 +6,10 @@
 
 namespace pyr {
 
+std::string CFieldBookCommand::GeoBaseHelp() const {
+    return "la GéoBase à créer (par défaut le carnet avec l'extension .geo, à côté de lui)";
+}
+
 void CFieldBookCommand::DeclareOptions(ui::DialogOptions& options) {
     DeclareReadingOptions(options, m_requests, FormatInfo(m_format).parameterFile != nullptr);
 }

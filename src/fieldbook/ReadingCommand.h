@@ -14,6 +14,7 @@ class CFieldBookCommand : public ui::DialogModel {
 public:
     explicit CFieldBookCommand(FieldBookFormat format) : m_format(format) {}
 
+    std::string GeoBaseHelp() const override;
     void DeclareOptions(ui::DialogOptions& options) override;
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
 

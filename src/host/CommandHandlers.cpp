@@ -3,12 +3,15 @@
 #include "calc/CalculV0Sta.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
+#include "fieldbook/ReadingCommand.h"
 #include "host/CommandFlow.h"
 #include "host/HostTexts.h"
 #include "host/ServicesLookup.h"
 #include "settings/OptionPages.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
+
+#include <optional>
 
 namespace pyr::host {
 
@@ -53,6 +56,15 @@ void OnCalcOpt(const CommandEntry& command) {
 
 void OnCalculV0(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CCalculV0Sta>(); });
+}
+
+void OnReadFieldBook(const CommandEntry& command) {
+    const std::optional<FieldBookFormat> format = FindFieldBookFormat(command.localName);
+    if (!format) {
+        RunPending(command);
+        return;
+    }
+    RunCommandDialog(command.title, [format] { return std::make_unique<CFieldBookCommand>(*format); });
 }
 
 void OnExport(const CommandEntry& command) {

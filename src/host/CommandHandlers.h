@@ -14,6 +14,9 @@ void OnGeoEdit(const CommandEntry& command);
 void OnCalcOpt(const CommandEntry& command);
 // "CalculV0": the orientation of stations.
 void OnCalculV0(const CommandEntry& command);
+// The eleven readings of field books, told apart by their local name: each converts a field book of its
+// format into a GéoBase.
+void OnReadFieldBook(const CommandEntry& command);
 // The eight exports of a GéoBase, told apart by their title.
 void OnExport(const CommandEntry& command);
 // "CalTabCode": the table of codes, which needs the scale services too.

@@ -41,8 +41,9 @@ bool IsSwitch(const Option& option) {
 // The options of a dialog: the common ones first, then its own.
 DialogOptions AllOptions(DialogModel& dialog) {
     DialogOptions options;
-    options.Value(std::string(kGeoBaseName), std::string(kGeoBaseValue), std::string(kGeoBaseHelp),
-                  [&dialog](const std::string& path) {
+    const std::string help = dialog.GeoBaseHelp();
+    options.Value(std::string(kGeoBaseName), std::string(kGeoBaseValue),
+                  help.empty() ? std::string(kGeoBaseHelp) : help, [&dialog](const std::string& path) {
                       dialog.SetGeoBase(path);
                       return std::string();
                   });

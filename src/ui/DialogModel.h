@@ -98,6 +98,9 @@ public:
 
     // The caption of the dialog's window.
     virtual std::string Caption() const { return m_inputs.title; }
+    // The help line of "--geobase" when the GéoBase means something else to the dialog (one to create);
+    // "" for the common one.
+    virtual std::string GeoBaseHelp() const { return {}; }
     // The dialog's own options; "--geobase" is common to every dialog and declared by the mechanism.
     virtual void DeclareOptions(DialogOptions&) {}
     // Runs the dialog with the person at the front end, after the options were applied: what the dialog
