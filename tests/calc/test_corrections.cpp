@@ -1,5 +1,7 @@
+// The corrections and the tolerances that every computation applies to its observations.
 #include "TestSupport.h"
 #include "calc/Corrections.h"
+#include "calc/Tolerances.h"
 #include "core/Angles.h"
 #include "core/Undefined.h"
 
@@ -13,21 +15,17 @@ constexpr double kMgon = 1e-4; // 0.1 mgon
 constexpr double kTenthMm = 1e-4;
 
 TEST(FaceLeft, TurnsFaceRightIncludingBothBounds) {
-    struct Case {
+    const struct {
         double ah, av;
         bool turned;
         double ahAfter, avAfter;
     } cases[] = {
-        {50.0, 300.0, true, 250.0, 100.0},
-        {250.0, 300.0, true, 50.0, 100.0}, // wrapped into [0, 400)
-        {50.0, 200.0, true, 250.0, 200.0}, // 200 counts as face right: AH turns, AV stays
-        {50.0, 400.0, true, 250.0, 0.0},
-        {kUndefined, 310.0, true, kUndefined, 90.0},
-        {50.0, 199.9999, false, 50.0, 199.9999},
-        {50.0, 400.0001, false, 50.0, 400.0001},
-        {50.0, kUndefined, false, 50.0, kUndefined},
+        {50.0, 300.0, true, 250.0, 100.0},       {250.0, 300.0, true, 50.0, 100.0}, // wrapped
+        {50.0, 200.0, true, 250.0, 200.0}, // 200 is face right: AH turns, AV stays
+        {50.0, 400.0, true, 250.0, 0.0},         {kUndefined, 310.0, true, kUndefined, 90.0},
+        {50.0, 199.9999, false, 50.0, 199.9999}, {50.0, 400.0001, false, 50.0, 400.0001},
     };
-    for (const Case& c : cases) {
+    for (const auto& c : cases) {
         double ah = c.ah, av = c.av;
         EXPECT_EQ(ReduceToFaceLeft(ah, av), c.turned) << c.av;
         EXPECT_NEAR(ah, c.ahAfter, 1e-12) << c.av;
@@ -60,64 +58,78 @@ TEST(EccentricSighting, AgreesWithThePlaneGeometryOfTheOffsetTarget) {
     EXPECT_NEAR(d * SinGrads(z), ph, kTenthMm);
     EXPECT_NEAR(d * CosGrads(z), v + ev, kTenthMm);
     EXPECT_EQ(t, hp);
+
+    // Unknown values stay unknown; without a zenith angle only the target height is reduced.
+    a = kUndefined, z = 100.0, d = 50.0, t = kUndefined;
+    ReduceEccentricSighting(a, z, d, t, 0.5, 0.5, 0.2, false);
+    EXPECT_EQ(a, kUndefined);
+    EXPECT_EQ(t, kUndefined);
+    EXPECT_NEAR(d, std::hypot(50.5, 0.5), kTenthMm);
+    a = 10.0, z = kUndefined, d = 50.0, t = 1.5;
+    ReduceEccentricSighting(a, z, d, t, 0.5, 0.5, 0.2, true);
+    EXPECT_EQ(a, 10.0);
+    EXPECT_EQ(d, 50.0);
+    EXPECT_NEAR(t, 1.3, 1e-12);
 }
 
-TEST(EccentricSighting, LeavesWhatItCannotReduce) {
-    double ah = kUndefined, av = 100.0, di = 50.0, hp = kUndefined;
-    ReduceEccentricSighting(ah, av, di, hp, 0.5, 0.5, 0.2, false); // AH and HP unknown stay unknown
-    EXPECT_EQ(ah, kUndefined);
-    EXPECT_EQ(hp, kUndefined);
-    EXPECT_NEAR(di, std::hypot(50.5, 0.5), kTenthMm);
-
-    ah = 10.0, av = kUndefined, di = 50.0, hp = 1.5; // no zenith angle: only the height is reduced
-    ReduceEccentricSighting(ah, av, di, hp, 0.5, 0.5, 0.2, true);
-    EXPECT_EQ(ah, 10.0);
-    EXPECT_EQ(di, 50.0);
-    EXPECT_NEAR(hp, 1.3, 1e-12);
-}
-
-TEST(HorizontalDistance, ManualAndAutomaticScaleCorrections) {
-    DistanceCorrection manual;
-    manual.linearAlteration = -120.0; // mm/km
-    manual.levelReduction = -15.0;
-    double dh = 1000.0;
-    CorrectHorizontalDistance(dh, kUndefined, kUndefined, kUndefined, manual);
-    EXPECT_NEAR(dh, 1000.0 - 0.135, kTenthMm);
-
-    double none = 0.0, negative = kUndefined;
-    CorrectHorizontalDistance(none, 0, 0, 0, manual);
-    CorrectHorizontalDistance(negative, 0, 0, 0, manual);
+TEST(HorizontalDistance, ManualFormFromTheOptionsAutomaticFromTheHeight) {
+    TempDir dir;
+    const std::string ini = dir / "Pyralis.ini";
+    WriteBytes(ini, "[Options_Corrections]\nAlterLineaire=-120\nCorrNivZero=-15\nCorrAuto=0\n"
+                    "Projection=Aucune\nRayonTerre=6366\n");
+    DistanceCorrection correction = DistanceCorrection::FromOptions(ini);
+    DistanceCorrection unknown = correction; // the manual form needs no projection, the automatic one does
+    unknown.projection = std::make_shared<const CProjection>("Inconnue", 6366.0);
+    EXPECT_EQ(unknown.ProjectionError(), "");
+    unknown.automatic = true;
+    EXPECT_NE(unknown.ProjectionError(), "");
+    double dh = 1000.0, none = 0.0, negative = kUndefined;
+    for (double* d : {&dh, &none, &negative})
+        CorrectHorizontalDistance(*d, kUndefined, kUndefined, kUndefined, correction);
+    EXPECT_NEAR(dh, 1000.0 - 0.135, kTenthMm); // -120 - 15 mm a kilometre
     EXPECT_EQ(none, 0.0);
     EXPECT_EQ(negative, kUndefined);
 
-    // Local coordinates: no alteration; at 1000 m over a 6366 km earth a distance shrinks by
-    // R / (R + h), 157.06 mm a kilometre.
-    DistanceCorrection automatic;
-    automatic.automatic = true;
-    automatic.linearAlteration = 500.0; // ignored by the automatic form
-    automatic.projection = std::make_shared<const CProjection>("Aucune", 6366.0);
+    // Automatic, in local coordinates: no alteration, and the manual values ignored; at 1000 m over a
+    // 6366 km earth a distance shrinks by R / (R + h). Without a height, no reduction.
+    correction.automatic = true;
     dh = 1000.0;
-    CorrectHorizontalDistance(dh, 100.0, 200.0, 1000.0, automatic);
+    CorrectHorizontalDistance(dh, 100.0, 200.0, 1000.0, correction);
     EXPECT_NEAR(dh, 1000.0 * 6366000.0 / 6367000.0, kTenthMm);
     dh = 1000.0;
-    CorrectHorizontalDistance(dh, 100.0, 200.0, kUndefined, automatic); // no height, no reduction
+    CorrectHorizontalDistance(dh, 100.0, 200.0, kUndefined, correction);
     EXPECT_EQ(dh, 1000.0);
 }
 
-TEST(HorizontalDistance, OptionsAreReadFromTheParameterFile) {
+// Values worked by hand from the formulas of ordinary surveying work: 3 cm + 1 cm a kilometre for a
+// distance; for a height difference over 1 km at z = 50 (sin² = cos² = 1/2) 0.01 sqrt(8 + 40 + 1 + 4),
+// over 2 km at z = 300 (cos = 0) 0.01 sqrt(25 + 8 + 4), with the terms of the computed points.
+TEST(Tolerances, TheModeOfTheOptionsChoosesTheFormulaOrTheCustomValues) {
+    EXPECT_EQ(V0Tolerance(0, kV0ToleranceNormal), 0.0);
+    EXPECT_NEAR(V0Tolerance(4, kV0ToleranceNormal), 0.0043 * std::sqrt(0.75), 1e-9);
     TempDir dir;
     const std::string ini = dir / "Pyralis.ini";
-    WriteBytes(ini, "[Options_Corrections]\nAlterLineaire=12.5\nCorrNivZero=-3\nCorrAuto=0\n"
-                    "Projection=Aucune\nRayonTerre=5000\n");
-    const DistanceCorrection read = DistanceCorrection::FromOptions(ini);
-    EXPECT_FALSE(read.automatic);
-    EXPECT_EQ(read.linearAlteration, 12.5);
-    EXPECT_EQ(read.levelReduction, -3.0);
-    ASSERT_TRUE(read.projection);
-    EXPECT_TRUE(read.projection->IsNone());
-    EXPECT_EQ(read.ProjectionError(), ""); // the manual form needs no projection
-    // The radius is clamped to 6000 km: 1000 m up shrinks by 1000 / 6001000.
-    EXPECT_NEAR(read.projection->CalcEllipsReduc(0, 0, 1000.0, 1), -1e9 / 6001000.0, 1e-9);
+    const struct {
+        const char* file;
+        double v0Of2, distanceAt250, heightAt1000, heightAt2000;
+    } cases[] = {
+        {"", 0.0043 / std::sqrt(2.0), 0.0325, 0.01 * std::sqrt(53.0), 0.01 * std::sqrt(37.0)},
+        {"[Options_Tolerances]\nTypeTolerance=1\n", 0.0018 / std::sqrt(2.0), 0.0325, 0.01 * std::sqrt(53.0),
+         0.01 * std::sqrt(37.0)},
+        {"[Options_Tolerances]\nTypeTolerance=2\nTolAngles=0.005\nTolDistances=0.02\nTolAltitudes=0.03\n",
+         0.005, 0.02, 0.03, 0.03},
+        {"[Options_Tolerances]\nTypeTolerance=7\nTolAngles=0.005\n", 0.005, 0.01, 0.01, 0.01}, // clamped to 2
+    };
+    for (const auto& c : cases) {
+        WriteBytes(ini, c.file);
+        const Tolerances tolerances = Tolerances::FromOptions(ini);
+        EXPECT_NEAR(tolerances.V0(2), c.v0Of2, 1e-9) << c.file;
+        EXPECT_NEAR(tolerances.Distance(250.0), c.distanceAt250, 1e-9) << c.file;
+        EXPECT_NEAR(tolerances.HeightDifference(1000.0, 50.0, kHeightTermsV0), c.heightAt1000, 1e-9)
+            << c.file;
+        EXPECT_NEAR(tolerances.HeightDifference(2000.0, 300.0, kHeightTermsPoints), c.heightAt2000, 1e-9)
+            << c.file;
+    }
 }
 
 } // namespace

@@ -2,8 +2,7 @@
 
 // GéoBases built from exact coordinates for the tests of the orientation of stations: every sighting is
 // what a perfect instrument set up on the station would read, the zero of its horizontal circle turned
-// to a chosen bearing V0. Computed here with the plain trigonometry of the sphere-free plane, not with
-// the program's helpers.
+// to a chosen bearing V0. Plain plane trigonometry, not the program's helpers.
 #include "geobase/Carnet.h"
 #include "geobase/Elements.h"
 #include "geobase/Kinds.h"
@@ -15,27 +14,10 @@
 namespace pyr::test {
 
 constexpr double kGonPerRadian = 200.0 / 3.14159265358979323846;
-// The curvature and refraction of a line of sight, per square metre of horizontal distance.
-constexpr double kCurvature = 0.84 / 12768000.0;
 
 struct Place {
     double x, y, z;
 };
-
-struct Reading {
-    double ah, av, di;
-};
-
-// What the instrument (height `hi` over the station `s`) reads on a target `hp` over the point `t`.
-inline Reading Read(Place s, double hi, Place t, double hp, double v0) {
-    const double dx = t.x - s.x, dy = t.y - s.y;
-    const double horizontal = std::sqrt(dx * dx + dy * dy);
-    double bearing = std::atan2(dx, dy) * kGonPerRadian; // clockwise from north
-    const double rise = (t.z + hp) - (s.z + hi) - kCurvature * horizontal * horizontal;
-    double ah = std::fmod(bearing - v0 + 800.0, 400.0);
-    return {ah, std::atan2(horizontal, rise) * kGonPerRadian,
-            std::sqrt(horizontal * horizontal + rise * rise)};
-}
 
 inline void AddPoint(CCarnet& carnet, const std::string& name, Place p) {
     carnet.Add(std::make_unique<CPointGen>(name, p.x, p.y, p.z), kKindPoint);
@@ -45,12 +27,16 @@ inline int AddStation(CCarnet& carnet, const std::string& name, double hi, doubl
     return carnet.Add(std::make_unique<CStation>(name, hi, v0), kKindStation);
 }
 
-// A sighting of `name` read exactly; `kind` 1002 or 1003.
+// The reference sighting of the target `hp` over `t` read by the instrument `hi` over `s`; the line of
+// sight bends down by curvature and refraction, 0.84 / 12 768 000 m per square metre of distance.
 inline int AddSighting(CCarnet& carnet, const std::string& name, Place s, double hi, Place t, double hp,
-                       double v0, int kind = kKindReference) {
-    const Reading r = Read(s, hi, t, hp, v0);
-    if (kind == kKindMesure) return carnet.Add(std::make_unique<CMesure>(name, hp, r.ah, r.av, r.di), kind);
-    return carnet.Add(std::make_unique<CReference>(name, hp, r.ah, r.av, r.di), kind);
+                       double v0) {
+    const double dx = t.x - s.x, dy = t.y - s.y, horizontal = std::hypot(dx, dy);
+    const double rise = (t.z + hp) - (s.z + hi) - 0.84 / 12768000.0 * horizontal * horizontal;
+    const double ah = std::fmod(std::atan2(dx, dy) * kGonPerRadian - v0 + 800.0, 400.0); // clockwise
+    return carnet.Add(std::make_unique<CReference>(name, hp, ah, std::atan2(horizontal, rise) * kGonPerRadian,
+                                                   std::hypot(horizontal, rise)),
+                      kKindReference);
 }
 
 } // namespace pyr::test
