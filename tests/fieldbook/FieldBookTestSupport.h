@@ -1,0 +1,49 @@
+#pragma once
+
+// What the tests of the field books share: a reader run on text in memory, with a scripted front end
+// recording its text-window lines and its message boxes.
+#include "TestSupport.h"
+#include "fieldbook/FieldBookReader.h"
+#include "geobase/Carnet.h"
+#include "ui/PyrTxtWnd.h"
+#include "ui/ScriptedFrontEnd.h"
+
+#include <string>
+#include <vector>
+
+inline std::string FieldBookData(const std::string& name) {
+    return std::string(PYR_TEST_DATA) + "/fieldbook/" + name;
+}
+
+inline std::string DefaultCodeTable() {
+    return std::string(PYR_SOURCE_DIR) + "/data/Config/Defaut.cod";
+}
+
+// A reader with its choices, its window and its front end, reading into `result`.
+template <class Reader>
+struct ReaderRun {
+    Reader reader;
+    pyr::ReadingChoices choices;
+    pyr::ui::ScriptedFrontEnd frontEnd;
+    pyr::CPyrTxtWnd txt{frontEnd};
+    pyr::CCarnet result;
+
+    ReaderRun() {
+        reader.SetChoices(choices);
+        reader.SetTextWindow(&txt);
+        reader.SetParent(&frontEnd);
+    }
+    pyr::CCarnet& Read(std::string_view text) {
+        reader.ReadText(text, result);
+        return result;
+    }
+    // The text-window lines between "Création ..." and "... terminée", the reports of the lines.
+    std::vector<std::string> Reports() const {
+        std::vector<std::string> reports;
+        for (const auto& line : frontEnd.lines)
+            if (!line.empty() && line.find("Création de la GéoBase") == std::string::npos &&
+                line.find(" ... terminée") != 0)
+                reports.push_back(line);
+        return reports;
+    }
+};

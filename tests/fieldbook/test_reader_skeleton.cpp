@@ -1,0 +1,190 @@
+// The skeleton every field-book reader shares, through a small fixed-width format made for the test:
+// "S name HI", "M name AH AV DI HP", "C code", "H label=value", every line 24 characters long.
+#include "FieldBookTestSupport.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/TableCode.h"
+#include "settings/CalcOptions.h"
+
+#include <gtest/gtest.h>
+#include <sstream>
+
+using namespace pyr;
+
+namespace {
+
+class TestReader : public CFieldBookReader {
+public:
+    int begun = 0;
+    int ended = 0;
+
+protected:
+    void BeginReading() override { ++begun; }
+    void EndReading() override { ++ended; }
+    void ReadLine(std::string_view line, int number) override {
+        CheckLength(number, line, 24);
+        std::istringstream in{std::string(line.substr(std::min<std::size_t>(2, line.size())))};
+        std::vector<std::string> words;
+        for (std::string word; in >> word;)
+            words.push_back(word);
+        const char kind = line.empty() ? ' ' : line[0];
+        auto number_ = [&](std::size_t i) {
+            double value = kUndefined;
+            if (i < words.size()) ParseDouble(words[i], value);
+            return value;
+        };
+        if (kind == 'S') {
+            if (words.empty()) return LineMissing(number, "le nom de la station");
+            AddStation(words[0], number_(1));
+        } else if (kind == 'M') {
+            std::string name, code;
+            SplitNameAndCode(words.empty() ? "" : words[0], name, code);
+            AddCode(code);
+            AddMesure(name, number_(4), number_(1), number_(2), number_(3));
+        } else if (kind == 'C') {
+            AddCode(line.substr(2));
+        } else if (kind == 'H') {
+            std::string label, value;
+            if (CCarnet::validComment(line.substr(2), label, value)) AddHeaderComment(label, value);
+        } else if (kind == 'I') {
+            LineError(fb::kNoStationForHI, number);
+        } else {
+            LineUnrecognised(number);
+        }
+    }
+};
+
+class TopconLike : public TestReader {
+protected:
+    std::string OpenFailure(const std::string& path) const override {
+        return Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str());
+    }
+};
+
+std::string Pad(std::string line) {
+    line.resize(24, ' ');
+    return line;
+}
+
+} // namespace
+
+TEST(ReaderSkeleton, ItAnnouncesReadsEveryLineReportsAndCounts) {
+    ReaderRun<TestReader> run;
+    const std::string text = Pad("H Appareil=TCR 307") + "\r\n" + Pad("S S1 1.56") + "\n" + "S\r" +
+                             Pad("M 101 12 100 25 1.3") + "\n" + Pad("X") + "\n" + Pad("I 1.2") + "\n" +
+                             Pad("M 102 13 101 26 1.3") + "\r\n";
+    const CCarnet& read = run.Read(text);
+    const std::vector<std::string> expected{
+        "",
+        "Création de la GéoBase en cours ...",
+        "Attention : ligne 3 de longueur incorrecte (1 / 24) !",
+        "Erreur ligne 3 : donnée manquante pour le nom de la station !",
+        "Erreur ligne 5 : donnée non reconnue !",
+        "Erreur ligne 6 : pas de station pour cette hauteur d'instrument !",
+        " ... terminée : 4 lignes écrites.",
+    };
+    EXPECT_EQ(run.frontEnd.lines, expected);
+    EXPECT_EQ(run.reader.begun, 1);
+    EXPECT_EQ(run.reader.ended, 1);
+    ASSERT_EQ(read.GetSize(), 4);
+    // Header information: the label padded before " = ".
+    EXPECT_EQ(static_cast<const CComment*>(read.GetAt(0))->text(), "Appareil             = TCR 307");
+    EXPECT_EQ(read.GetType(1), kKindStation);
+    EXPECT_EQ(read.hiAt(1), 1.56);
+    EXPECT_EQ(read.GetType(3), kKindMesure);
+    EXPECT_EQ(read.ahAt(3), 13.0);
+    EXPECT_EQ(read.hpAt(3), 1.3);
+}
+
+TEST(ReaderSkeleton, NothingReadStillCountsZero) {
+    for (const char* text : {"", "\r\n\r\n", "X\n"}) {
+        ReaderRun<TestReader> run;
+        EXPECT_EQ(run.Read(text).GetSize(), 0);
+        EXPECT_EQ(run.frontEnd.lines.back(), " ... terminée : 0 lignes écrites.");
+    }
+}
+
+// The instrument of the options comes first when asked, the one named, or the first of the list.
+TEST(ReaderSkeleton, TheInstrumentIsTheFirstElementWhenAsked) {
+    const std::vector<InstrumentOptions> instruments{{kStandardInstrument},
+                                                     {"TCR 307", 0.034, 0.0012, 0.0003, 0.0005, 0.002, 2.0}};
+    const struct {
+        bool write;
+        const char* name;
+        const char* expected; // the instrument written, "" for none
+    } cases[] = {
+        {false, "TCR 307", ""}, {true, "TCR 307", "TCR 307"}, {true, "Inconnu", kStandardInstrument}};
+    for (const auto& c : cases) {
+        ReaderRun<TestReader> run;
+        run.choices.writeInstrument = c.write;
+        run.choices.instrumentName = c.name;
+        run.choices.instruments = instruments;
+        const CCarnet& read = run.Read(Pad("S S1 1.5") + "\n");
+        ASSERT_EQ(read.GetSize(), c.write ? 2 : 1);
+        if (!c.write) continue;
+        ASSERT_EQ(read.GetType(0), kKindAppareil);
+        const auto* instrument = read.As<CAppareil>(0);
+        EXPECT_EQ(instrument->mat(), c.expected);
+        if (std::string(c.expected) == "TCR 307") {
+            EXPECT_EQ(instrument->constPrisme(), 0.034);
+            EXPECT_EQ(instrument->collVerticale(), 0.0012);
+            EXPECT_EQ(instrument->sigmaAh(), 0.0003);
+            EXPECT_EQ(instrument->sigmaAv(), 0.0005);
+            EXPECT_EQ(instrument->sigmaDi(), 0.002);
+            EXPECT_EQ(instrument->sigmaPpm(), 2.0);
+        }
+    }
+}
+
+// With interpretation a code becomes the command the table gives; without it, or unknown to the table,
+// it stays as it stands. The name and code of a field are cut by the table's separator.
+TEST(ReaderSkeleton, CodesAreInterpretedOrKeptAndCutFromTheName) {
+    CTableCode table;
+    ASSERT_TRUE(table.Init(DefaultCodeTable()));
+    for (const bool interpret : {false, true}) {
+        ReaderRun<TestReader> run;
+        run.choices.interpret = interpret;
+        run.reader.SetCodeTable(&table);
+        const CCarnet& read =
+            run.Read(Pad("S S1 1.5") + "\n" + Pad("M 125ARB 12 100 25") + "\n" + Pad("C ZZZ 1") + "\n");
+        ASSERT_EQ(read.GetSize(), 4) << run.frontEnd.AllLines();
+        EXPECT_EQ(read.GetType(1), interpret ? CommandKind("Sym_Cir_Dia") : kKindCommand);
+        EXPECT_EQ(read.cmdAt(1), interpret ? "Sym_Cir_Dia" : "ARB");
+        EXPECT_EQ(read.matAt(2), "125");
+        EXPECT_EQ(read.GetType(3), kKindCommand);
+        EXPECT_EQ(read.cmdAt(3), "ZZZ 1");
+    }
+    // Without a table the whole field is the name.
+    ReaderRun<TestReader> run;
+    const CCarnet& read = run.Read(Pad("S S1 1.5") + "\n" + Pad("M 125EXR 12 100 25") + "\n");
+    ASSERT_EQ(read.GetSize(), 2);
+    EXPECT_EQ(read.matAt(1), "125EXR");
+}
+
+TEST(ReaderSkeleton, AFileThatCannotBeOpenedIsSaidAndAddsNothing) {
+    TempDir dir;
+    const std::string missing = dir / "absent.txt";
+    ReaderRun<TestReader> plain;
+    EXPECT_FALSE(plain.reader.Read(missing, plain.result));
+    ReaderRun<TopconLike> topcon;
+    EXPECT_FALSE(topcon.reader.Read(missing, topcon.result));
+    ASSERT_EQ(plain.frontEnd.messages.size(), 1u);
+    EXPECT_EQ(plain.frontEnd.messages[0].text, "Impossible d'ouvrir le fichier carnet !");
+    ASSERT_EQ(topcon.frontEnd.messages.size(), 1u);
+    EXPECT_EQ(topcon.frontEnd.messages[0].text,
+              "Impossible d'ouvrir le fichier carnet en lecture !\n(" + missing + ")");
+    EXPECT_TRUE(plain.frontEnd.lines.empty());
+    EXPECT_EQ(plain.result.GetSize(), 0);
+}
+
+// A field book from a Windows machine: its accents survive, and the window says how it was read.
+TEST(ReaderSkeleton, AWindows1252FieldBookKeepsItsAccents) {
+    TempDir dir;
+    WriteBytes(dir / "carnet.txt", Pad("H Op\xe9rateur=J. B\xe9rard") + "\n");
+    ReaderRun<TestReader> run;
+    ASSERT_TRUE(run.reader.Read(dir / "carnet.txt", run.result));
+    ASSERT_EQ(run.result.GetSize(), 1);
+    EXPECT_EQ(static_cast<const CComment*>(run.result.GetAt(0))->text(), "Opérateur            = J. Bérard");
+    EXPECT_EQ(run.frontEnd.lines[0], "Carnet <" + dir / "carnet.txt" + "> : fichier lu en Windows-1252.");
+}
