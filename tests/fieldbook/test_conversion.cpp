@@ -1,0 +1,322 @@
+// A whole conversion: settings read, dialog, settings written back, reading, then a new GéoBase or the
+// elements appended to the editor's; and every way it stops without touching anything.
+#include "FieldBookTestSupport.h"
+#include "fieldbook/FieldBookConverter.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/LectCarnet.h"
+#include "fieldbook/QuendalPivot.h"
+#include "fieldbook/QuendalReader.h"
+#include "fieldbook/TableCode.h"
+#include "settings/CalcOptions.h"
+#include "settings/LastGeoBase.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <sys/stat.h>
+
+using namespace pyr;
+using ui::Answer;
+using ui::DialogResult;
+namespace fs = std::filesystem;
+
+namespace {
+
+constexpr const char* kBook = "QUENDAL-PC;1\n"
+                              "STATION;S1;1.562\n"
+                              "REFERENCE;A1;1.3;323.76206;99.40145;260.0083\n"
+                              "MESURE;102;1.8;388.64623;99.18242;111.5994;POTEAU\n";
+constexpr const char* kEmptyGeoBase = "GEOBASE PYRALIS\t1\n";
+
+class Conversion : public ::testing::Test {
+protected:
+    Conversion() {
+        fs::create_directories(install + "Config");
+        for (const char* file : {"Wild.ini", "Defaut.cod"})
+            fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/Config/" + file, install + "Config/" + file);
+        WriteBytes(dir / "carnet.qdl", kBook);
+    }
+    std::unique_ptr<FieldBookConverter> Make(FieldBookFormat format, EditorDocument* document = nullptr) {
+        return std::make_unique<FieldBookConverter>(format, &frontEnd, Params(), install, &txt, document);
+    }
+    // A conversion of the Quendal-Pc field book, with that command line.
+    DialogResult Convert(std::vector<std::string> arguments, CCarnet* target = nullptr,
+                         FieldBookFormat format = FieldBookFormat::Quendal) {
+        frontEnd.dialogArguments = std::move(arguments);
+        auto converter = Make(format);
+        if (format != FieldBookFormat::Quendal)
+            converter->makeReader = [] { return std::make_unique<CQuendalReader>(); };
+        return RunConversion(*converter, target);
+    }
+    std::string Params() const { return dir / "Pyralis.ini"; }
+    std::string Key(const char* section, const char* key) const {
+        std::string value;
+        ReadParamString(Params(), section, key, "", value);
+        return value;
+    }
+    std::string LastFile() const {
+        std::string value;
+        ReadParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "", value);
+        return value;
+    }
+    bool Said(const std::string& line) const {
+        return std::find(frontEnd.lines.begin(), frontEnd.lines.end(), line) != frontEnd.lines.end();
+    }
+
+    TempDir dir;
+    ScopedEnv registry{"PYRALIS_REGISTRE", dir / "registre"};
+    std::string install = dir / "installation/";
+    ui::ScriptedFrontEnd frontEnd;
+    CPyrTxtWnd txt{frontEnd};
+};
+
+} // namespace
+
+TEST_F(Conversion, ANewGeoBaseIsWrittenBesideTheFieldBookAndRecorded) {
+    EXPECT_EQ(Convert({dir / "carnet.qdl"}), DialogResult::Ok);
+    CCarnet written;
+    ASSERT_TRUE(written.Load(nullptr, dir / "carnet.geo"));
+    ASSERT_EQ(written.GetSize(), 3);
+    EXPECT_EQ(written.GetType(0), kKindStation);
+    EXPECT_EQ(written.GetType(2), kKindMesure);
+    EXPECT_TRUE(Said(" ... terminée : 3 lignes écrites."));
+    EXPECT_TRUE(Said("GéoBase créée = <" + dir / "carnet.geo" + ">."));
+    EXPECT_EQ(frontEnd.dialogs, std::vector<std::string>{"Lecture du carnet Quendal-Pc"});
+    // The dialog's values and the last file.
+    EXPECT_EQ(Key("Carnet.Quendal", "Carnet"), dir / "carnet.qdl");
+    EXPECT_EQ(Key("Carnet.Quendal", "Interprétation"), "0");
+    EXPECT_EQ(Key("Carnet.Quendal", "EcrireAppareil"), "0");
+    EXPECT_EQ(ReadLastGeoBase(Params()), dir / "carnet.geo");
+    EXPECT_EQ(LastFile(), dir / "carnet.geo");
+    // The next conversion offers that field book again.
+    frontEnd.fileChoices.clear();
+    frontEnd.answers = {Answer::Yes}; // the GéoBase exists now: replaced
+    EXPECT_EQ(Convert({}), DialogResult::Ok);
+    ASSERT_EQ(frontEnd.fileChoices.size(), 1u);
+    EXPECT_EQ(frontEnd.fileChoices[0].startPath, dir / "carnet.qdl");
+}
+
+TEST_F(Conversion, AFieldBookWithNothingToReadMakesAnEmptyGeoBase) {
+    WriteBytes(dir / "vide.qdl", "QUENDAL-PC;1\n\n");
+    EXPECT_EQ(Convert({dir / "vide.qdl"}), DialogResult::Ok);
+    EXPECT_TRUE(Said(" ... terminée : 0 lignes écrites."));
+    EXPECT_EQ(ReadBytes(dir / "vide.geo"), kEmptyGeoBase);
+}
+
+// Stopped before the reading, a conversion leaves the disk and the open GéoBase as they were.
+TEST_F(Conversion, AStoppedConversionTouchesNothing) {
+    WriteBytes(dir / "carnet.geo", "ancienne\n");
+    const struct {
+        const char* what;
+        std::vector<std::string> arguments;
+        std::vector<Answer> answers;
+        bool merge;
+        DialogResult result;
+    } cases[] = {
+        {"GéoBase existante gardée", {dir / "carnet.qdl"}, {Answer::No}, false, DialogResult::Cancel},
+        {"carnet absent", {dir / "absent.qdl"}, {}, false, DialogResult::Failed},
+        {"table absente, pas d'interprétation refusée",
+         {dir / "carnet.qdl", "--interpretation", "1"},
+         {Answer::No},
+         true,
+         DialogResult::Cancel},
+        {"appareil inconnu", {dir / "carnet.qdl", "--appareil", "Disparu"}, {}, true, DialogResult::Failed},
+    };
+    for (const auto& c : cases) {
+        CCarnet target;
+        target.Add(std::make_unique<CComment>("déjà là"), kKindComment);
+        frontEnd.answers.assign(c.answers.begin(), c.answers.end());
+        EXPECT_EQ(Convert(c.arguments, c.merge ? &target : nullptr), c.result) << c.what;
+        EXPECT_EQ(target.GetSize(), 1) << c.what;
+        EXPECT_EQ(ReadBytes(dir / "carnet.geo"), "ancienne\n") << c.what;
+        EXPECT_FALSE(fs::exists(Params())) << c.what;
+        EXPECT_FALSE(fs::exists(dir / "registre")) << c.what;
+    }
+}
+
+TEST_F(Conversion, AFailedWriteLeavesTheLastFileKeysAsTheyWere) {
+    WriteLastGeoBase(Params(), "avant.geo");
+    WriteParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "avant.geo");
+    EXPECT_EQ(Convert({dir / "carnet.qdl", "--geobase", dir / "absent/carnet.geo"}), DialogResult::Failed);
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(frontEnd.messages[0].text, "Impossible d'écrire dans la GéoBase indiquée !");
+    EXPECT_EQ(ReadLastGeoBase(Params()), "avant.geo");
+    EXPECT_EQ(LastFile(), "avant.geo");
+    EXPECT_FALSE(fs::exists(dir / "absent"));
+}
+
+// Into the editor's GéoBase: after its elements, in reading order, the instrument first; nothing written.
+TEST_F(Conversion, AMergeAppendsInReadingOrderWithTheInstrumentFirst) {
+    WriteInstruments(Params(), {{kStandardInstrument}, {"TCR 307", 0.034}});
+    CCarnet target;
+    target.Add(std::make_unique<CComment>("Levé du 2 mars"), kKindComment);
+    target.Add(std::make_unique<CPointGen>("A1", 651050.118, 6862512.447), kKindPoint);
+    EditorDocument document{nullptr, ReadInstruments(Params())};
+    auto converter = Make(FieldBookFormat::Quendal, &document);
+    bool geoBaseShown = true;
+    converter->showDialog = [&](CLectCarnet& dialog) {
+        geoBaseShown = dialog.GeoBaseFieldVisible();
+        return frontEnd.DoModal(dialog);
+    };
+    frontEnd.dialogArguments = {dir / "carnet.qdl", "--ecrire-appareil", "1", "--appareil", "TCR 307"};
+    EXPECT_EQ(RunConversion(*converter, &target), DialogResult::Ok);
+    EXPECT_FALSE(geoBaseShown);
+    const std::vector<int> kinds{kKindComment, kKindPoint,     kKindAppareil,
+                                 kKindStation, kKindReference, kKindMesure};
+    ASSERT_EQ(target.GetSize(), static_cast<int>(kinds.size()));
+    for (int i = 0; i < target.GetSize(); ++i)
+        EXPECT_EQ(target.GetType(i), kinds[static_cast<std::size_t>(i)]) << i;
+    EXPECT_EQ(target.matAt(2), "TCR 307");
+    EXPECT_EQ(target.matAt(5), "102");
+    EXPECT_EQ(converter->result.GetSize(), 0);
+    EXPECT_FALSE(fs::exists(dir / "carnet.geo"));
+    EXPECT_EQ(LastFile(), "");
+    // The editor held no code table: this format says it in its own words.
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(frontEnd.messages[0].text, "Cas impossible en théorie !!!");
+}
+
+TEST_F(Conversion, EachFormatSaysInItsWordsThatTheEditorHasNoCodeTable) {
+    for (const auto& [format, text] :
+         {std::pair{FieldBookFormat::Wild, "Pas de table de codes actuellement chargée !!!"},
+          std::pair{FieldBookFormat::Geotronics, "Pas de table de codes actuellement chargée !!!"},
+          std::pair{FieldBookFormat::Sokkia, "Cas impossible en théorie !!!"}}) {
+        ui::ScriptedFrontEnd fe;
+        EditorDocument document;
+        FieldBookConverter converter(format, &fe, Params(), install, nullptr, &document);
+        converter.makeReader = [] { return std::make_unique<CQuendalReader>(); };
+        converter.showDialog = [](CLectCarnet&) { return DialogResult::Cancel; };
+        RunConversion(converter, nullptr);
+        ASSERT_EQ(fe.messages.size(), 1u);
+        EXPECT_EQ(fe.messages[0].text, text);
+        // A table the editor holds is used, and named in the dialog.
+        CTableCode table;
+        ASSERT_TRUE(table.Init(DefaultCodeTable()));
+        document.codeTable = &table;
+        std::string named;
+        converter.showDialog = [&named](CLectCarnet& dialog) {
+            named = dialog.CodeTablePath();
+            return DialogResult::Cancel;
+        };
+        RunConversion(converter, nullptr);
+        EXPECT_EQ(fe.messages.size(), 1u);
+        EXPECT_EQ(named, DefaultCodeTable());
+        EXPECT_EQ(converter.codeTable, &table);
+    }
+}
+
+// The default table, named in any case, is neither loaded in place of the job's table nor saved as it.
+TEST_F(Conversion, TheDefaultCodeTableIsNeitherReloadedNorSaved) {
+    WriteBytes(dir / "job.cod", "Séparateur = A...Z\nPIQ   ExcentRad\n");
+    WriteBytes(dir / "autre.cod", "Séparateur = A...Z\nEXR   ExcentRad\n");
+    WriteBytes(dir / "codes.qdl", "STATION;S1;1.5\nCODE;PIQ 0.2\nCODE;EXR 0.15\n");
+    const struct {
+        const char* table;
+        std::string kept;          // the key afterwards
+        int firstKind, secondKind; // how PIQ and EXR were read
+    } cases[] = {
+        {"DEFAUT.COD", dir / "job.cod", kKindExcentrement, kKindCommand},
+        {"Defaut.cod", dir / "job.cod", kKindExcentrement, kKindCommand},
+        {"", dir / "autre.cod", kKindCommand, kKindExcentrement}, // the table named below
+    };
+    for (const auto& c : cases) {
+        WriteParamString(Params(), kSectionGeocodification, kKeyTableDeCode, dir / "job.cod");
+        const std::string table = *c.table ? std::string(c.table) : dir / "autre.cod";
+        frontEnd.answers = {Answer::Yes, Answer::Yes};
+        auto converter = Make(FieldBookFormat::Quendal);
+        frontEnd.dialogArguments = {dir / "codes.qdl", "--interpretation", "1", "--table", table};
+        ASSERT_EQ(RunConversion(*converter, nullptr), DialogResult::Ok) << c.table;
+        EXPECT_EQ(Key(kSectionGeocodification, kKeyTableDeCode), c.kept) << c.table;
+        EXPECT_EQ(converter->codeTable->FileName(), c.kept) << c.table;
+        CCarnet written;
+        ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
+        ASSERT_EQ(written.GetSize(), 3);
+        EXPECT_EQ(written.GetType(1), c.firstKind) << c.table;
+        EXPECT_EQ(written.GetType(2), c.secondKind) << c.table;
+    }
+}
+
+// The Wild format's pre-formatting program writes "<name>.tmp", which is read instead and then deleted.
+TEST_F(Conversion, ThePreformattingProgramRunsAndAMissingOneIsSaid) {
+    const std::string script = dir / "préformat.sh";
+    WriteBytes(script, "#!/bin/sh\nsed 's/^X;/MESURE;/' \"$1\" > \"${1%.*}.tmp\"\n");
+    chmod(script.c_str(), 0755);
+    WriteBytes(dir / "levé.gsi", "STATION;S1;1.5\nX;101;1.3;10;100;25\n");
+    for (const bool present : {true, false}) {
+        frontEnd = {};
+        fs::remove(dir / "levé.geo");
+        WriteParamString(Params(), "Carnet.Wild", kKeyPreformattage, present ? script : dir / "absent.sh");
+        EXPECT_EQ(Convert({dir / "levé.gsi"}, nullptr, FieldBookFormat::Wild), DialogResult::Ok);
+        CCarnet written;
+        ASSERT_TRUE(written.Load(nullptr, dir / "levé.geo"));
+        EXPECT_EQ(written.GetSize(), present ? 2 : 1);
+        EXPECT_FALSE(fs::exists(dir / "levé.tmp"));
+        EXPECT_EQ(ReadBytes(dir / "levé.gsi"), "STATION;S1;1.5\nX;101;1.3;10;100;25\n");
+        if (present) {
+            EXPECT_TRUE(frontEnd.messages.empty());
+        } else {
+            ASSERT_EQ(frontEnd.messages.size(), 1u);
+            EXPECT_EQ(frontEnd.messages[0].text,
+                      "Impossible de trouver le programme de préformattage :\n" + dir / "absent.sh");
+            EXPECT_TRUE(Said("Erreur ligne 2 : donnée non reconnue !"));
+        }
+    }
+}
+
+TEST_F(Conversion, AZeroPrismHeightIsToldWhenTheFormatTestsIt) {
+    WriteBytes(dir / "zero.gsi", "STATION;S1;1.5\nMESURE;101;0;10;100;25\n");
+    for (const auto& [test, told] : {std::pair{"1", true}, std::pair{"0", false}}) {
+        frontEnd = {};
+        fs::remove(dir / "zero.geo");
+        WriteParamString(Params(), "Carnet.Wild", kKeyTestHpNulle, test);
+        EXPECT_EQ(Convert({dir / "zero.gsi"}, nullptr, FieldBookFormat::Wild), DialogResult::Ok);
+        ASSERT_EQ(frontEnd.messages.size(), told ? 1u : 0u);
+        if (told) {
+            EXPECT_EQ(frontEnd.messages[0].text, "Certaines observations ont une hauteur de prisme à zéro !");
+            EXPECT_EQ(frontEnd.messages[0].icon, ui::kIconInformation);
+        }
+    }
+    // The test key is read, never written back.
+    EXPECT_EQ(Key("Carnet.Wild", kKeyTestHpNulle), "0");
+    EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), install + "Config/Wild.ini");
+}
+
+TEST_F(Conversion, AFormatWithoutItsReaderYetSaysSo) {
+    auto converter = Make(FieldBookFormat::Sokkia);
+    EXPECT_EQ(RunConversion(*converter, nullptr), DialogResult::Failed);
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(frontEnd.messages[0].text, "La lecture des carnets Sokkia n'est pas encore disponible dans "
+                                         "cette version de PYRALIS Calculs Topo.");
+    EXPECT_TRUE(frontEnd.dialogs.empty());
+}
+
+// A delimited field book goes through a Quendal-Pc file beside it, read with the same choices, then deleted.
+TEST_F(Conversion, ADelimitedFieldBookIsReadThroughAQuendalFile) {
+    fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/Config/Param_Export.sep",
+                  install + "Config/Param_Export.sep");
+    WriteBytes(dir / "points.txt", "PT;P1;10;20;30\nCD;EXR 0.15\nPT;P2;11;21\n");
+    // The importer hands the records, as the delimited layout would read them.
+    RecordImporter importer = [&](const CParamDriver& layout, const std::string& carnet, CCarnet& records,
+                                  CPyrTxtWnd*, ui::FrontEnd*) {
+        EXPECT_EQ(layout.Layout().typePoint, "PT");
+        EXPECT_EQ(carnet, dir / "points.txt");
+        records.Add(std::make_unique<CPointGen>("P1", 10.0, 20.0, 30.0), kKindPoint);
+        records.Add(std::make_unique<CCommande>("EXR 0.15"), kKindCommand);
+        records.Add(std::make_unique<CPointGen>("P2", 11.0, 21.0), kKindPoint);
+        return true;
+    };
+    CTableCode table;
+    ASSERT_TRUE(table.Init(DefaultCodeTable()));
+    EditorDocument document{&table, {}};
+    auto converter = Make(FieldBookFormat::Separateur, &document);
+    converter->makeReader = [&] { return std::make_unique<CQuendalPivot>(importer); };
+    frontEnd.dialogArguments = {dir / "points.txt", "--interpretation", "1"};
+    CCarnet target;
+    ASSERT_EQ(RunConversion(*converter, &target), DialogResult::Ok) << frontEnd.AllLines();
+    EXPECT_FALSE(fs::exists(dir / "points.tmp"));
+    ASSERT_EQ(target.GetSize(), 3);
+    EXPECT_EQ(target.GetType(1), kKindExcentrement);
+    EXPECT_EQ(target.zAt(2), kUndefined);
+    EXPECT_EQ(std::count(frontEnd.lines.begin(), frontEnd.lines.end(), "Création de la GéoBase en cours ..."),
+              1);
+    EXPECT_EQ(frontEnd.lines.back(), " ... terminée : 3 lignes écrites.");
+}
