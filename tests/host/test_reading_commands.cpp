@@ -1,0 +1,115 @@
+// The reading commands and the editor's reading, run as a person or a script runs pyralis.
+#include "HostTestSupport.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <sys/wait.h>
+
+namespace {
+
+constexpr const char* kBook = "QUENDAL-PC;1\n"
+                              "STATION;S1;1.562\n"
+                              "REFERENCE;A1;1.3;323.76206;99.40145;260.0083\n"
+                              "MESURE;102;1.8;388.64623;99.18242;111.5994;POTEAU\n";
+constexpr const char* kJob = "GEOBASE PYRALIS\t1\n"
+                             "1006\tA1\t651050.118\t6862512.447\t-999999\tXY\tBORNE\n";
+
+struct Outcome {
+    int status = -1;
+    std::string out;
+    std::string err;
+};
+
+class ReadingCommands : public ::testing::Test {
+protected:
+    ReadingCommands() { WriteBytes(dir / "carnet.qdl", kBook); }
+    // Runs "pyralis <arguments>" in the test's folder, with its own parameter file and registry.
+    Outcome Run(const std::string& arguments) {
+        const std::string command = "cd '" + dir.Root().string() + "' && PYRALIS_REGISTRE='" +
+                                    dir / "registre" + "' '" + ProgramFile("pyralis") + "' --params '" +
+                                    dir / "Pyralis.ini" + "' " + arguments +
+                                    " </dev/null >sortie.txt 2>erreurs.txt";
+        const int raw = std::system(command.c_str());
+        return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(dir / "sortie.txt"),
+                ReadBytes(dir / "erreurs.txt")};
+    }
+    static bool Has(const std::string& text, const std::string& part) {
+        return text.find(part) != std::string::npos;
+    }
+
+    TempDir dir;
+};
+
+} // namespace
+
+TEST_F(ReadingCommands, LQuendaConvertsTheFieldBookNamedIntoANewGeoBase) {
+    const Outcome outcome = Run("LQuenda carnet.qdl");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_EQ(outcome.out, "\nCréation de la GéoBase en cours ...\n ... terminée : 3 lignes écrites.\n"
+                           "GéoBase créée = <carnet.geo>.\n");
+    EXPECT_EQ(ReadBytes(dir / "carnet.geo"), "GEOBASE PYRALIS\t1\n"
+                                             "1001\tS1\t1.562\t-999999\n"
+                                             "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
+                                             "1003\t102\t1.8\t388.64623\t99.18242\t111.5994\tPOTEAU\n");
+    const std::string params = ReadBytes(dir / "Pyralis.ini");
+    EXPECT_TRUE(Has(params, "Carnet=carnet.qdl")) << params;
+    EXPECT_TRUE(Has(params, "Derniere=" + dir / "carnet.geo")) << params;
+    EXPECT_TRUE(
+        Has(ReadBytes(dir / "registre/HKEY_CURRENT_USER.ini"), "DernierFichier=" + dir / "carnet.geo"));
+
+    // Again without naming it: the last field book is taken, and the GéoBase is kept unless --oui.
+    WriteBytes(dir / "carnet.geo", "à garder\n");
+    const Outcome kept = Run("LQuenda");
+    EXPECT_EQ(kept.status, 0);
+    EXPECT_TRUE(Has(kept.err, "Sélectionnez le fichier carnet à traiter : carnet.qdl")) << kept.err;
+    EXPECT_TRUE(
+        Has(kept.err, "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?\nRéponse : Non"));
+    EXPECT_EQ(ReadBytes(dir / "carnet.geo"), "à garder\n");
+    EXPECT_EQ(Run("--oui LQuenda --geobase autre.geo").status, 0);
+    EXPECT_TRUE(std::filesystem::exists(dir / "autre.geo"));
+}
+
+TEST_F(ReadingCommands, AReaderNotBuiltYetSaysSoAndTheHelpNamesTheFieldBook) {
+    const Outcome wild = Run("LecWild carnet.gsi");
+    EXPECT_EQ(wild.status, 1);
+    EXPECT_TRUE(Has(wild.err, "La lecture des carnets Wild n'est pas encore disponible")) << wild.err;
+    const Outcome help = Run("PyraLQuenda --help");
+    EXPECT_EQ(help.status, 0);
+    EXPECT_TRUE(Has(help.out, "Usage : pyralis PyraLQuenda [CARNET] [options]")) << help.out;
+    EXPECT_TRUE(Has(help.out, "--geobase FICHIER       la GéoBase à créer")) << help.out;
+    EXPECT_FALSE(Has(help.out, "--parametrage")); // Quendal-Pc has no parameter file
+    EXPECT_TRUE(Has(Run("LecWild --help").out, "--parametrage FICHIER"));
+}
+
+TEST_F(ReadingCommands, TheEditorAppendsAFieldBookToItsGeoBaseAfterAsking) {
+    WriteBytes(dir / "job.geo", kJob);
+    // In a batch the question takes its default: cancel, nothing changes.
+    const Outcome asked = Run("GeoEdit job.geo --lecture Quendal carnet.qdl");
+    EXPECT_EQ(asked.status, 0) << asked.err;
+    EXPECT_TRUE(Has(asked.err, "La GéoBase courante n'est pas vide !")) << asked.err;
+    EXPECT_TRUE(Has(asked.err, "Réponse : Annuler"));
+    EXPECT_EQ(ReadBytes(dir / "job.geo"), kJob);
+
+    const Outcome appended = Run("--oui GeoEdit job.geo --lecture quendal-pc carnet.qdl");
+    EXPECT_EQ(appended.status, 0) << appended.err;
+    EXPECT_EQ(ReadBytes(dir / "job.geo"), std::string(kJob) +
+                                              "1001\tS1\t1.562\t-999999\n"
+                                              "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
+                                              "1003\t102\t1.8\t388.64623\t99.18242\t111.5994\tPOTEAU\n");
+    EXPECT_EQ(ReadBytes(dir / "job.bak"), kJob);
+    EXPECT_TRUE(Has(appended.out, "GéoBase <job.geo> : 4 élément(s), dont 3 lu(s) dans le carnet.\n"
+                                  "000002  Station       S1  1.562  -999999\n"))
+        << appended.out;
+
+    const Outcome unknown = Run("GeoEdit job.geo --lecture Inconnu carnet.qdl");
+    EXPECT_EQ(unknown.status, 1);
+    EXPECT_TRUE(Has(unknown.err, "Format de carnet inconnu : « Inconnu »")) << unknown.err;
+}
+
+// A GéoBase named that does not exist yet is made by the reading, without a question.
+TEST_F(ReadingCommands, TheEditorMakesANewGeoBaseFromAFieldBook) {
+    const Outcome outcome = Run("GeoEdit neuve.geo --lecture LQuenda carnet.qdl");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(Has(ReadBytes(dir / "neuve.geo"), "1003\t102\t"));
+    EXPECT_FALSE(Has(outcome.err, "n'est pas vide"));
+}
