@@ -1,5 +1,6 @@
 #include "fieldbook/FieldBookConverter.h"
 
+#include "core/Files.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookReaders.h"
@@ -25,7 +26,8 @@ std::unique_ptr<CLectCarnet> MakeDialog(const FieldBookConverter& c) {
     return std::make_unique<CLectCarnet>(c.format, c.params, c.installDir);
 }
 
-// Step 5: the code table of the editor's GéoBase, or without an editor the job's table of the settings.
+// Step 5: the code table of the editor's GéoBase, or without an editor the job's table of the settings;
+// when no job has a table yet, the installation's default one.
 void ChooseCodeTable(FieldBookConverter& c, CLectCarnet& dialog, const FieldBookFormatInfo& info) {
     if (c.document) {
         c.codeTable = c.document->codeTable;
@@ -37,6 +39,9 @@ void ChooseCodeTable(FieldBookConverter& c, CLectCarnet& dialog, const FieldBook
     }
     std::string path;
     c.params.ReadString(kSectionGeocodification, kKeyTableDeCode, "", path);
+    if (const std::string installed = InstallationConfigFile(c.installDir, kDefaultCodeTable);
+        path.empty() && FileExists(installed))
+        path = installed;
     dialog.SetCodeTablePath(path);
     c.ownedTable = std::make_unique<CTableCode>();
     c.codeTable = c.ownedTable.get();

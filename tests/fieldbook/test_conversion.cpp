@@ -115,7 +115,7 @@ TEST_F(Conversion, AStoppedConversionTouchesNothing) {
         {"GéoBase existante gardée", {dir / "carnet.qdl"}, {Answer::No}, false, DialogResult::Cancel},
         {"carnet absent", {dir / "absent.qdl"}, {}, false, DialogResult::Failed},
         {"table absente, pas d'interprétation refusée",
-         {dir / "carnet.qdl", "--interpretation", "1"},
+         {dir / "carnet.qdl", "--interpretation", "1", "--table", dir / "absente.cod"},
          {Answer::No},
          true,
          DialogResult::Cancel},
@@ -233,6 +233,18 @@ TEST_F(Conversion, TheDefaultCodeTableIsNeitherReloadedNorSaved) {
         EXPECT_EQ(written.GetType(1), c.firstKind) << c.table;
         EXPECT_EQ(written.GetType(2), c.secondKind) << c.table;
     }
+}
+
+// Without a table of its own the job uses the installation's default table, which is not saved as its.
+TEST_F(Conversion, WithoutATableOfItsOwnTheJobUsesTheDefaultOne) {
+    WriteBytes(dir / "codes.qdl", "STATION;S1;1.5\nCODE;EXR 0.15\n");
+    EXPECT_EQ(Convert({dir / "codes.qdl", "--interpretation", "1"}), DialogResult::Ok);
+    CCarnet written;
+    ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
+    ASSERT_EQ(written.GetSize(), 2);
+    EXPECT_EQ(written.GetType(1), kKindExcentrement);
+    EXPECT_EQ(Key(kSectionGeocodification, kKeyTableDeCode), "");
+    EXPECT_TRUE(frontEnd.questions.empty());
 }
 
 // The Wild format's pre-formatting program writes "<name>.tmp", which is read instead and then deleted.
