@@ -1,5 +1,5 @@
 # PYRALIS Calculs Topo: the usual commands.
-#   make demo    install what is missing, build in Release, run pyralis on the bundled GéoBase
+#   make demo    install what is missing, build in Release, run pyralis on the bundled GéoBase and field book
 #   make check   install what is missing, build with AddressSanitizer and UBSan, run every test
 #   make bench   build in Release and run the benchmarks
 #   make fuzz    build the fuzz targets with clang and run each for FUZZ_SECONDS (60) seconds
@@ -25,8 +25,9 @@ release: deps
 	cmake --build $(RELEASE_DIR) -j $(JOBS)
 
 # The commands of the module, then the GéoBase editor on a copy of the bundled job, then the orientation
-# of every station with its listing, with a parameter file of the demo's own (the user's settings are
-# left alone).
+# of every station with its listing; then the bundled Quendal-Pc field book converted into a new GéoBase
+# (its codes interpreted by the default table), whose stations are oriented in turn. The demo has a
+# parameter file and a registry of its own (the user's settings are left alone).
 demo: release
 	@rm -rf $(DEMO_DIR) && mkdir -p $(DEMO_DIR)
 	@cp data/chantier-demo.geo $(DEMO_DIR)/
@@ -35,6 +36,12 @@ demo: release
 	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalculV0 \
 		--geobase $(DEMO_DIR)/chantier-demo.geo --type toutes --enregistrer --listing $(DEMO_DIR)/chantier-demo.cv0
 	@cat $(DEMO_DIR)/chantier-demo.cv0
+	@cp data/carnet-tilleuls.qdl $(DEMO_DIR)/
+	PYRALIS_REGISTRE=$(DEMO_DIR)/registre $(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui \
+		LQuenda $(DEMO_DIR)/carnet-tilleuls.qdl --interpretation 1 </dev/null
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalculV0 --type toutes --enregistrer \
+		--listing $(DEMO_DIR)/carnet-tilleuls.cv0 </dev/null
+	@cat $(DEMO_DIR)/carnet-tilleuls.cv0
 
 check: deps
 	cmake -S . -B $(CHECK_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPYR_SANITIZE=ON -DPYR_WERROR=ON

@@ -157,18 +157,20 @@ void CFieldBookReader::AddComment(std::string text) {
     Result().Add(std::make_unique<CComment>(std::move(text)), kKindComment);
 }
 
-void CFieldBookReader::AddCode(std::string_view code) {
+CElement* CFieldBookReader::AddCode(std::string_view code) {
     code = Trimmed(code);
-    if (code.empty()) return;
+    if (code.empty()) return nullptr;
     if (Choices().interpret && m_table) {
         std::vector<std::string> words;
         m_table->Make_str_cmd(code, words);
         int kind = 0;
-        if (auto command = m_table->InterpreteTexte(words, kind);
-            command && Result().Add(std::move(command), kind) >= 0)
-            return;
+        if (auto command = m_table->InterpreteTexte(words, kind)) {
+            const int index = Result().Add(std::move(command), kind);
+            if (index >= 0) return Result().GetAt(index);
+        }
     }
-    Result().Add(std::make_unique<CCommande>(std::string(code)), kKindCommand);
+    const int index = Result().Add(std::make_unique<CCommande>(std::string(code)), kKindCommand);
+    return Result().GetAt(index);
 }
 
 void CFieldBookReader::SplitNameAndCode(std::string_view field, std::string& name, std::string& code) const {

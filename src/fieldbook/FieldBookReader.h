@@ -27,6 +27,7 @@
 namespace pyr {
 
 class CAppareil;
+class CElement;
 class CCarnet;
 class CMesure;
 class CParamDriver;
@@ -117,7 +118,8 @@ protected:
     // A field code: with interpretation on, split into its words and interpreted through the code table;
     // the command it stands for is appended with its kind. Otherwise, or when the table knows no such
     // code, the text is kept as it stands as an uninterpreted command (1009). An empty code adds nothing.
-    void AddCode(std::string_view code);
+    // Returns the command added, or null.
+    CElement* AddCode(std::string_view code);
     // Splits a field holding a point's name followed by its code at the code position of the table's
     // separator; without a table the whole field is the name.
     void SplitNameAndCode(std::string_view field, std::string& name, std::string& code) const;

@@ -123,7 +123,7 @@ TEST(Quendal, HandWrittenLinesAreReadOrReportedWithTheirNumber) {
 }
 
 TEST(Quendal, AFieldCodeIsInterpretedThroughTheTableOnlyWhenAsked) {
-    const std::string text = "STATION;S1;1.5\nCODE;EXR 0.15\nMESURE;12;1.3;10;100;25\nCODE;INCONNU 3\n";
+    const std::string text = "STATION;S1;1.5\nCODE;EXR 0.15;;12\nMESURE;12;1.3;10;100;25\nCODE;INCONNU 3\n";
     CTableCode table;
     ASSERT_TRUE(table.Init(DefaultCodeTable()));
     for (const bool interpret : {false, true}) {
@@ -134,6 +134,7 @@ TEST(Quendal, AFieldCodeIsInterpretedThroughTheTableOnlyWhenAsked) {
         ASSERT_EQ(read.GetSize(), 4);
         EXPECT_EQ(read.GetType(1), interpret ? kKindExcentrement : kKindCommand);
         EXPECT_EQ(read.cmdAt(1), interpret ? "ExcentRad" : "EXR 0.15");
+        EXPECT_EQ(read.matAt(1), "12"); // the point the code was written for
         if (interpret) {
             EXPECT_EQ(static_cast<const CCommande*>(read.GetAt(1))->value(), 0.15);
         }
