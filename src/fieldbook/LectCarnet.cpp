@@ -165,8 +165,8 @@ std::string CLectCarnet::ResolvedCodeTable() const {
     const std::string path(Trimmed(m_codeTable));
     if (path.empty() || FileExists(path) || std::filesystem::path(path).has_parent_path()) return path;
     // The default table is known by its name whatever its case ("DEFAUT.COD").
-    const std::string installed =
-        InstallationConfigFile(m_installDir, IsDefaultCodeTable(path) ? std::string(kDefaultCodeTable) : path);
+    const std::string installed = InstallationConfigFile(
+        m_installDir, IsDefaultCodeTable(path) ? std::string(kDefaultCodeTable) : path);
     return FileExists(installed) ? installed : path;
 }
 
