@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <cerrno>
+#include <filesystem>
 
 namespace pyr {
 
@@ -286,7 +287,15 @@ bool CParamDriver::Save() const {
 }
 
 void CParamDriver::Edit(ui::FrontEnd& frontEnd) {
-    if (!FileExists(m_file) && !Save()) return;
+    if (!FileExists(m_file)) {
+        // A new file starts as a copy of the installation's, with its explanations; else with the defaults.
+        const char* shipped = FormatInfo(m_format).parameterFile;
+        const std::string installed = shipped ? InstallationConfigFile(m_installDir, shipped) : std::string();
+        std::error_code error;
+        const bool copied = !installed.empty() && FileExists(installed) &&
+                            std::filesystem::copy_file(installed, m_file, error) && !error;
+        if (!copied && !Save()) return;
+    }
     frontEnd.ShowFile(m_file);
 }
 

@@ -115,8 +115,8 @@ public:
     std::string Validate() const;
     // Writes every key to the file (a new file gets the defaults).
     bool Save() const;
-    // The "editor" of the set: the file shown to the person, created with the defaults when it does not
-    // exist yet.
+    // The "editor" of the set: the file shown to the person. A file that does not exist yet is made as a
+    // copy of the installation's file of the format, or with the defaults when there is none.
     void Edit(ui::FrontEnd& frontEnd);
 
     // ---- Values (after Load, else the defaults)

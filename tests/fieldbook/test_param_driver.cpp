@@ -119,8 +119,8 @@ TEST(ParamDriver, TheLayoutsOfTheDelimitedAndColumnarFiles) {
     EXPECT_EQ(columns.point.back(), (FieldSpec{F::Code, 62, 0}));
 }
 
-// The "editor": the file shown, made with the defaults when it does not exist yet.
-TEST(ParamDriver, EditingANewFileWritesTheDefaultsAndShowsIt) {
+// The "editor": the file shown; a new one is a copy of the installation's, or holds the defaults.
+TEST(ParamDriver, EditingANewFileMakesItAndShowsIt) {
     TempDir dir;
     ui::ScriptedFrontEnd frontEnd;
     CParamDriver driver("", dir / "Neuf.ini", FieldBookFormat::Wild);
@@ -130,4 +130,9 @@ TEST(ParamDriver, EditingANewFileWritesTheDefaultsAndShowsIt) {
     ASSERT_TRUE(reread.Load(nullptr));
     EXPECT_EQ(reread.Text(kKeyCodesStation), "2,21");
     EXPECT_EQ(reread.Angles(), AngleUnit::Grads);
+
+    const std::string install = std::string(PYR_SOURCE_DIR) + "/data/";
+    CParamDriver copied(install, dir / "Copie.ini", FieldBookFormat::Wild);
+    copied.Edit(frontEnd);
+    EXPECT_EQ(ReadBytes(dir / "Copie.ini"), ReadBytes(Shipped("Wild.ini")));
 }
