@@ -16,14 +16,20 @@
 // operations below, which check them with the store's validation and normalise their identifiers, and it
 // reports the lines it cannot use with the Line... operations, which never stop a conversion.
 //
-//     class CLecMyFormat : public CFieldBookReader {
-//         double m_hi = kUndefined;
+//     class CLecMyFormat : public CFieldBookReader { // fixed lines "ST <name 16> <hi 8>" ...
+//         double m_hi = kUndefined;                   // a pending value
 //         void BeginReading() override { m_hi = kUndefined; }
 //         void ReadLine(std::string_view line, int number) override {
-//             if (line.starts_with("ST ")) AddStation(Field(line, 1), m_hi);
-//             else LineUnrecognised(number);
+//             CheckLength(number, line, 28);          // reported, and the line is read all the same
+//             if (!line.starts_with("ST")) return LineUnrecognised(number);
+//             if (!ParseDouble(line.substr(19), m_hi)) return LineMissing(number, "la hauteur");
+//             AddStation(std::string(Trimmed(line.substr(3, 16))), m_hi);
 //         }
 //     };
+//
+// A reader is made for its format in FieldBookReaders.cpp. Its settings come from Driver() (the format's
+// parameter file, ParamDriver.h); its angles and lengths are brought to grads and metres with
+// FieldBookUnits.h.
 namespace pyr {
 
 class CAppareil;
