@@ -11,8 +11,8 @@
 namespace pyr {
 namespace {
 
-constexpr double kMgon = 1e-4; // 0.1 mgon
-constexpr double kTenthMm = 1e-4;
+constexpr double kMgon = 1e-4;    // 0.1 mgon
+constexpr double kTenthMm = 1e-4; // 0.1 mm
 
 TEST(FaceLeft, TurnsFaceRightIncludingBothBounds) {
     const struct {
@@ -106,7 +106,7 @@ TEST(HorizontalDistance, ManualFormFromTheOptionsAutomaticFromTheHeight) {
 // over 2 km at z = 300 (cos = 0) 0.01 sqrt(25 + 8 + 4), with the terms of the computed points.
 TEST(Tolerances, TheModeOfTheOptionsChoosesTheFormulaOrTheCustomValues) {
     EXPECT_EQ(V0Tolerance(0, kV0ToleranceNormal), 0.0);
-    EXPECT_NEAR(V0Tolerance(4, kV0ToleranceNormal), 0.0043 * std::sqrt(0.75), 1e-9);
+    EXPECT_NEAR(V0Tolerance(4, kV0ToleranceNormal), 0.0043 * std::sqrt(0.75), kMgon);
     TempDir dir;
     const std::string ini = dir / "Pyralis.ini";
     const struct {
@@ -123,11 +123,11 @@ TEST(Tolerances, TheModeOfTheOptionsChoosesTheFormulaOrTheCustomValues) {
     for (const auto& c : cases) {
         WriteBytes(ini, c.file);
         const Tolerances tolerances = Tolerances::FromOptions(ini);
-        EXPECT_NEAR(tolerances.V0(2), c.v0Of2, 1e-9) << c.file;
-        EXPECT_NEAR(tolerances.Distance(250.0), c.distanceAt250, 1e-9) << c.file;
-        EXPECT_NEAR(tolerances.HeightDifference(1000.0, 50.0, kHeightTermsV0), c.heightAt1000, 1e-9)
+        EXPECT_NEAR(tolerances.V0(2), c.v0Of2, kMgon) << c.file;
+        EXPECT_NEAR(tolerances.Distance(250.0), c.distanceAt250, kTenthMm) << c.file;
+        EXPECT_NEAR(tolerances.HeightDifference(1000.0, 50.0, kHeightTermsV0), c.heightAt1000, kTenthMm)
             << c.file;
-        EXPECT_NEAR(tolerances.HeightDifference(2000.0, 300.0, kHeightTermsPoints), c.heightAt2000, 1e-9)
+        EXPECT_NEAR(tolerances.HeightDifference(2000.0, 300.0, kHeightTermsPoints), c.heightAt2000, kTenthMm)
             << c.file;
     }
 }

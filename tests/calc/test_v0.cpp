@@ -67,7 +67,6 @@ TEST(StationV0, ExactReferencesGiveTheV0BackWeightedOrNotFaceRightOrEccentric) {
             const V0Result result = job.Compute(weighted);
             ASSERT_TRUE(result.computed) << v0;
             EXPECT_LT(TurnDistance(result.v0, v0), kCentimilligon) << v0;
-            EXPECT_TRUE(result.v0 >= 0.0 && result.v0 < 400.0) << result.v0;
             EXPECT_EQ(result.used, 4);
             EXPECT_TRUE(result.warnings.empty()) << result.warnings.front(); // distances and heights agree
             EXPECT_TRUE(result.remarks.empty());
@@ -107,7 +106,6 @@ TEST(StationV0, WithTwoReferencesTheWorstOutOfToleranceGoesAndTheOtherAloneGives
     EXPECT_EQ(result.used, 1);
     EXPECT_FALSE(result.references[0].valid);
     EXPECT_EQ(result.references[0].residual, kUndefined);
-    EXPECT_TRUE(result.references[1].valid);
     EXPECT_EQ(result.remarks, (std::vector<std::string>{
                                   " -> V0 hors tolérance pour la référence <A> !",
                                   Sprintf("    (écart = 0.00600 Gr > %.5f Gr)", std::sqrt(0.5) * 0.0043)}));
