@@ -1,5 +1,7 @@
 #include "fieldbook/FieldBookReaders.h"
 
+#include "fieldbook/ConfigCol.h"
+#include "fieldbook/ConfigSep.h"
 #include "fieldbook/QuendalPivot.h"
 #include "fieldbook/QuendalReader.h"
 
@@ -7,13 +9,12 @@ namespace pyr {
 
 namespace {
 
-// The importers of the delimited and columnar layouts (CDlgConfigSep::Import, CDlgConfigCol::Import):
-// none yet.
+// The importers of the delimited and columnar layouts.
 RecordImporter DelimitedImporter() {
-    return nullptr;
+    return &CDlgConfigSep::Import;
 }
 RecordImporter ColumnarImporter() {
-    return nullptr;
+    return &CDlgConfigCol::Import;
 }
 
 std::unique_ptr<CFieldBookReader> Pivot(RecordImporter importer) {
