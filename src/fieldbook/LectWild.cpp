@@ -1,0 +1,382 @@
+#include "fieldbook/LectWild.h"
+
+#include "core/Angles.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/LectWildTexts.h"
+#include "geobase/Carnet.h"
+#include "geobase/Matricule.h"
+#include "ui/PyrTxtWnd.h"
+
+#include <cmath>
+#include <filesystem>
+
+namespace pyr {
+
+namespace {
+
+using gsi::WordText;
+namespace wild = gsi::msg;
+
+// Two instrument heights closer than half a millimetre are the same.
+constexpr double kSameHeight = 0.0005;
+// A zenith angle this close to 0 or 200 gr gives no horizontal distance to divide by.
+constexpr double kVerticalSine = 1e-9;
+constexpr double kHorizontalSighting = 100.0; // gr
+
+// A line holding the end of a transmission (ETX, EOT) or of a file (Ctrl-Z) is skipped; the start of a
+// transmission (STX) in front of a block is dropped.
+constexpr std::string_view kEndControls{"\x03\x04\x1a", 3};
+constexpr char kSTX = '\x02';
+
+bool Contains(const std::vector<std::string>& words, std::string_view word) {
+    for (const std::string& candidate : words)
+        if (EqualIgnoringCase(candidate, word)) return true;
+    return false;
+}
+
+bool IsDigits(std::string_view text) {
+    for (char c : text)
+        if (c < '0' || c > '9') return false;
+    return !text.empty();
+}
+
+// The last eight digits of a date word, "DDMMYYYY" (17) or "MMDDhhmm" (19), shown as a surveyor reads
+// them; another writing is kept as it stands.
+std::string DateText(std::string_view data, bool withTime) {
+    std::string_view digits = Trimmed(data);
+    if (digits.size() >= 8) digits = digits.substr(digits.size() - 8);
+    if (digits.size() != 8 || !IsDigits(digits)) return std::string(FormMatView(data));
+    if (withTime)
+        return Sprintf("%.2s/%.2s %.2s:%.2s", digits.data() + 2, digits.data(), digits.data() + 4,
+                       digits.data() + 6);
+    return Sprintf("%.2s/%.2s/%.4s", digits.data(), digits.data() + 2, digits.data() + 4);
+}
+
+bool IsOn(const std::string& value) {
+    return value == "1" || EqualIgnoringCase(value, "oui");
+}
+
+} // namespace
+
+// ---- Settings and state ----------------------------------------------------------------------------------
+
+void CLectWild::ReadSettings() {
+    const CParamDriver* driver = Driver();
+    if (!driver) {
+        m_units = {};
+        m_order = CoordinateOrder::EastNorth;
+        m_marking = ReferenceMarking::None;
+        m_convention = StationConvention::Auto;
+        m_referenceCodes.clear();
+        m_stationCodes = {"2", "21"};
+        m_keepComputed = false;
+        return;
+    }
+    m_units = {driver->Angles(), driver->Distances()};
+    m_order = driver->Order();
+    m_marking = driver->References();
+    m_convention = driver->Stations();
+    m_referenceCodes = driver->ReferenceCodes();
+    m_stationCodes = driver->StationCodes();
+    m_keepComputed = IsOn(driver->Text(kKeyPointsCalcules));
+}
+
+void CLectWild::BeginReading() {
+    ReadSettings();
+    m_station = nullptr;
+    m_firstSighting = false;
+    m_heightWarned = false;
+    m_reflector = kUndefined;
+    m_pendingCode.clear();
+    m_known.clear();
+    m_started = false;
+    for (std::string* last : {&m_format, &m_serial, &m_type, &m_date, &m_dateTime, &m_ppm, &m_prism})
+        last->clear();
+    m_wordWarned.reset();
+    m_unitWarned.reset();
+}
+
+// ---- A line ----------------------------------------------------------------------------------------------
+
+void CLectWild::ReadLine(std::string_view line, int number) {
+    // Blank lines (several CRs in a row), comments and the transmission's control lines are skipped.
+    std::size_t first = 0;
+    while (first < line.size() && (line[first] == ' ' || line[first] == '\t' || line[first] == kSTX))
+        ++first;
+    line.remove_prefix(first);
+    if (line.empty() || line.front() == '!') return;
+    if (line.find_first_of(kEndControls) != std::string_view::npos) return;
+
+    std::string_view bad;
+    if (!gsi::SplitBlock(line, m_block, bad)) {
+        LineUnrecognised(number);
+        if (TextWindow()) TextWindow()->Print(fb::kStringRead, std::string(bad).c_str());
+        return;
+    }
+    const gsi::Word* badWord = nullptr;
+    if (!gsi::ReadBlock(m_block, m_units, m_content, badWord)) {
+        if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(badWord->text).c_str());
+        return;
+    }
+    HeaderComments(number);
+    Warnings(number);
+    if (m_content.codeBlock)
+        ReadCodeBlock(number);
+    else
+        ReadDataBlock(number);
+}
+
+void CLectWild::Header(std::string& last, const char* label, std::string_view value) {
+    if (value.empty() || value == last) return;
+    last.assign(value);
+    AddHeaderComment(label, value);
+}
+
+void CLectWild::HeaderComments(int) {
+    const gsi::BlockContent& c = m_content;
+    if (!m_started) {
+        m_started = true;
+        if (!Path().empty())
+            AddHeaderComment(wild::kLabelFile, std::filesystem::path(Path()).filename().string());
+    }
+    Header(m_format, wild::kLabelFormat, m_block.gsi16 ? wild::kGsi16 : wild::kGsi8);
+    if (!c.serial.empty()) Header(m_serial, wild::kLabelSerial, FormMatView(c.serial));
+    if (!c.type.empty()) Header(m_type, wild::kLabelInstrument, FormMatView(c.type));
+    if (!c.date.empty()) Header(m_date, wild::kLabelDate, DateText(c.date, false));
+    // The time of each measurement is no header: only a block without observations gives one.
+    if (!c.dateTime.empty() && !c.HasObservation())
+        Header(m_dateTime, wild::kLabelDateTime, DateText(c.dateTime, true));
+    if (IsKnown(c.ppm)) Header(m_ppm, wild::kLabelPpm, FormatShortest(c.ppm) + " ppm");
+    if (IsKnown(c.ppmTotal)) Header(m_ppm, wild::kLabelPpm, FormatShortest(c.ppmTotal) + " ppm");
+    if (IsKnown(c.prismMm)) Header(m_prism, wild::kLabelPrism, FormatShortest(c.prismMm) + " mm");
+    if (IsKnown(c.prismConstantMm))
+        Header(m_prism, wild::kLabelPrism, FormatShortest(RoundToDecimals(c.prismConstantMm, 1)) + " mm");
+}
+
+void CLectWild::Warnings(int number) {
+    CPyrTxtWnd* txt = TextWindow();
+    for (std::size_t i = 0; i < m_content.unknownCount; ++i) {
+        const int index = m_content.unknown[i];
+        if (m_wordWarned[static_cast<std::size_t>(index)]) continue;
+        m_wordWarned.set(static_cast<std::size_t>(index));
+        if (txt) txt->Print(wild::kUnknownWord, number, index);
+    }
+    if (const gsi::Word* word = m_content.foreignUnit) {
+        if (m_unitWarned[static_cast<std::size_t>(word->index)]) return;
+        m_unitWarned.set(static_cast<std::size_t>(word->index));
+        if (txt) txt->Print(wild::kForeignUnit, number, word->unit, word->index);
+    }
+}
+
+// ---- Code blocks -----------------------------------------------------------------------------------------
+
+void CLectWild::ReadCodeBlock(int number) {
+    const gsi::BlockContent& c = m_content;
+    const std::string_view code = FormMatView(c.code);
+    if (m_convention != StationConvention::Words84 && Contains(m_stationCodes, code)) {
+        const gsi::Word* name = c.infos[0];
+        if (!name || WordText(*name).empty()) return LineMissing(number, wild::kDatumStation);
+        double hi = kUndefined;
+        if (const gsi::Word* height = c.infos[1]) {
+            if (gsi::ReadLength(*height, m_units.distances, hi) == gsi::Value::Bad) {
+                if (TextWindow())
+                    TextWindow()->Print(fb::kBadNumber, number, std::string(height->text).c_str());
+                return;
+            }
+        }
+        OpenStation(WordText(*name), hi, number);
+        return;
+    }
+    m_text.assign(code);
+    for (const gsi::Word* info : c.infos) {
+        if (!info) continue;
+        const std::string_view text = WordText(*info);
+        if (text.empty()) continue;
+        m_text += ' ';
+        m_text += text;
+    }
+    AddCode(m_text);
+    m_pendingCode.assign(code);
+}
+
+// ---- Measurement blocks ----------------------------------------------------------------------------------
+
+void CLectWild::ReadDataBlock(int number) {
+    if (IsKnown(m_content.reflector)) m_reflector = m_content.reflector;
+    if (m_content.HasObservation()) return ReadSighting(number);
+    if (m_content.readingCount > 0) return ReadStaff(number);
+    ReadPointOrStation(number);
+}
+
+void CLectWild::AddRemarks() {
+    m_text.clear();
+    for (std::string_view remark : m_content.remarks) {
+        const std::string_view text = remark.empty() ? remark : FormMatView(remark);
+        if (text.empty()) continue;
+        if (!m_text.empty()) m_text += ' ';
+        m_text += text;
+    }
+    AddCode(m_text);
+}
+
+void CLectWild::ReadPointOrStation(int number) {
+    const gsi::BlockContent& c = m_content;
+    const std::string_view name = FormMatView(c.point.empty() ? c.station : c.point);
+    if (m_convention != StationConvention::CodeBlock41 && c.HasStationWords()) {
+        if (name.empty()) return LineMissing(number, wild::kDatumStation);
+        AddRemarks();
+        OpenStation(name, c.instrument, number);
+        return;
+    }
+    // A known point; under the convention of code blocks, a station's coordinates make one too.
+    if (c.HasStationPosition() || c.HasTarget()) {
+        if (name.empty()) return LineMissing(number, wild::kDatumPoint);
+        AddRemarks();
+        const bool station = c.HasStationPosition();
+        if (AddPosition(name, station ? c.stationEast : c.east, station ? c.stationNorth : c.north,
+                        station ? c.stationElevation : c.elevation, true, number))
+            CheckInstrumentHeight(c.instrument, number);
+        return;
+    }
+    AddRemarks();
+    if (IsKnown(c.instrument)) return CheckInstrumentHeight(c.instrument, number);
+    // Header information, constants, a reflector height, codes, words read but unused: nothing more to
+    // do. A point id alone has nothing to make of it.
+    const bool anything = !c.serial.empty() || !c.type.empty() || !c.date.empty() || !c.dateTime.empty() ||
+                          IsKnown(c.ppm) || IsKnown(c.ppmTotal) || IsKnown(c.prismConstantMm) ||
+                          IsKnown(c.reflector) || c.HasRemarks();
+    if (!anything && !name.empty()) LineMissing(number, wild::kDatumContent);
+}
+
+void CLectWild::ReadSighting(int number) {
+    const gsi::BlockContent& c = m_content;
+    if (m_convention != StationConvention::CodeBlock41 && !c.station.empty()) {
+        const std::string_view station = FormMatView(c.station);
+        if (!m_station || station != m_station->mat()) {
+            if (!OpenStation(station, c.instrument, number)) return;
+        }
+    }
+    if (!m_station) return LineError(wild::kNoStationForSighting, number);
+    const std::string_view point = FormMatView(c.point);
+    if (point.empty()) return LineMissing(number, wild::kDatumPoint);
+    CheckInstrumentHeight(c.instrument, number);
+
+    double ah = c.hz, av = c.v, di = c.slope;
+    if (IsUndefined(di) && IsKnown(c.horizontal)) {
+        // The slope distance from the horizontal one: by the zenith angle, or with the height difference
+        // from the tilting axis to the target; alone, the sighting is taken as horizontal.
+        const double sine = IsKnown(av) ? std::fabs(SinGrads(av)) : 0.0;
+        if (sine > kVerticalSine) {
+            di = c.horizontal / sine;
+        } else if (IsUndefined(av) && IsKnown(c.heightDifference)) {
+            di = std::hypot(c.horizontal, c.heightDifference);
+            av = RadiansToGrads(std::atan2(c.horizontal, c.heightDifference));
+        } else if (IsUndefined(av)) {
+            av = kHorizontalSighting;
+            di = c.horizontal;
+        }
+    }
+    AddRemarks();
+    const bool reference = IsReference(point);
+    CVisee* sighting = reference
+                           ? static_cast<CVisee*>(AddReference(std::string(point), m_reflector, ah, av, di))
+                           : static_cast<CVisee*>(AddMesure(std::string(point), m_reflector, ah, av, di));
+    m_firstSighting = false;
+    m_pendingCode.clear();
+    if (!sighting) return LineError(wild::kRefused, number);
+    if (m_keepComputed && c.HasTarget()) AddPosition(point, c.east, c.north, c.elevation, false, number);
+}
+
+void CLectWild::ReadStaff(int number) {
+    const gsi::BlockContent& c = m_content;
+    std::string point(FormMatView(c.point));
+    if (point.empty()) return LineMissing(number, wild::kDatumPoint);
+    AddRemarks();
+    for (std::size_t i = 0; i < c.readingCount; ++i) {
+        const gsi::StaffReading& reading = c.readings[i];
+        if (reading.index == 331 || reading.index == 335)
+            Result().Add(std::make_unique<CLectAR>(point, reading.metres, c.horizontal), kKindLectAR);
+        else
+            Result().Add(std::make_unique<CLectAV>(point, reading.metres, c.horizontal), kKindLectAV);
+    }
+}
+
+// ---- Stations and points ---------------------------------------------------------------------------------
+
+bool CLectWild::OpenStation(std::string_view name, double hi, int number) {
+    const gsi::BlockContent& c = m_content;
+    if (name.empty()) {
+        LineMissing(number, wild::kDatumStation);
+        return false;
+    }
+    if (c.HasStationPosition() &&
+        !AddPosition(name, c.stationEast, c.stationNorth, c.stationElevation, true, number))
+        return false;
+    CStation* station = AddStation(std::string(name), hi);
+    if (!station) {
+        LineError(wild::kRefused, number);
+        return false;
+    }
+    m_station = station;
+    m_firstSighting = true;
+    m_heightWarned = false;
+    return true;
+}
+
+// Coordinates in the order of their words (81 82 83, or 84 85 86): the first is the easting unless the
+// settings say the northing comes first.
+bool CLectWild::AddPosition(std::string_view name, double first, double second, double elevation, bool known,
+                            int number) {
+    if (IsKnown(first) != IsKnown(second)) {
+        const bool northMissing = IsKnown(first) == (m_order == CoordinateOrder::EastNorth);
+        LineMissing(number, northMissing ? wild::kDatumNorth : wild::kDatumEast);
+        return false;
+    }
+    const bool swap = m_order == CoordinateOrder::NorthEast;
+    CPointGen* point = AddPoint(std::string(name), swap ? second : first, swap ? first : second, elevation);
+    if (!point) {
+        LineError(wild::kRefused, number);
+        return false;
+    }
+    if (known && point->hasXY()) m_known.insert(point->mat());
+    return true;
+}
+
+void CLectWild::CheckInstrumentHeight(double hi, int number) {
+    if (IsUndefined(hi)) return;
+    if (!m_station) return LineError(fb::kNoStationForHI, number);
+    if (IsUndefined(m_station->hi())) {
+        m_station->setHI(hi);
+    } else if (std::fabs(hi - m_station->hi()) > kSameHeight && !m_heightWarned) {
+        m_heightWarned = true;
+        if (TextWindow())
+            TextWindow()->Print(wild::kHeightDiffers, number, FormatFixed(hi, 3).c_str(),
+                                m_station->mat().c_str(), FormatFixed(m_station->hi(), 3).c_str());
+    }
+}
+
+// ---- References ------------------------------------------------------------------------------------------
+
+bool CLectWild::IsReferenceCode(std::string_view code) const {
+    return !code.empty() && Contains(m_referenceCodes, code);
+}
+
+bool CLectWild::IsReference(std::string_view point) const {
+    if (m_known.find(point) != m_known.end()) return true;
+    switch (m_marking) {
+    case ReferenceMarking::First:
+        return m_firstSighting;
+    case ReferenceMarking::Codes:
+        if (IsReferenceCode(m_pendingCode)) return true;
+        for (std::string_view remark : m_content.remarks)
+            if (!remark.empty() && IsReferenceCode(FormMatView(remark))) return true;
+        return false;
+    case ReferenceMarking::None:
+        break;
+    }
+    return false;
+}
+
+} // namespace pyr

@@ -1,0 +1,169 @@
+#include "fieldbook/LectWildBlock.h"
+
+namespace pyr::gsi {
+
+namespace {
+
+// Decimals of the words that are no angle and no length, without a unit digit: ppm (59) in whole
+// parts per million, the prism constant (58) in tenths of a millimetre.
+constexpr int kPpmDecimals = 0;
+constexpr int kPrismDecimals = 4; // as a length in metres: 0.1 mm
+
+constexpr double kMillimetresPerMetre = 1000.0;
+
+// Words read and known, that carry nothing a GéoBase keeps: the time's seconds (18), Hz0 - Hz (25), the
+// offsets and second readings (26 to 28), the measurement counts and deviations (52 to 57), the
+// set-out staff reading (334), the levelling differences and lengths (390s, 560 to 579).
+bool IsUnused(int index) {
+    return index == 18 || (index >= 25 && index <= 28) || (index >= 52 && index <= 57) || index == 334 ||
+           (index >= 390 && index <= 399) || (index >= 560 && index <= 579);
+}
+
+bool IsStaffReading(int index) {
+    return index >= 330 && index <= 336 && index != 334;
+}
+
+void NoteForeignUnit(const Word& word, bool angle, BlockContent& content) {
+    if (!word.unit || content.foreignUnit) return;
+    if (angle ? !IsAngleUnit(word.unit) : !IsLengthUnit(word.unit)) content.foreignUnit = &word;
+}
+
+// A value, kUndefined when the word says it has none; false when it is no number.
+bool Angle(const Word& word, const Units& units, double& grads, BlockContent& content) {
+    NoteForeignUnit(word, true, content);
+    grads = kUndefined;
+    return ReadAngle(word, units.angles, grads) != Value::Bad;
+}
+
+bool Length(const Word& word, const Units& units, double& metres, BlockContent& content) {
+    NoteForeignUnit(word, false, content);
+    metres = kUndefined;
+    return ReadLength(word, units.distances, metres) != Value::Bad;
+}
+
+bool Scaled(const Word& word, int decimals, double& value) {
+    value = kUndefined;
+    return ReadScaled(word, decimals, value) != Value::Bad;
+}
+
+bool ReadWord(const Word& word, const Units& units, BlockContent& c) {
+    const int index = word.index;
+    switch (index) {
+    case 11:
+        c.point = word.data;
+        return true;
+    case 12:
+        c.serial = word.data;
+        return true;
+    case 13:
+        c.type = word.data;
+        return true;
+    case 16:
+        c.station = word.data;
+        return true;
+    case 17:
+        c.date = word.data;
+        return true;
+    case 19:
+        c.dateTime = word.data;
+        return true;
+    case 21:
+        return Angle(word, units, c.hz, c);
+    case 22:
+        return Angle(word, units, c.v, c);
+    case 31:
+        return Length(word, units, c.slope, c);
+    case 32:
+        return Length(word, units, c.horizontal, c);
+    case 33:
+        return Length(word, units, c.heightDifference, c);
+    case 41:
+        c.codeBlock = true;
+        c.code = word.data;
+        return true;
+    case 51: {
+        double ppm = kUndefined, prism = kUndefined;
+        const Value value = ReadPpmAndPrism(word, ppm, prism);
+        if (value == Value::Read) {
+            c.ppm = ppm;
+            c.prismMm = prism;
+        }
+        return value != Value::Bad;
+    }
+    case 58: {
+        double metres = kUndefined;
+        if (!Scaled(word, kPrismDecimals, metres)) return false;
+        c.prismConstantMm = IsKnown(metres) ? metres * kMillimetresPerMetre : kUndefined;
+        return true;
+    }
+    case 59:
+        return Scaled(word, kPpmDecimals, c.ppmTotal);
+    case 81:
+        return Length(word, units, c.east, c);
+    case 82:
+        return Length(word, units, c.north, c);
+    case 83:
+        return Length(word, units, c.elevation, c);
+    case 84:
+        return Length(word, units, c.stationEast, c);
+    case 85:
+        return Length(word, units, c.stationNorth, c);
+    case 86:
+        return Length(word, units, c.stationElevation, c);
+    case 87:
+        return Length(word, units, c.reflector, c);
+    case 88:
+        return Length(word, units, c.instrument, c);
+    default:
+        break;
+    }
+    if (index >= 42 && index <= 49) {
+        c.infos[static_cast<std::size_t>(index - 42)] = &word;
+    } else if (index >= 71 && index <= 79) {
+        c.remarks[static_cast<std::size_t>(index - 71)] = word.data;
+    } else if (IsStaffReading(index)) {
+        double metres = kUndefined;
+        if (!Length(word, units, metres, c)) return false;
+        if (IsKnown(metres) && c.readingCount < kMaxNoted) c.readings[c.readingCount++] = {index, metres};
+    } else if (!IsUnused(index) && c.unknownCount < kMaxNoted) {
+        c.unknown[c.unknownCount++] = index;
+    }
+    return true;
+}
+
+} // namespace
+
+bool BlockContent::HasObservation() const {
+    return IsKnown(hz) || IsKnown(v) || IsKnown(slope) || IsKnown(horizontal) || IsKnown(heightDifference);
+}
+
+bool BlockContent::HasTarget() const {
+    return IsKnown(east) || IsKnown(north) || IsKnown(elevation);
+}
+
+bool BlockContent::HasStationPosition() const {
+    return IsKnown(stationEast) || IsKnown(stationNorth) || IsKnown(stationElevation);
+}
+
+bool BlockContent::HasStationWords() const {
+    return HasStationPosition() || IsKnown(instrument);
+}
+
+bool BlockContent::HasRemarks() const {
+    for (std::string_view remark : remarks)
+        if (!remark.empty()) return true;
+    return false;
+}
+
+bool ReadBlock(const Block& block, const Units& units, BlockContent& content, const Word*& bad) {
+    content = BlockContent{};
+    for (const Word& word : block) {
+        if (!ReadWord(word, units, content)) {
+            bad = &word;
+            return false;
+        }
+    }
+    return true;
+}
+
+} // namespace pyr::gsi

@@ -1,0 +1,198 @@
+#include "fieldbook/LectWildValues.h"
+
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/Matricule.h"
+
+namespace pyr::gsi {
+
+namespace {
+
+// Digits of a GSI word: 16 at most, so that 18 always fit in a long long.
+constexpr std::size_t kMaxDigits = 18;
+
+constexpr double kPowersOfTen[] = {1.0, 1e1, 1e2, 1e3, 1e4, 1e5, 1e6, 1e7, 1e8, 1e9};
+// 1 foot = 0.3048 m: a length in feet with n decimals is N × 3048 / 10^(n + 4) metres.
+constexpr double kTenThousandthsOfMetrePerFoot = 3048.0;
+
+char AngleDigit(AngleUnit unit) {
+    switch (unit) {
+    case AngleUnit::Grads:
+        return '2';
+    case AngleUnit::Degrees:
+        return '3';
+    case AngleUnit::Dms:
+        return '4';
+    case AngleUnit::Mils:
+        return '5';
+    }
+    return '2';
+}
+
+char LengthDigit(DistanceUnit unit) {
+    return unit == DistanceUnit::Feet ? '1' : '0';
+}
+
+AngleUnit AngleUnitOf(char digit) {
+    switch (digit) {
+    case '3':
+        return AngleUnit::Degrees;
+    case '4':
+        return AngleUnit::Dms;
+    case '5':
+        return AngleUnit::Mils;
+    default:
+        return AngleUnit::Grads;
+    }
+}
+
+int LengthDecimals(char digit) {
+    switch (digit) {
+    case '6':
+    case '7':
+        return 4;
+    case '8':
+        return 5;
+    default:
+        return 3;
+    }
+}
+
+bool IsFeet(char digit) {
+    return digit == '1' || digit == '7';
+}
+
+// The data without its blanks: Missing when nothing or dashes remain; `point` tells whether it is
+// written with a decimal point, otherwise `digits` holds its value as a whole number.
+Value Digits(std::string_view data, std::string_view& text, bool& point, long long& digits) {
+    text = Trimmed(data);
+    point = false;
+    digits = 0;
+    if (text.empty() || text.find('-') != std::string_view::npos) return Value::Missing;
+    if (text.find('.') != std::string_view::npos) {
+        point = true;
+        double check = 0.0;
+        return ParseDouble(text, check) && text.front() != '+' ? Value::Read : Value::Bad;
+    }
+    if (text.size() > kMaxDigits) return Value::Bad;
+    for (char c : text) {
+        if (c < '0' || c > '9') return Value::Bad;
+        digits = digits * 10 + (c - '0');
+    }
+    return Value::Read;
+}
+
+double Signed(const Word& word, double value) {
+    return word.sign == '-' ? -value : value;
+}
+
+} // namespace
+
+bool IsAngleUnit(char unit) {
+    return unit >= '2' && unit <= '5';
+}
+
+bool IsLengthUnit(char unit) {
+    return unit == '0' || unit == '1' || (unit >= '6' && unit <= '8');
+}
+
+Value ReadAngle(const Word& word, AngleUnit fallback, double& grads) {
+    const char unit = IsAngleUnit(word.unit) ? word.unit : AngleDigit(fallback);
+    std::string_view text;
+    bool point = false;
+    long long n = 0;
+    const Value status = Digits(word.data, text, point, n);
+    if (status != Value::Read) return status;
+    if (point) {
+        double value = 0.0;
+        if (unit == '4') {
+            if (!DmsTextToDegrees(text, value)) return Value::Bad;
+            value = ToGrads(value, AngleUnit::Degrees);
+        } else {
+            ParseDouble(text, value);
+            value = ToGrads(value, AngleUnitOf(unit));
+        }
+        grads = Signed(word, value);
+        return Value::Read;
+    }
+    double value = 0.0;
+    switch (unit) {
+    case '3': // 1e-5 degree = 1 / 90 000 grad
+        value = static_cast<double>(n) / 90000.0;
+        break;
+    case '4': { // DDD.MMSSs: tenths of a second, 32 400 to the grad
+        const long long tenths = n % 1000;
+        const long long minutes = n / 1000 % 100;
+        if (minutes >= 60 || tenths >= 600) return Value::Bad;
+        const long long total = ((n / 100000) * 60 + minutes) * 600 + tenths;
+        value = static_cast<double>(total) / 32400.0;
+        break;
+    }
+    case '5': // 1e-4 mil = 1 / 160 000 grad
+        value = static_cast<double>(n) / 160000.0;
+        break;
+    default: // 1e-5 grad
+        value = static_cast<double>(n) / 1e5;
+        break;
+    }
+    grads = Signed(word, value);
+    return Value::Read;
+}
+
+Value ReadLength(const Word& word, DistanceUnit fallback, double& metres) {
+    const char unit = IsLengthUnit(word.unit) ? word.unit : LengthDigit(fallback);
+    std::string_view text;
+    bool point = false;
+    long long n = 0;
+    const Value status = Digits(word.data, text, point, n);
+    if (status != Value::Read) return status;
+    if (point) {
+        double value = 0.0;
+        ParseDouble(text, value);
+        metres = Signed(word, IsFeet(unit) ? value * kMetresPerFoot : value);
+        return Value::Read;
+    }
+    const int decimals = LengthDecimals(unit);
+    const double value =
+        IsFeet(unit) ? static_cast<double>(n) * kTenThousandthsOfMetrePerFoot / kPowersOfTen[decimals + 4]
+                     : static_cast<double>(n) / kPowersOfTen[decimals];
+    metres = Signed(word, value);
+    return Value::Read;
+}
+
+Value ReadScaled(const Word& word, int decimals, double& value) {
+    std::string_view text;
+    bool point = false;
+    long long n = 0;
+    const Value status = Digits(word.data, text, point, n);
+    if (status != Value::Read) return status;
+    if (point) {
+        ParseDouble(text, value);
+    } else {
+        if (IsLengthUnit(word.unit)) decimals = LengthDecimals(word.unit);
+        value = static_cast<double>(n) / kPowersOfTen[decimals];
+    }
+    value = Signed(word, value);
+    return Value::Read;
+}
+
+Value ReadPpmAndPrism(const Word& word, double& ppm, double& prismMm) {
+    const std::string_view text = Trimmed(word.data);
+    std::size_t split = 1;
+    while (split < text.size() && text[split] != '+' && text[split] != '-')
+        ++split;
+    if (split >= text.size()) return text.find('-') == std::string_view::npos ? Value::Bad : Value::Missing;
+    long long ppmDigits = 0, prismDigits = 0;
+    if (!ParseInt(text.substr(0, split), ppmDigits) || text[0] == '+' || text[0] == '-' ||
+        !ParseInt(text.substr(split + 1), prismDigits) || text[split + 1] == '+' || text[split + 1] == '-')
+        return text.find("--") == std::string_view::npos ? Value::Bad : Value::Missing;
+    ppm = Signed(word, static_cast<double>(ppmDigits));
+    prismMm = static_cast<double>(text[split] == '-' ? -prismDigits : prismDigits);
+    return Value::Read;
+}
+
+std::string_view WordText(const Word& word) {
+    return FormMatView(word.data);
+}
+
+} // namespace pyr::gsi
