@@ -294,6 +294,7 @@ TEST_F(Conversion, AZeroPrismHeightIsToldWhenTheFormatTestsIt) {
 
 TEST_F(Conversion, AFormatWithoutItsReaderYetSaysSo) {
     auto converter = Make(FieldBookFormat::Sokkia);
+    converter->makeReader = [] { return nullptr; }; // a format whose reader is not built yet
     EXPECT_EQ(RunConversion(*converter, nullptr), DialogResult::Failed);
     ASSERT_EQ(frontEnd.messages.size(), 1u);
     EXPECT_EQ(frontEnd.messages[0].text, "La lecture des carnets Sokkia n'est pas encore disponible dans "

@@ -1,5 +1,7 @@
 // The reading commands and the editor's reading, run as a person or a script runs pyralis.
 #include "HostTestSupport.h"
+#include "fieldbook/FieldBookReader.h"
+#include "fieldbook/FieldBookReaders.h"
 
 #include <filesystem>
 #include <gtest/gtest.h>
@@ -70,9 +72,15 @@ TEST_F(ReadingCommands, LQuendaConvertsTheFieldBookNamedIntoANewGeoBase) {
 }
 
 TEST_F(ReadingCommands, AReaderNotBuiltYetSaysSoAndTheHelpNamesTheFieldBook) {
-    const Outcome wild = Run("LecWild carnet.gsi");
-    EXPECT_EQ(wild.status, 1);
-    EXPECT_TRUE(Has(wild.err, "La lecture des carnets Wild n'est pas encore disponible")) << wild.err;
+    for (const auto& info : pyr::FieldBookFormats()) {
+        if (pyr::MakeFieldBookReader(info.format)) continue;
+        const Outcome missing = Run(std::string(info.command) + " carnet.txt");
+        EXPECT_EQ(missing.status, 1) << info.command;
+        EXPECT_TRUE(Has(missing.err,
+                        std::string("La lecture des carnets ") + info.name + " n'est pas encore disponible"))
+            << missing.err;
+        break;
+    }
     const Outcome help = Run("PyraLQuenda --help");
     EXPECT_EQ(help.status, 0);
     EXPECT_TRUE(Has(help.out, "Usage : pyralis PyraLQuenda [CARNET] [options]")) << help.out;
