@@ -401,6 +401,19 @@ int CCarnet::CountStations() const {
     return static_cast<int>(Index().WithKind(kKindStation).size());
 }
 
+bool CCarnet::HasStation() const {
+    if (GetType(m_stationSeen) == kKindStation) return true;
+    const auto from =
+        m_kinds.begin() + static_cast<std::ptrdiff_t>(std::min(m_noStationBefore, m_kinds.size()));
+    const auto found = std::find(from, m_kinds.end(), kKindStation);
+    if (found == m_kinds.end()) {
+        m_noStationBefore = m_kinds.size();
+        return false;
+    }
+    m_stationSeen = static_cast<int>(found - m_kinds.begin());
+    return true;
+}
+
 const CAppareil* CCarnet::findAppAt(int index) const {
     if (!IsValidIndex(index)) return nullptr;
     const std::vector<int>& instruments = Index().WithKind(kKindAppareil);

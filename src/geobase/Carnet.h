@@ -111,6 +111,9 @@ public:
     // it), with the station's name; -1 when none.
     int findRepAt(int index, std::string& name) const;
     int CountStations() const;
+    // Whether the store holds a station, without indexing it: a reader appending a million sightings
+    // asks it for each of them.
+    bool HasStation() const;
 
     // The instrument in force at an index (the nearest one before it), or null: the caller then uses
     // the default instrument of its options.
@@ -198,7 +201,10 @@ public:
 
 private:
     const CarnetIndex& Index() const;
-    void Changed() { m_index.Invalidate(); }
+    void Changed() {
+        m_index.Invalidate();
+        m_noStationBefore = 0;
+    }
     // Appends without checking the kind: for elements built here for their kind.
     void AddChecked(std::unique_ptr<CElement> element, int kind);
     void Keep(CPyrTxtWnd* txt, std::unique_ptr<CElement> element, int kind, bool report);
@@ -207,6 +213,10 @@ private:
     std::vector<std::unique_ptr<CElement>> m_elements;
     std::vector<int> m_kinds;
     mutable CarnetIndex m_index;
+    // HasStation's memory: a station found there (checked again before it is believed), and the
+    // elements before m_noStationBefore hold none (forgotten at every change but an append).
+    mutable int m_stationSeen = -1;
+    mutable std::size_t m_noStationBefore = 0;
     std::string m_path;
     std::string m_configuration;
 

@@ -108,14 +108,14 @@ CStation* CCarnet::validStation(CPyrTxtWnd* txt, std::unique_ptr<CStation> stati
 }
 
 CReference* CCarnet::validReference(CPyrTxtWnd* txt, std::unique_ptr<CReference> sighting, bool report) {
-    if (!sighting || !CheckSighting(txt, *sighting, CountStations() > 0)) return nullptr;
+    if (!sighting || !CheckSighting(txt, *sighting, HasStation())) return nullptr;
     CReference* kept = sighting.get();
     Keep(txt, std::move(sighting), kKindReference, report);
     return kept;
 }
 
 CMesure* CCarnet::validMesure(CPyrTxtWnd* txt, std::unique_ptr<CMesure> sighting, bool report) {
-    if (!sighting || !CheckSighting(txt, *sighting, CountStations() > 0)) return nullptr;
+    if (!sighting || !CheckSighting(txt, *sighting, HasStation())) return nullptr;
     CMesure* kept = sighting.get();
     Keep(txt, std::move(sighting), kKindMesure, report);
     return kept;

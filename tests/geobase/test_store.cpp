@@ -149,6 +149,24 @@ TEST(Store, TheIndexFollowsAppendsRemovalsAndRenaming) {
     EXPECT_EQ(c.matAt(1), "A1");
 }
 
+TEST(Store, WhetherAStationIsThereFollowsEveryChange) {
+    CCarnet c;
+    c.Add(std::make_unique<CPointGen>("A1", 1.0, 2.0), kKindPoint);
+    EXPECT_FALSE(c.HasStation());
+    c.Add(std::make_unique<CStation>("S1", 1.5), kKindStation);
+    EXPECT_TRUE(c.HasStation()); // appended after a search that found none
+    c.removeElement(1);
+    EXPECT_FALSE(c.HasStation());
+    c.Add(std::make_unique<CPointGen>("A2", 1.0, 2.0), kKindPoint);
+    c.InsertAt(0, std::make_unique<CStation>("S2", 1.5), kKindStation);
+    EXPECT_TRUE(c.HasStation()); // inserted before the part already searched
+    c.removeElement(0);
+    c.InsertAt(1, std::make_unique<CStation>("S3", 1.5), kKindStation); // where the last one was seen
+    EXPECT_TRUE(c.HasStation());
+    c.RemoveAll();
+    EXPECT_FALSE(c.HasStation());
+}
+
 TEST(Store, InstrumentsAndEccentricOffsetsApplyToWhatFollowsThem) {
     CCarnet c;
     c.Add(std::make_unique<CCommande>("ExcentVer", "0.12"), kKindExcentrement);     // 0
