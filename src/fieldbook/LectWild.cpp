@@ -205,8 +205,9 @@ void CLectWild::ReadCodeBlock(int number) {
 
 void CLectWild::ReadDataBlock(int number) {
     if (IsKnown(m_content.reflector)) m_reflector = m_content.reflector;
-    if (m_content.HasObservation()) return ReadSighting(number);
+    // A staff reading goes with its distance (32), which is no sighting.
     if (m_content.readingCount > 0) return ReadStaff(number);
+    if (m_content.HasObservation()) return ReadSighting(number);
     ReadPointOrStation(number);
 }
 
@@ -258,7 +259,10 @@ void CLectWild::ReadSighting(int number) {
             if (!OpenStation(station, c.instrument, number)) return;
         }
     }
-    if (!m_station) return LineError(wild::kNoStationForSighting, number);
+    if (!m_station) {
+        if (!OpenStation(wild::kUnknownStation, c.instrument, number)) return;
+        if (TextWindow()) TextWindow()->Print(wild::kUnknownStationOpened, number, wild::kUnknownStation);
+    }
     const std::string_view point = FormMatView(c.point);
     if (point.empty()) return LineMissing(number, wild::kDatumPoint);
     CheckInstrumentHeight(c.instrument, number);

@@ -12,7 +12,6 @@ inline constexpr const char* kDatumEast = "la coordonnée Est";
 inline constexpr const char* kDatumNorth = "la coordonnée Nord";
 
 // ---- Lines skipped
-inline constexpr const char* kNoStationForSighting = "Erreur ligne %d : pas de station pour cette visée !";
 inline constexpr const char* kRefused = "Erreur ligne %d : donnée refusée par les contrôles de la GéoBase !";
 
 // ---- Lines read, with something to say (each said once a field book)
@@ -23,6 +22,12 @@ inline constexpr const char* kForeignUnit =
 inline constexpr const char* kHeightDiffers =
     "Attention : ligne %d : hauteur d'instrument %s différente de celle de la station <%s> (%s), "
     "celle de la station est gardée.";
+
+// A field book that starts measuring without saying where the instrument stands (the polar output of
+// many instruments): its first sightings go to a station of this name, which the surveyor renames.
+inline constexpr const char* kUnknownStation = "INCONNUE";
+inline constexpr const char* kUnknownStationOpened =
+    "Attention : ligne %d : visées sans station, rattachées à la station <%s> (à renommer).";
 
 // ---- Labels of the header comments
 inline constexpr const char* kLabelFile = "Fichier";
