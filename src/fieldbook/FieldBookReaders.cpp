@@ -2,6 +2,7 @@
 
 #include "fieldbook/ConfigCol.h"
 #include "fieldbook/ConfigSep.h"
+#include "fieldbook/LectWild.h"
 #include "fieldbook/QuendalPivot.h"
 #include "fieldbook/QuendalReader.h"
 
@@ -28,6 +29,8 @@ std::unique_ptr<CFieldBookReader> MakeFieldBookReader(FieldBookFormat format) {
     switch (format) {
     case FieldBookFormat::Quendal:
         return std::make_unique<CQuendalReader>();
+    case FieldBookFormat::Wild:
+        return std::make_unique<CLectWild>();
     case FieldBookFormat::Separateur:
         return Pivot(DelimitedImporter());
     case FieldBookFormat::Colonne:
