@@ -48,8 +48,8 @@ std::size_t CDelimitedFields::ReadField(std::size_t position) {
         ++first;
     std::size_t separator;
     if (first < m_line.size() && m_line[first] == kQuote) {
-        // The quoted text as it stands, blanks included; what follows the closing quote up to the separator
-        // is kept after it. The scratch never grows past the line's length: the views into it stay valid.
+        // The quoted text, then what follows the closing quote up to the separator. The scratch never grows
+        // past the line's length: the views into it stay valid.
         const std::size_t start = m_scratch.size();
         std::size_t i = first + 1;
         while (i < m_line.size()) {
@@ -67,7 +67,7 @@ std::size_t CDelimitedFields::ReadField(std::size_t position) {
         separator = FindSeparator(i);
         const std::string_view tail = Trimmed(m_line.substr(i, std::min(separator, m_line.size()) - i));
         m_scratch += tail;
-        m_fields.push_back({std::string_view(m_scratch).substr(start), position});
+        m_fields.push_back({Trimmed(std::string_view(m_scratch).substr(start)), position});
     } else {
         separator = FindSeparator(position);
         const std::size_t end = std::min(separator, m_line.size());

@@ -11,7 +11,8 @@ namespace pyr {
 // The fields of a line of a delimited field book. Fields are separated by the separator text of the
 // layout; a separator of blanks ("ESPACE") takes any run of blanks and tabs, so that columns aligned with
 // blanks read as fields. A field may be written in double quotes, as spreadsheets do when a text holds the
-// separator: the quotes are dropped and a doubled quote inside stands for one.
+// separator: the quotes are dropped and a doubled quote inside stands for one. Blanks around a field, in
+// quotes or not, do not count.
 class CDelimitedFields : public CRecordFields {
 public:
     explicit CDelimitedFields(std::string separator);
@@ -25,7 +26,7 @@ public:
 
 private:
     struct Piece {
-        std::string_view text; // trimmed, unquoted
+        std::string_view text; // unquoted, trimmed
         std::size_t start;     // where the field starts in the line
     };
     // Reads the field from `position`; returns where the next one starts, or npos after the last.

@@ -47,9 +47,9 @@ TEST(DelimitedFields, ALineIsCutAtItsSeparator) {
     const Case cases[] = {
         // Empty fields are fields; blanks around a field do not count.
         {";", "PT;P1;;10.5; 20 ;", {"PT", "P1", "", "10.5", "20", ""}},
-        // A quoted field holds the separator, keeps its blanks, and a doubled quote stands for one.
+        // A quoted field holds the separator, and a doubled quote stands for one.
         {";", R"(CO;"Texte ; avec ""guillemets""";x)", {"CO", R"(Texte ; avec "guillemets")", "x"}},
-        {";", R"(PT; " P1 " ;1)", {"PT", " P1 ", "1"}},
+        {";", R"(PT; " P1 " ;1)", {"PT", "P1", "1"}},
         // A quote never closed runs to the end of the line.
         {";", R"(PT;"non fermé;1)", {"PT", "non fermé;1"}},
         // Blanks: any run of spaces and tabs, those at both ends of the line making no field.
