@@ -35,16 +35,4 @@ std::string_view CColumnarFields::After(const FieldSpec& spec, std::size_t) cons
     return Trimmed(m_line.substr(Offset(spec.last)));
 }
 
-bool CDlgConfigCol::Import(const CParamDriver& layout, const std::string& carnet, CCarnet& records,
-                           CPyrTxtWnd* txt, ui::FrontEnd* parent) {
-    CColumnarFields fields;
-    return ImportRecordFile(layout, carnet, fields, records, txt, parent);
-}
-
-void CDlgConfigCol::ImportText(const CParamDriver& layout, std::string_view text, CCarnet& records,
-                               CPyrTxtWnd* txt) {
-    CColumnarFields fields;
-    ImportRecords(layout, text, fields, records, txt);
-}
-
 } // namespace pyr

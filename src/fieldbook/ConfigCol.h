@@ -12,6 +12,8 @@ namespace pyr {
 // field leaves it empty; a field "to the end of the line" takes all that follows.
 class CColumnarFields : public CRecordFields {
 public:
+    CColumnarFields() = default;
+    explicit CColumnarFields(const RecordLayout&) {} // every field carries its columns
     void Split(std::string_view line) override;
     std::string_view Field(const FieldSpec& spec, std::size_t index) const override;
     std::string_view After(const FieldSpec& spec, std::size_t index) const override;
@@ -27,15 +29,6 @@ private:
 
 // The configuration of columnar field books ("Colonné", "*.col"), whose layout the section "Parametrage"
 // of the parameter file describes (docs/format-separateur-colonne.md).
-class CDlgConfigCol {
-public:
-    // Reads the field book `carnet` by its layout into `records`, as CDlgConfigSep::Import does for
-    // delimited files. False when the file cannot be read (the message shown on `parent`).
-    static bool Import(const CParamDriver& layout, const std::string& carnet, CCarnet& records,
-                       CPyrTxtWnd* txt, ui::FrontEnd* parent);
-    // The same from the text of a field book (UTF-8).
-    static void ImportText(const CParamDriver& layout, std::string_view text, CCarnet& records,
-                           CPyrTxtWnd* txt);
-};
+class CDlgConfigCol : public CLayoutImport<CColumnarFields> {};
 
 } // namespace pyr

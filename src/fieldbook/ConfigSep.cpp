@@ -100,16 +100,4 @@ std::size_t CDelimitedFields::Extra(std::size_t count) const {
     return 0;
 }
 
-bool CDlgConfigSep::Import(const CParamDriver& layout, const std::string& carnet, CCarnet& records,
-                           CPyrTxtWnd* txt, ui::FrontEnd* parent) {
-    CDelimitedFields fields(layout.Layout().separator);
-    return ImportRecordFile(layout, carnet, fields, records, txt, parent);
-}
-
-void CDlgConfigSep::ImportText(const CParamDriver& layout, std::string_view text, CCarnet& records,
-                               CPyrTxtWnd* txt) {
-    CDelimitedFields fields(layout.Layout().separator);
-    ImportRecords(layout, text, fields, records, txt);
-}
-
 } // namespace pyr

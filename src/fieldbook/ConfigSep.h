@@ -16,6 +16,7 @@ namespace pyr {
 class CDelimitedFields : public CRecordFields {
 public:
     explicit CDelimitedFields(std::string separator);
+    explicit CDelimitedFields(const RecordLayout& layout) : CDelimitedFields(layout.separator) {}
 
     void Split(std::string_view line) override;
     std::string_view Field(const FieldSpec& spec, std::size_t index) const override;
@@ -42,17 +43,6 @@ private:
 
 // The configuration of delimited field books ("Séparateur", "*.sep"), whose layout the section
 // "Parametrage" of the parameter file describes (docs/format-separateur-colonne.md).
-class CDlgConfigSep {
-public:
-    // Reads the field book `carnet` by its layout into `records`: stations, sightings, points, field
-    // codes (kind 1009) and comments as the file holds them, unchecked, angles in grads, lengths in
-    // metres, values not given left undefined. Lines that cannot be used are reported in `txt` with their
-    // number and skipped. False when the file cannot be read (the message shown on `parent`).
-    static bool Import(const CParamDriver& layout, const std::string& carnet, CCarnet& records,
-                       CPyrTxtWnd* txt, ui::FrontEnd* parent);
-    // The same from the text of a field book (UTF-8).
-    static void ImportText(const CParamDriver& layout, std::string_view text, CCarnet& records,
-                           CPyrTxtWnd* txt);
-};
+class CDlgConfigSep : public CLayoutImport<CDelimitedFields> {};
 
 } // namespace pyr

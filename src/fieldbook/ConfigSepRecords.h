@@ -65,4 +65,25 @@ void ImportRecords(const CParamDriver& layout, std::string_view text, CRecordFie
 bool ImportRecordFile(const CParamDriver& layout, const std::string& carnet, CRecordFields& fields,
                       CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent);
 
+// The import of a layout whose lines `Fields` cuts (made from the layout): CDlgConfigSep, CDlgConfigCol.
+template <class Fields>
+class CLayoutImport {
+public:
+    // Reads the field book `carnet` by its layout into `records`: stations, sightings, points, field
+    // codes (kind 1009) and comments as the file holds them, unchecked, angles in grads, lengths in
+    // metres, values not given left undefined. Lines that cannot be used are reported in `txt` with their
+    // number and skipped. False when the file cannot be read (the message shown on `parent`).
+    static bool Import(const CParamDriver& layout, const std::string& carnet, CCarnet& records,
+                       CPyrTxtWnd* txt, ui::FrontEnd* parent) {
+        Fields fields(layout.Layout());
+        return ImportRecordFile(layout, carnet, fields, records, txt, parent);
+    }
+    // The same from the text of a field book (UTF-8).
+    static void ImportText(const CParamDriver& layout, std::string_view text, CCarnet& records,
+                           CPyrTxtWnd* txt) {
+        Fields fields(layout.Layout());
+        ImportRecords(layout, text, fields, records, txt);
+    }
+};
+
 } // namespace pyr

@@ -1,27 +1,13 @@
 // Columnar field books: fields taken at their columns, counted in characters whatever the file's encoding,
 // and the records read by the layout of their settings.
-#include "FieldBookTestSupport.h"
 #include "fieldbook/ConfigCol.h"
-#include "fieldbook/ParamDriver.h"
-
-#include <gtest/gtest.h>
+#include "test_config_sep_support.h"
 
 using namespace pyr;
 
 namespace {
 
-class Columnar : public ::testing::Test {
-protected:
-    CCarnet& Import(std::string_view text) {
-        CDlgConfigCol::ImportText(layout, text, records, &txt);
-        return records;
-    }
-
-    CParamDriver layout{"", "", FieldBookFormat::Colonne};
-    ui::ScriptedFrontEnd frontEnd;
-    CPyrTxtWnd txt{frontEnd};
-    CCarnet records;
-};
+using Columnar = LayoutImportTest<CDlgConfigCol, FieldBookFormat::Colonne>;
 
 } // namespace
 
@@ -122,10 +108,7 @@ TEST_F(Columnar, AWindows1252FieldBookKeepsItsColumns) {
 
 // Without a TYPE column, every line is a point.
 TEST_F(Columnar, WithoutATypeColumnEveryLineIsAPoint) {
-    layout.SetText(kKeyChampsStation, "");
-    layout.SetText(kKeyChampsVisee, "");
-    layout.SetText(kKeyChampsPoint, "MATRICULE:1-8,X:9-20,Y:21-32");
-    ASSERT_EQ(layout.Validate(), "");
+    PointsOnly("MATRICULE:1-8,X:9-20,Y:21-32");
     Import("1001      652110.21  6861845.64\n"
            "\n"
            "1002\n");

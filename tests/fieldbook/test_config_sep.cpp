@@ -1,10 +1,7 @@
 // Delimited field books: how a line is cut into fields, how each record is recognised and read by the
 // layout of its settings, and what is reported of the lines that cannot be used.
-#include "FieldBookTestSupport.h"
 #include "fieldbook/ConfigSep.h"
-#include "fieldbook/ParamDriver.h"
-
-#include <gtest/gtest.h>
+#include "test_config_sep_support.h"
 
 using namespace pyr;
 
@@ -23,18 +20,7 @@ std::vector<std::string> Fields(const char* separator, std::string_view line) {
     return texts;
 }
 
-class Delimited : public ::testing::Test {
-protected:
-    CCarnet& Import(std::string_view text) {
-        CDlgConfigSep::ImportText(layout, text, records, &txt);
-        return records;
-    }
-
-    CParamDriver layout{"", "", FieldBookFormat::Separateur};
-    ui::ScriptedFrontEnd frontEnd;
-    CPyrTxtWnd txt{frontEnd};
-    CCarnet records;
-};
+using Delimited = LayoutImportTest<CDlgConfigSep, FieldBookFormat::Separateur>;
 
 } // namespace
 
@@ -234,10 +220,7 @@ TEST_F(Delimited, TheSeparatorsAndTheHeaderLinesOfTheLayout) {
 // Without a TYPE field, the field book is a list of points: "matricule X Y Z" aligned with blanks.
 TEST_F(Delimited, WithoutATypeFieldEveryLineIsAPoint) {
     layout.SetText(kKeySeparateur, "ESPACE");
-    layout.SetText(kKeyChampsStation, "");
-    layout.SetText(kKeyChampsVisee, "");
-    layout.SetText(kKeyChampsPoint, "MATRICULE,X,Y,Z,CODE");
-    ASSERT_EQ(layout.Validate(), "");
+    PointsOnly("MATRICULE,X,Y,Z,CODE");
     Import("  1001   652110.214  6861845.637   61.208  BORNE\n"
            "  1002   652215.480  6861830.215\n"
            "ST S1 1.5\n");
