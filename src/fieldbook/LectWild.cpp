@@ -10,6 +10,7 @@
 #include "ui/PyrTxtWnd.h"
 
 #include <cmath>
+#include <cstring>
 #include <filesystem>
 
 namespace pyr {
@@ -107,7 +108,8 @@ void CLectWild::ReadLine(std::string_view line, int number) {
         ++first;
     line.remove_prefix(first);
     if (line.empty() || line.front() == '!') return;
-    if (line.find_first_of(kEndControls) != std::string_view::npos) return;
+    for (char control : kEndControls)
+        if (std::memchr(line.data(), control, line.size())) return;
 
     std::string_view bad;
     if (!gsi::SplitBlock(line, m_block, bad)) {
@@ -176,10 +178,10 @@ void CLectWild::ReadCodeBlock(int number) {
     const gsi::BlockContent& c = m_content;
     const std::string_view code = FormMatView(c.code);
     if (m_convention != StationConvention::Words84 && Contains(m_stationCodes, code)) {
-        const gsi::Word* name = c.infos[0];
+        const gsi::Word* name = c.Info(42);
         if (!name || WordText(*name).empty()) return LineMissing(number, wild::kDatumStation);
         double hi = kUndefined;
-        if (const gsi::Word* height = c.infos[1]) {
+        if (const gsi::Word* height = c.Info(43)) {
             if (gsi::ReadLength(*height, m_units.distances, hi) == gsi::Value::Bad) {
                 if (TextWindow())
                     TextWindow()->Print(fb::kBadNumber, number, std::string(height->text).c_str());
@@ -190,9 +192,8 @@ void CLectWild::ReadCodeBlock(int number) {
         return;
     }
     m_text.assign(code);
-    for (const gsi::Word* info : c.infos) {
-        if (!info) continue;
-        const std::string_view text = WordText(*info);
+    for (std::size_t i = 0; i < c.infoCount; ++i) {
+        const std::string_view text = WordText(*c.infos[i]);
         if (text.empty()) continue;
         m_text += ' ';
         m_text += text;
@@ -213,8 +214,8 @@ void CLectWild::ReadDataBlock(int number) {
 
 void CLectWild::AddRemarks() {
     m_text.clear();
-    for (std::string_view remark : m_content.remarks) {
-        const std::string_view text = remark.empty() ? remark : FormMatView(remark);
+    for (std::size_t i = 0; i < m_content.remarkCount; ++i) {
+        const std::string_view text = WordText(*m_content.remarks[i]);
         if (text.empty()) continue;
         if (!m_text.empty()) m_text += ' ';
         m_text += text;
@@ -368,14 +369,14 @@ bool CLectWild::IsReferenceCode(std::string_view code) const {
 }
 
 bool CLectWild::IsReference(std::string_view point) const {
-    if (m_known.find(point) != m_known.end()) return true;
+    if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
     switch (m_marking) {
     case ReferenceMarking::First:
         return m_firstSighting;
     case ReferenceMarking::Codes:
         if (IsReferenceCode(m_pendingCode)) return true;
-        for (std::string_view remark : m_content.remarks)
-            if (!remark.empty() && IsReferenceCode(FormMatView(remark))) return true;
+        for (std::size_t i = 0; i < m_content.remarkCount; ++i)
+            if (IsReferenceCode(WordText(*m_content.remarks[i]))) return true;
         return false;
     case ReferenceMarking::None:
         break;

@@ -118,9 +118,9 @@ bool ReadWord(const Word& word, const Units& units, BlockContent& c) {
         break;
     }
     if (index >= 42 && index <= 49) {
-        c.infos[static_cast<std::size_t>(index - 42)] = &word;
+        if (c.infoCount < kMaxNoted) c.infos[c.infoCount++] = &word;
     } else if (index >= 71 && index <= 79) {
-        c.remarks[static_cast<std::size_t>(index - 71)] = word.data;
+        if (c.remarkCount < kMaxNoted) c.remarks[c.remarkCount++] = &word;
     } else if (IsStaffReading(index)) {
         double metres = kUndefined;
         if (!Length(word, units, metres, c)) return false;
@@ -149,14 +149,30 @@ bool BlockContent::HasStationWords() const {
     return HasStationPosition() || IsKnown(instrument);
 }
 
-bool BlockContent::HasRemarks() const {
-    for (std::string_view remark : remarks)
-        if (!remark.empty()) return true;
-    return false;
+// Every value of the struct but its lists, whose counts say what they hold: a block of a field book of a
+// million lines does not clear them each time.
+void BlockContent::Reset() {
+    codeBlock = false;
+    point = station = code = {};
+    remarkCount = infoCount = readingCount = unknownCount = 0;
+    hz = v = slope = horizontal = heightDifference = kUndefined;
+    east = north = elevation = kUndefined;
+    stationEast = stationNorth = stationElevation = kUndefined;
+    reflector = instrument = kUndefined;
+    serial = type = date = dateTime = {};
+    ppm = prismMm = prismConstantMm = ppmTotal = kUndefined;
+    foreignUnit = nullptr;
+}
+
+const Word* BlockContent::Info(int index) const {
+    const Word* found = nullptr;
+    for (std::size_t i = 0; i < infoCount; ++i)
+        if (infos[i]->index == index) found = infos[i];
+    return found;
 }
 
 bool ReadBlock(const Block& block, const Units& units, BlockContent& content, const Word*& bad) {
-    content = BlockContent{};
+    content.Reset();
     for (const Word& word : block) {
         if (!ReadWord(word, units, content)) {
             bad = &word;

@@ -20,15 +20,20 @@ struct StaffReading {
 // At most that many staff readings and unknown words are kept of a block; beyond, they are dropped.
 inline constexpr std::size_t kMaxNoted = 8;
 
+// What a block gives. Reset before each block; the lists hold their first kMaxNoted entries.
 struct BlockContent {
     bool codeBlock = false; // a block of word 41
 
     // ---- Ids and texts, as written (WordText drops their padding); empty when not given
-    std::string_view point;                    // 11
-    std::string_view station;                  // 16: the station's point id
-    std::array<std::string_view, 9> remarks{}; // 71 to 79: the point's code and attributes
-    std::string_view code;                     // 41: the code of a code block
-    std::array<const Word*, 8> infos{};        // 42 to 49: its information words, null when not given
+    std::string_view point;   // 11
+    std::string_view station; // 16: the station's point id
+    std::string_view code;    // 41: the code of a code block
+    // 71 to 79, the point's code and attributes, and 42 to 49, the information of a code block: the
+    // words in the order of the block.
+    std::array<const Word*, kMaxNoted> remarks;
+    std::size_t remarkCount = 0;
+    std::array<const Word*, kMaxNoted> infos;
+    std::size_t infoCount = 0;
 
     // ---- Values in grads and metres, kUndefined when not given or given as missing
     double hz = kUndefined;               // 21 horizontal circle reading
@@ -51,19 +56,24 @@ struct BlockContent {
     double ppmTotal = kUndefined;                  // 59
 
     // ---- Levelling
-    std::array<StaffReading, kMaxNoted> readings{};
+    std::array<StaffReading, kMaxNoted> readings;
     std::size_t readingCount = 0;
 
     // ---- What the reader may want to say about the block's words
-    std::array<int, kMaxNoted> unknown{}; // word indices this reader does not know
+    std::array<int, kMaxNoted> unknown; // word indices this reader does not know
     std::size_t unknownCount = 0;
-    const Word* foreignUnit = nullptr; // a word with a unit digit of the other kind (or none known)
+    const Word* foreignUnit = nullptr; // a word with a unit digit of the other kind
 
+    // Everything back to "not given" (the lists are emptied, not cleared).
+    void Reset();
+
+    // The information word of that index (42 to 49), or null.
+    const Word* Info(int index) const;
     bool HasObservation() const;
     bool HasTarget() const;          // 81, 82 or 83
     bool HasStationWords() const;    // 84, 85, 86 or 88
     bool HasStationPosition() const; // 84, 85 or 86
-    bool HasRemarks() const;
+    bool HasRemarks() const { return remarkCount > 0; }
 };
 
 // Reads the words of a block. False when a word's data is no number: `bad` then names it.

@@ -68,17 +68,24 @@ Value Digits(std::string_view data, std::string_view& text, bool& point, long lo
     text = Trimmed(data);
     point = false;
     digits = 0;
-    if (text.empty() || text.find('-') != std::string_view::npos) return Value::Missing;
-    if (text.find('.') != std::string_view::npos) {
-        point = true;
-        double check = 0.0;
-        return ParseDouble(text, check) && text.front() != '+' ? Value::Read : Value::Bad;
-    }
-    if (text.size() > kMaxDigits) return Value::Bad;
+    if (text.empty()) return Value::Missing;
+    if (text.size() > kMaxDigits)
+        return text.find('-') != std::string_view::npos ? Value::Missing : Value::Bad;
+    // One pass over the digits, the way nearly every value is written; anything else is looked at
+    // again: a dash anywhere means no value, a decimal point a value written as a number.
+    long long value = 0;
     for (char c : text) {
-        if (c < '0' || c > '9') return Value::Bad;
-        digits = digits * 10 + (c - '0');
+        const unsigned digit = static_cast<unsigned>(c - '0');
+        if (digit > 9) {
+            if (text.find('-') != std::string_view::npos) return Value::Missing;
+            if (text.find('.') == std::string_view::npos) return Value::Bad;
+            point = true;
+            double check = 0.0;
+            return ParseDouble(text, check) && text.front() != '+' ? Value::Read : Value::Bad;
+        }
+        value = value * 10 + digit;
     }
+    digits = value;
     return Value::Read;
 }
 

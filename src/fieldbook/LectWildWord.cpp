@@ -83,23 +83,31 @@ bool SplitBlock(std::string_view line, Block& block, std::string_view& bad) {
             ++position;
         if (position >= size) return true;
         const std::size_t start = position;
-        std::size_t sign = start;
-        while (sign < size && sign - start <= kHeaderLength && !IsSign(line[sign]) && !IsBlank(line[sign]))
-            ++sign;
-        Word word;
-        if (sign >= size || !IsSign(line[sign]) || block.count == kMaxWords ||
-            !ReadHeader(line.substr(start, sign - start), word)) {
-            std::size_t end = start;
-            while (end < size && !IsBlank(line[end]))
-                ++end;
-            bad = line.substr(start, end - start);
-            return false;
+        const auto readsAsHeader = [&](std::size_t sign) {
+            return block.count < kMaxWords && sign < size && IsSign(line[sign]) &&
+                   ReadHeader(line.substr(start, sign - start), block.words[block.count]);
+        };
+        // The sign stands at position 7, or earlier after a shortened header.
+        std::size_t sign = start + kHeaderLength;
+        if (!readsAsHeader(sign)) {
+            sign = start;
+            while (sign < size && sign - start <= kHeaderLength && !IsSign(line[sign]) &&
+                   !IsBlank(line[sign]))
+                ++sign;
+            if (!readsAsHeader(sign)) {
+                std::size_t end = start;
+                while (end < size && !IsBlank(line[end]))
+                    ++end;
+                bad = line.substr(start, end - start);
+                return false;
+            }
         }
+        Word& word = block.words[block.count];
         word.sign = line[sign];
         const std::size_t end = DataEnd(line, sign + 1, width);
         word.data = line.substr(sign + 1, end - sign - 1);
         word.text = line.substr(start, end - start);
-        block.words[block.count++] = word;
+        ++block.count;
         position = end;
     }
 }

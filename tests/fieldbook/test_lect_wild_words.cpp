@@ -71,6 +71,7 @@ TEST(GsiWords, ThreeDigitIndicesShortenedHeadersAndCutLinesAreRead) {
         {"410004+00000013 42....+0000TREE", {41, 42}, {"00000013", "0000TREE"}},
         // Headers without their dots: the sign ends them.
         {"11+00000100 21+11545200 22.2+09885300", {11, 21, 22}, {"00000100", "11545200", "09885300"}},
+        {"31+000-----", {31}, {"000-----"}}, // a dash where the sign of a full header would stand
         // A last word cut short, and an id holding blanks at the end of a line without its blanks.
         {"110001+00000100 21.102+1154", {11, 21}, {"00000100", "1154"}},
         {"21.102+11545200 110001+  A  12", {21, 11}, {"11545200", "  A  12"}},

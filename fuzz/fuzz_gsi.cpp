@@ -1,0 +1,79 @@
+// Any bytes read as a Wild / Leica GSI field book, under settings chosen by the first byte. Nothing may
+// crash, and what the reader builds is a GéoBase like any other: written and read back, it holds as many
+// elements, each of the same kind.
+#include "fieldbook/LectWild.h"
+#include "fieldbook/ParamDriver.h"
+#include "geobase/Carnet.h"
+#include "ui/PyrTxtWnd.h"
+#include "ui/ScriptedFrontEnd.h"
+
+#include <cstdint>
+#include <cstdio>
+#include <cstdlib>
+#include <string>
+#include <string_view>
+#include <sys/mman.h>
+#include <unistd.h>
+
+namespace {
+
+using namespace pyr;
+
+[[noreturn]] void Broken(const char* what, std::string_view detail) {
+    std::fprintf(stderr, "\n*** fuzz_gsi : %s\n%.*s\n", what, static_cast<int>(detail.size()), detail.data());
+    std::abort();
+}
+
+// The settings of "Wild.ini" that change what the reader makes of a block.
+void Choose(CParamDriver& driver, std::uint8_t choice) {
+    static const char* const conventions[] = {"auto", "84", "41"};
+    static const char* const references[] = {"aucune", "premiere", "codes"};
+    static const char* const angles[] = {"grades", "degres", "dms", "mils"};
+    driver.SetText(kKeyConventionStation, conventions[choice % 3]);
+    driver.SetText(kKeyReferences, references[(choice / 3) % 3]);
+    driver.SetText(kKeyCodesReference, "REF,99");
+    driver.SetText(kKeyUniteAngles, angles[(choice / 9) % 4]);
+    driver.SetText(kKeyUniteDistances, choice & 0x40 ? "pieds" : "metres");
+    driver.SetText(kKeyOrdreCoordonnees, choice & 0x80 ? "YX" : "XY");
+    driver.SetText(kKeyPointsCalcules, choice & 0x20 ? "1" : "0");
+}
+
+// The store written to a file in memory and read back by its path.
+void CheckRoundTrip(const CCarnet& read, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
+    const int fd = memfd_create("geobase", 0);
+    if (fd < 0) Broken("impossible de créer le fichier en mémoire", {});
+    std::FILE* file = fdopen(dup(fd), "w");
+    if (!file || !read.Write(file, true)) Broken("la GéoBase lue ne s'écrit pas", {});
+    std::fclose(file);
+    CCarnet back;
+    if (!back.Load(&txt, "/proc/self/fd/" + std::to_string(fd), {}, 0, &frontEnd))
+        Broken("la GéoBase écrite ne se relit pas", {});
+    close(fd);
+    if (back.GetSize() != read.GetSize()) Broken("relue, la GéoBase n'a pas le même nombre d'éléments", {});
+    for (int i = 0; i < read.GetSize(); ++i)
+        if (back.GetType(i) != read.GetType(i) || back.matAt(i) != read.matAt(i))
+            Broken("relu, un élément a changé", read.matAt(i));
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
+    if (size == 0) return 0;
+    const std::string_view bytes(reinterpret_cast<const char*>(data) + 1, size - 1);
+
+    ui::ScriptedFrontEnd frontEnd;
+    ui::ScopedApplicationFrontEnd scope(frontEnd);
+    CPyrTxtWnd txt(frontEnd);
+    CParamDriver driver("", "", FieldBookFormat::Wild);
+    Choose(driver, data[0]);
+    ReadingChoices choices;
+    CLectWild reader;
+    reader.SetChoices(choices);
+    reader.SetDriver(&driver);
+    reader.SetTextWindow(&txt);
+    reader.SetParent(&frontEnd);
+    CCarnet read;
+    reader.ReadText(bytes, read);
+    CheckRoundTrip(read, txt, frontEnd);
+    return 0;
+}
