@@ -44,15 +44,16 @@ bool IsDigits(std::string_view text) {
 }
 
 // The last eight digits of a date word, "DDMMYYYY" (17) or "MMDDhhmm" (19), shown as a surveyor reads
-// them; another writing is kept as it stands.
+// them; a date of six digits (DDMMYY, the zeros of the padding in front) is shown with its two-digit
+// year, and another writing is kept as it stands.
 std::string DateText(std::string_view data, bool withTime) {
     std::string_view digits = Trimmed(data);
     if (digits.size() >= 8) digits = digits.substr(digits.size() - 8);
-    if (digits.size() != 8 || !IsDigits(digits)) return std::string(FormMatView(data));
-    if (withTime)
-        return Sprintf("%.2s/%.2s %.2s:%.2s", digits.data() + 2, digits.data(), digits.data() + 4,
-                       digits.data() + 6);
-    return Sprintf("%.2s/%.2s/%.4s", digits.data(), digits.data() + 2, digits.data() + 4);
+    if (digits.size() != 8 || !IsDigits(digits)) return std::string(Trimmed(data));
+    const char* d = digits.data();
+    if (withTime) return Sprintf("%.2s/%.2s %.2s:%.2s", d + 2, d, d + 4, d + 6);
+    if (digits.starts_with("00")) return Sprintf("%.2s/%.2s/%.2s", d + 2, d + 4, d + 6);
+    return Sprintf("%.2s/%.2s/%.4s", d, d + 2, d + 4);
 }
 
 bool IsOn(const std::string& value) {
@@ -122,7 +123,7 @@ void CLectWild::ReadLine(std::string_view line, int number) {
         if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(badWord->text).c_str());
         return;
     }
-    HeaderComments(number);
+    HeaderComments();
     Warnings(number);
     if (m_content.codeBlock)
         ReadCodeBlock(number);
@@ -136,7 +137,7 @@ void CLectWild::Header(std::string& last, const char* label, std::string_view va
     AddHeaderComment(label, value);
 }
 
-void CLectWild::HeaderComments(int) {
+void CLectWild::HeaderComments() {
     const gsi::BlockContent& c = m_content;
     if (!m_started) {
         m_started = true;

@@ -44,7 +44,7 @@ private:
     using NameSet = std::unordered_set<std::string, TextHash, std::equal_to<>>;
 
     void ReadSettings();
-    void HeaderComments(int number);
+    void HeaderComments();
     void Header(std::string& last, const char* label, std::string_view value);
     void Warnings(int number);
     void ReadCodeBlock(int number);

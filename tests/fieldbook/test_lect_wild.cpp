@@ -398,3 +398,30 @@ TEST(LectWild, AWildConversionWritesItsGeoBase) {
     EXPECT_EQ(written.As<CComment>(0)->text(), "Fichier              = levé.gsi");
     EXPECT_EQ(written.GetType(10), kKindReference);
 }
+
+TEST(LectWild, HeaderInformationAndConstantsAreCommentsWrittenWhenTheyChange) {
+    const std::string text =
+        Gsi8({"12....+00640054", "13....+00TCR305", "17....+00010224", "19....+02081029"}) + "\n" +
+        Gsi8({"110001+00000S10", "88..10+00001500", "58..16+00000020", "59..16+02200000"}) + "\n" +
+        // The time of a sighting is no header; constants repeated are said once.
+        Gsi8({"110002+00000101", "21.102+10000000", "19....+02081031", "58..16+00000020"}) + "\n" +
+        Gsi8({"110003+00000102", "21.102+10000000", "51..1.+0012-017", "17....+01032024"}) + "\n";
+    WildRun run;
+    const std::vector<std::string> expected{
+        "1000 Format               = GSI-8",
+        "1000 Numéro de série      = 640054",
+        "1000 Appareil             = TCR305",
+        "1000 Date                 = 01/02/24",
+        "1000 Date et heure        = 08/02 10:29",
+        "1000 Correction atmosphérique = 220 ppm", // 220.0000 ppm (unit digit 6)
+        "1000 Constante de prisme  = 2 mm",        // 0.0020 m
+        "1001 S10",
+        "1003 101",
+        "1000 Date                 = 01/03/2024",
+        "1000 Correction atmosphérique = 12 ppm",
+        "1000 Constante de prisme  = -17 mm",
+        "1003 102",
+    };
+    EXPECT_EQ(Summary(run.Read(text)), expected);
+    EXPECT_TRUE(run.Reports().empty());
+}
