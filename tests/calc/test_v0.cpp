@@ -136,8 +136,8 @@ TEST(StationV0, DistanceAndHeightChecksWarnButKeepTheReference) {
     Job job(5.0);
     CVisee& a = job.Sighting(0);
     const double tooLong = 0.1 / std::sin(a.av() / kGonPerRadian);
-    a.setDI(a.di() + tooLong);                                      // 10 cm too long: beyond 3.01 cm
-    job.carnet.As<CPointGen>(job.carnet.findMat("B"))->setZ(99.25); // 5 cm too high: beyond 3.61 cm
+    a.setDI(a.di() + tooLong);                                      // 10 cm too long: beyond 3.10 cm
+    job.carnet.As<CPointGen>(job.carnet.findMat("B"))->setZ(99.25); // 5 cm too high: beyond 3.77 cm
     const V0Result result = job.Compute();
     EXPECT_EQ(
         result.warnings,
