@@ -425,3 +425,22 @@ TEST(LectWild, HeaderInformationAndConstantsAreCommentsWrittenWhenTheyChange) {
     EXPECT_EQ(Summary(run.Read(text)), expected);
     EXPECT_TRUE(run.Reports().empty());
 }
+
+TEST(LectWild, AStationNumberOnTheMeasurementsOpensItsStation) {
+    const std::string text =
+        Gsi8({"110001+00000101", "16....+00000S20", "21.102+10000000", "84..10+00010000", "85..10+00020000",
+              "88..10+00001500"}) +
+        "\n" + Gsi8({"110002+00000102", "16....+00000S20", "21.102+20000000", "88..10+00001500"}) + "\n" +
+        Gsi8({"110003+00000103", "16....+00000S21", "21.102+30000000"}) + "\n";
+    for (const char* convention : {"auto", "84"}) {
+        WildRun run;
+        const CCarnet& read = run.Set(kKeyConventionStation, convention).Read(text);
+        EXPECT_TRUE(run.Reports().empty());
+        EXPECT_EQ(Summary(read),
+                  (std::vector<std::string>{"1000 Format               = GSI-8", "1006 S20", "1001 S20",
+                                            "1003 101", "1003 102", "1001 S21", "1003 103"}));
+        ExpectPoint(read, 1, 10.0, 20.0, kUndefined);
+        EXPECT_NEAR(read.hiAt(2), 1.5, kMetres);
+        EXPECT_EQ(read.hiAt(5), kUndefined);
+    }
+}
