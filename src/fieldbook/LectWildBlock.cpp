@@ -46,42 +46,51 @@ bool Scaled(const Word& word, int decimals, double& value) {
     return ReadScaled(word, decimals, value) != Value::Bad;
 }
 
-bool ReadWord(const Word& word, const Units& units, BlockContent& c) {
+// What the two-digit words that hold one text or one value give: where it goes in the block.
+struct Slot {
+    enum Kind : char { None, Text, Angle, Length } kind = None;
+    std::string_view BlockContent::*text = nullptr;
+    double BlockContent::*value = nullptr;
+};
+
+const std::array<Slot, 100>& Slots() {
+    static const std::array<Slot, 100> slots = [] {
+        std::array<Slot, 100> table{};
+        const auto text = [&](int index, std::string_view BlockContent::*member) {
+            table[static_cast<std::size_t>(index)] = {Slot::Text, member, nullptr};
+        };
+        const auto value = [&](int index, Slot::Kind kind, double BlockContent::*member) {
+            table[static_cast<std::size_t>(index)] = {kind, nullptr, member};
+        };
+        text(11, &BlockContent::point);
+        text(12, &BlockContent::serial);
+        text(13, &BlockContent::type);
+        text(16, &BlockContent::station);
+        text(17, &BlockContent::date);
+        text(19, &BlockContent::dateTime);
+        text(41, &BlockContent::code);
+        value(21, Slot::Angle, &BlockContent::hz);
+        value(22, Slot::Angle, &BlockContent::v);
+        value(31, Slot::Length, &BlockContent::slope);
+        value(32, Slot::Length, &BlockContent::horizontal);
+        value(33, Slot::Length, &BlockContent::heightDifference);
+        value(81, Slot::Length, &BlockContent::east);
+        value(82, Slot::Length, &BlockContent::north);
+        value(83, Slot::Length, &BlockContent::elevation);
+        value(84, Slot::Length, &BlockContent::stationEast);
+        value(85, Slot::Length, &BlockContent::stationNorth);
+        value(86, Slot::Length, &BlockContent::stationElevation);
+        value(87, Slot::Length, &BlockContent::reflector);
+        value(88, Slot::Length, &BlockContent::instrument);
+        return table;
+    }();
+    return slots;
+}
+
+// The words with more than one value, with a scale of their own, or kept in a list.
+bool ReadOtherWord(const Word& word, const Units& units, BlockContent& c) {
     const int index = word.index;
-    switch (index) {
-    case 11:
-        c.point = word.data;
-        return true;
-    case 12:
-        c.serial = word.data;
-        return true;
-    case 13:
-        c.type = word.data;
-        return true;
-    case 16:
-        c.station = word.data;
-        return true;
-    case 17:
-        c.date = word.data;
-        return true;
-    case 19:
-        c.dateTime = word.data;
-        return true;
-    case 21:
-        return Angle(word, units, c.hz, c);
-    case 22:
-        return Angle(word, units, c.v, c);
-    case 31:
-        return Length(word, units, c.slope, c);
-    case 32:
-        return Length(word, units, c.horizontal, c);
-    case 33:
-        return Length(word, units, c.heightDifference, c);
-    case 41:
-        c.codeBlock = true;
-        c.code = word.data;
-        return true;
-    case 51: {
+    if (index == 51) {
         double ppm = kUndefined, prism = kUndefined;
         const Value value = ReadPpmAndPrism(word, ppm, prism);
         if (value == Value::Read) {
@@ -90,33 +99,13 @@ bool ReadWord(const Word& word, const Units& units, BlockContent& c) {
         }
         return value != Value::Bad;
     }
-    case 58: {
+    if (index == 58) {
         double metres = kUndefined;
         if (!Scaled(word, kPrismDecimals, metres)) return false;
         c.prismConstantMm = IsKnown(metres) ? metres * kMillimetresPerMetre : kUndefined;
         return true;
     }
-    case 59:
-        return Scaled(word, kPpmDecimals, c.ppmTotal);
-    case 81:
-        return Length(word, units, c.east, c);
-    case 82:
-        return Length(word, units, c.north, c);
-    case 83:
-        return Length(word, units, c.elevation, c);
-    case 84:
-        return Length(word, units, c.stationEast, c);
-    case 85:
-        return Length(word, units, c.stationNorth, c);
-    case 86:
-        return Length(word, units, c.stationElevation, c);
-    case 87:
-        return Length(word, units, c.reflector, c);
-    case 88:
-        return Length(word, units, c.instrument, c);
-    default:
-        break;
-    }
+    if (index == 59) return Scaled(word, kPpmDecimals, c.ppmTotal);
     if (index >= 42 && index <= 49) {
         if (c.infoCount < kMaxNoted) c.infos[c.infoCount++] = &word;
     } else if (index >= 71 && index <= 79) {
@@ -129,6 +118,23 @@ bool ReadWord(const Word& word, const Units& units, BlockContent& c) {
         c.unknown[c.unknownCount++] = index;
     }
     return true;
+}
+
+bool ReadWord(const Word& word, const Units& units, BlockContent& c) {
+    const Slot slot = word.index < 100 ? Slots()[static_cast<std::size_t>(word.index)] : Slot{};
+    switch (slot.kind) {
+    case Slot::Text:
+        c.*slot.text = word.data;
+        if (word.index == 41) c.codeBlock = true;
+        return true;
+    case Slot::Angle:
+        return Angle(word, units, c.*slot.value, c);
+    case Slot::Length:
+        return Length(word, units, c.*slot.value, c);
+    case Slot::None:
+        break;
+    }
+    return ReadOtherWord(word, units, c);
 }
 
 } // namespace

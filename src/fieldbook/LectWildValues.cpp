@@ -62,31 +62,46 @@ bool IsFeet(char digit) {
     return digit == '1' || digit == '7';
 }
 
-// The data without its blanks: Missing when nothing or dashes remain; `point` tells whether it is
-// written with a decimal point, otherwise `digits` holds its value as a whole number.
-Value Digits(std::string_view data, std::string_view& text, bool& point, long long& digits) {
-    text = Trimmed(data);
-    point = false;
-    digits = 0;
-    if (text.empty()) return Value::Missing;
+// The data of a word without its blanks: Missing when nothing or dashes remain. Its value is `digits`
+// (to be scaled by its unit's decimals), or `written` when it has a decimal point.
+struct Number {
+    Value status = Value::Read;
+    std::string_view text;
+    bool point = false;
+    long long digits = 0; // without a decimal point
+    double written = 0.0; // with one
+};
+
+Number NoNumber(Value status) {
+    Number number;
+    number.status = status;
+    return number;
+}
+
+Number ReadNumber(std::string_view data) {
+    Number number;
+    number.text = Trimmed(data);
+    const std::string_view text = number.text;
+    if (text.empty()) return NoNumber(Value::Missing);
     if (text.size() > kMaxDigits)
-        return text.find('-') != std::string_view::npos ? Value::Missing : Value::Bad;
+        return NoNumber(text.find('-') != std::string_view::npos ? Value::Missing : Value::Bad);
     // One pass over the digits, the way nearly every value is written; anything else is looked at
     // again: a dash anywhere means no value, a decimal point a value written as a number.
     long long value = 0;
     for (char c : text) {
         const unsigned digit = static_cast<unsigned>(c - '0');
         if (digit > 9) {
-            if (text.find('-') != std::string_view::npos) return Value::Missing;
-            if (text.find('.') == std::string_view::npos) return Value::Bad;
-            point = true;
-            double check = 0.0;
-            return ParseDouble(text, check) && text.front() != '+' ? Value::Read : Value::Bad;
+            if (text.find('-') != std::string_view::npos) return NoNumber(Value::Missing);
+            if (text.find('.') == std::string_view::npos || !ParseDouble(text, number.written) ||
+                text.front() == '+')
+                return NoNumber(Value::Bad);
+            number.point = true;
+            return number;
         }
         value = value * 10 + digit;
     }
-    digits = value;
-    return Value::Read;
+    number.digits = value;
+    return number;
 }
 
 double Signed(const Word& word, double value) {
@@ -103,44 +118,41 @@ bool IsLengthUnit(char unit) {
     return unit == '0' || unit == '1' || (unit >= '6' && unit <= '8');
 }
 
-Value ReadAngle(const Word& word, AngleUnit fallback, double& grads) {
-    const char unit = IsAngleUnit(word.unit) ? word.unit : AngleDigit(fallback);
-    std::string_view text;
-    bool point = false;
-    long long n = 0;
-    const Value status = Digits(word.data, text, point, n);
-    if (status != Value::Read) return status;
-    if (point) {
-        double value = 0.0;
-        if (unit == '4') {
-            if (!DmsTextToDegrees(text, value)) return Value::Bad;
-            value = ToGrads(value, AngleUnit::Degrees);
-        } else {
-            ParseDouble(text, value);
-            value = ToGrads(value, AngleUnitOf(unit));
-        }
-        grads = Signed(word, value);
-        return Value::Read;
-    }
-    double value = 0.0;
+// The grads of the digits of an angle word in the unit of that digit; false for a DDD.MMSSs whose
+// minutes or seconds reach 60.
+bool DigitsToGrads(long long n, char unit, double& grads) {
     switch (unit) {
     case '3': // 1e-5 degree = 1 / 90 000 grad
-        value = static_cast<double>(n) / 90000.0;
-        break;
+        grads = static_cast<double>(n) / 90000.0;
+        return true;
     case '4': { // DDD.MMSSs: tenths of a second, 32 400 to the grad
         const long long tenths = n % 1000;
         const long long minutes = n / 1000 % 100;
-        if (minutes >= 60 || tenths >= 600) return Value::Bad;
-        const long long total = ((n / 100000) * 60 + minutes) * 600 + tenths;
-        value = static_cast<double>(total) / 32400.0;
-        break;
+        if (minutes >= 60 || tenths >= 600) return false;
+        grads = static_cast<double>(((n / 100000) * 60 + minutes) * 600 + tenths) / 32400.0;
+        return true;
     }
     case '5': // 1e-4 mil = 1 / 160 000 grad
-        value = static_cast<double>(n) / 160000.0;
-        break;
+        grads = static_cast<double>(n) / 160000.0;
+        return true;
     default: // 1e-5 grad
-        value = static_cast<double>(n) / 1e5;
-        break;
+        grads = static_cast<double>(n) / 1e5;
+        return true;
+    }
+}
+
+Value ReadAngle(const Word& word, AngleUnit fallback, double& grads) {
+    const char unit = IsAngleUnit(word.unit) ? word.unit : AngleDigit(fallback);
+    const Number number = ReadNumber(word.data);
+    if (number.status != Value::Read) return number.status;
+    double value = 0.0;
+    if (!number.point) {
+        if (!DigitsToGrads(number.digits, unit, value)) return Value::Bad;
+    } else if (unit == '4') {
+        if (!DmsTextToDegrees(number.text, value)) return Value::Bad;
+        value = ToGrads(value, AngleUnit::Degrees);
+    } else {
+        value = ToGrads(number.written, AngleUnitOf(unit));
     }
     grads = Signed(word, value);
     return Value::Read;
@@ -148,38 +160,26 @@ Value ReadAngle(const Word& word, AngleUnit fallback, double& grads) {
 
 Value ReadLength(const Word& word, DistanceUnit fallback, double& metres) {
     const char unit = IsLengthUnit(word.unit) ? word.unit : LengthDigit(fallback);
-    std::string_view text;
-    bool point = false;
-    long long n = 0;
-    const Value status = Digits(word.data, text, point, n);
-    if (status != Value::Read) return status;
-    if (point) {
-        double value = 0.0;
-        ParseDouble(text, value);
-        metres = Signed(word, IsFeet(unit) ? value * kMetresPerFoot : value);
-        return Value::Read;
-    }
+    const Number number = ReadNumber(word.data);
+    if (number.status != Value::Read) return number.status;
     const int decimals = LengthDecimals(unit);
-    const double value =
-        IsFeet(unit) ? static_cast<double>(n) * kTenThousandthsOfMetrePerFoot / kPowersOfTen[decimals + 4]
-                     : static_cast<double>(n) / kPowersOfTen[decimals];
+    const double n = static_cast<double>(number.digits);
+    double value = 0.0;
+    if (number.point)
+        value = IsFeet(unit) ? number.written * kMetresPerFoot : number.written;
+    else
+        value = IsFeet(unit) ? n * kTenThousandthsOfMetrePerFoot / kPowersOfTen[decimals + 4]
+                             : n / kPowersOfTen[decimals];
     metres = Signed(word, value);
     return Value::Read;
 }
 
 Value ReadScaled(const Word& word, int decimals, double& value) {
-    std::string_view text;
-    bool point = false;
-    long long n = 0;
-    const Value status = Digits(word.data, text, point, n);
-    if (status != Value::Read) return status;
-    if (point) {
-        ParseDouble(text, value);
-    } else {
-        if (IsLengthUnit(word.unit)) decimals = LengthDecimals(word.unit);
-        value = static_cast<double>(n) / kPowersOfTen[decimals];
-    }
-    value = Signed(word, value);
+    const Number number = ReadNumber(word.data);
+    if (number.status != Value::Read) return number.status;
+    if (IsLengthUnit(word.unit)) decimals = LengthDecimals(word.unit);
+    value = Signed(word, number.point ? number.written
+                                      : static_cast<double>(number.digits) / kPowersOfTen[decimals]);
     return Value::Read;
 }
 
