@@ -7,6 +7,7 @@
 #include "fieldbook/LectWildTexts.h"
 #include "geobase/Carnet.h"
 #include "geobase/Matricule.h"
+#include "settings/ParamStore.h"
 #include "ui/PyrTxtWnd.h"
 
 #include <cmath>
@@ -82,7 +83,11 @@ void CLectWild::ReadSettings() {
     m_convention = driver->Stations();
     m_referenceCodes = driver->ReferenceCodes();
     m_stationCodes = driver->StationCodes();
-    m_keepComputed = IsOn(driver->Text(kKeyPointsCalcules));
+    // A key the parameter set may not know yet: read from its file when the set does not hold it.
+    std::string keep = driver->Text(kKeyPointsCalcules);
+    if (keep.empty() && !driver->FileName().empty())
+        ReadParamString(driver->FileName(), kSectionParametrage, kKeyPointsCalcules, "0", keep);
+    m_keepComputed = IsOn(keep);
 }
 
 void CLectWild::BeginReading() {

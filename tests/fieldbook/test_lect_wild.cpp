@@ -128,9 +128,15 @@ TEST(LectWild, AGsi16FieldBookWithStationBlocksGivesItsStationSightingsAndPoints
 }
 
 TEST(LectWild, TheInstrumentsCoordinatesOfAMeasuredPointAreKeptWhenAsked) {
-    for (const char* keep : {"1", "oui"}) {
+    TempDir dir;
+    WriteBytes(dir / "Wild.ini", "[Parametrage]\nPointsCalcules=1\n");
+    for (const char* keep : {"1", "oui", "file"}) {
         WildRun run;
-        const CCarnet& read = run.Set(kKeyPointsCalcules, keep).ReadFile("wild-gsi16-84.gsi");
+        if (keep == std::string("file"))
+            ASSERT_TRUE(run.driver.Load(dir / "Wild.ini", &run.frontEnd));
+        else
+            run.Set(kKeyPointsCalcules, keep);
+        const CCarnet& read = run.ReadFile("wild-gsi16-84.gsi");
         ASSERT_EQ(read.GetSize(), 18);
         EXPECT_EQ(Summary(read).back(), "1006 104");
         ExpectPoint(read, 17, 1000.0, 2010.0, 100.0 + 1.55 - 1.3);
