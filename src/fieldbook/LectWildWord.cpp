@@ -81,7 +81,11 @@ bool SplitBlock(std::string_view line, Block& block, std::string_view& bad) {
     while (true) {
         while (position < size && IsBlank(line[position]))
             ++position;
-        if (position >= size) return true;
+        if (position >= size) {
+            // A GSI-16 block that lost its star still has its 16-character words.
+            if (block.count > 0 && block.words[0].data.size() == kDataGsi16) block.gsi16 = true;
+            return true;
+        }
         const std::size_t start = position;
         const auto readsAsHeader = [&](std::size_t sign) {
             return block.count < kMaxWords && sign < size && IsSign(line[sign]) &&

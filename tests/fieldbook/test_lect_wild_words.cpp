@@ -84,6 +84,7 @@ TEST(GsiWords, ThreeDigitIndicesShortenedHeadersAndCutLinesAreRead) {
         Block block;
         std::string_view bad;
         ASSERT_TRUE(SplitBlock(c.line, block, bad)) << c.line;
+        EXPECT_EQ(block.gsi16, block.words[0].data.size() == 16) << c.line;
         std::vector<int> indices;
         for (const Word& word : block)
             indices.push_back(word.index);
