@@ -60,10 +60,11 @@ bool CFieldBookReader::Read(const std::string& path, CCarnet& result) {
 }
 
 void CFieldBookReader::ReadText(std::string_view bytes, CCarnet& result) {
-    bool windows1252 = false;
-    const std::string text = FileBytesToUtf8(bytes, &windows1252);
-    if (windows1252 && !m_path.empty() && m_txt) m_txt->Print(fb::kReadAsWindows1252, m_path.c_str());
-    Run(text, result);
+    if (bytes.starts_with("\xEF\xBB\xBF")) bytes.remove_prefix(3);
+    // Valid UTF-8 is read where it lies: a million-line field book is not copied once more.
+    if (IsValidUtf8(bytes)) return Run(bytes, result);
+    if (!m_path.empty() && m_txt) m_txt->Print(fb::kReadAsWindows1252, m_path.c_str());
+    Run(Windows1252ToUtf8(bytes), result);
 }
 
 void CFieldBookReader::Run(std::string_view text, CCarnet& result) {

@@ -83,11 +83,7 @@ void CLectWild::ReadSettings() {
     m_convention = driver->Stations();
     m_referenceCodes = driver->ReferenceCodes();
     m_stationCodes = driver->StationCodes();
-    // A key the parameter set may not know yet: read from its file when the set does not hold it.
-    std::string keep = driver->Text(kKeyPointsCalcules);
-    if (keep.empty() && !driver->FileName().empty())
-        ReadParamString(driver->FileName(), kSectionParametrage, kKeyPointsCalcules, "0", keep);
-    m_keepComputed = IsOn(keep);
+    m_keepComputed = IsOn(driver->Text(kKeyPointsCalcules));
 }
 
 void CLectWild::BeginReading() {

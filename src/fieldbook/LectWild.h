@@ -13,10 +13,6 @@
 
 namespace pyr {
 
-// "Wild.ini": whether the coordinates that the instrument computed for a measured point (words 81, 82,
-// 83 beside the observations) are kept as points of the GéoBase; 0 (the default) or 1.
-inline constexpr const char* kKeyPointsCalcules = "PointsCalcules";
-
 // The reader of Wild / Leica GSI field books, GSI-8 and GSI-16 (docs/format-gsi.md). Each line is a
 // block of words (LectWildWord.h) read into grads and metres (LectWildValues.h, LectWildBlock.h):
 //  - a station is a block of words 84, 85, 86 (87, 88) named by its word 11, or a code block 41 whose

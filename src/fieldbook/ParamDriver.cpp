@@ -52,6 +52,7 @@ const std::vector<Key>& WildKeys() {
         std::vector<Key> all = InstrumentKeys();
         all.push_back({kKeyConventionStation, kAuto, {kAuto, kWords84, kBlock41}});
         all.push_back({kKeyCodesStation, "2,21", {}});
+        all.push_back({kKeyPointsCalcules, "0", {"0", "1"}});
         return all;
     }();
     return keys;

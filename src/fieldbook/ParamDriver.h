@@ -27,6 +27,9 @@ inline constexpr const char* kKeyCodesReference = "CodesReference";     // codes
 // Wild / Leica GSI only
 inline constexpr const char* kKeyConventionStation = "ConventionStation"; // auto, 84, 41
 inline constexpr const char* kKeyCodesStation = "CodesStation";           // codes of a 41 block
+// Whether the coordinates that the instrument computed for a measured point (words 81, 82, 83 beside the
+// observations) are kept as points of the GéoBase: 0 or 1.
+inline constexpr const char* kKeyPointsCalcules = "PointsCalcules";
 
 // ---- Keys of the delimited ("*.sep") and columnar ("*.col") layouts
 inline constexpr const char* kKeySeparateur = "Separateur"; // the text between fields; TAB, ESPACE
