@@ -10,7 +10,7 @@ RELEASE_DIR := build/release
 CHECK_DIR := build/check
 FUZZ_DIR := build/fuzz
 FUZZ_SECONDS ?= 60
-FUZZ_TARGETS := fuzz_geo_load fuzz_sepcol fuzz_gsi
+FUZZ_TARGETS := fuzz_geo_load fuzz_sepcol fuzz_gsi fuzz_quendal
 DEMO_DIR := build/demo-out
 
 .PHONY: all deps release demo check bench fuzz format clean

@@ -1,6 +1,7 @@
 // Any bytes read as a Wild / Leica GSI field book, under settings chosen by the first byte. Nothing may
 // crash, and what the reader builds is a GéoBase like any other: written and read back, it holds as many
 // elements, each of the same kind.
+#include "FuzzRoundTrip.h"
 #include "fieldbook/LectWild.h"
 #include "fieldbook/ParamDriver.h"
 #include "geobase/Carnet.h"
@@ -12,17 +13,10 @@
 #include <cstdlib>
 #include <string>
 #include <string_view>
-#include <sys/mman.h>
-#include <unistd.h>
 
 namespace {
 
 using namespace pyr;
-
-[[noreturn]] void Broken(const char* what, std::string_view detail) {
-    std::fprintf(stderr, "\n*** fuzz_gsi : %s\n%.*s\n", what, static_cast<int>(detail.size()), detail.data());
-    std::abort();
-}
 
 // The settings of "Wild.ini" that change what the reader makes of a block.
 void Choose(CParamDriver& driver, std::uint8_t choice) {
@@ -36,23 +30,6 @@ void Choose(CParamDriver& driver, std::uint8_t choice) {
     driver.SetText(kKeyUniteDistances, choice & 0x40 ? "pieds" : "metres");
     driver.SetText(kKeyOrdreCoordonnees, choice & 0x80 ? "YX" : "XY");
     driver.SetText(kKeyPointsCalcules, choice & 0x20 ? "1" : "0");
-}
-
-// The store written to a file in memory and read back by its path.
-void CheckRoundTrip(const CCarnet& read, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
-    const int fd = memfd_create("geobase", 0);
-    if (fd < 0) Broken("impossible de créer le fichier en mémoire", {});
-    std::FILE* file = fdopen(dup(fd), "w");
-    if (!file || !read.Write(file, true)) Broken("la GéoBase lue ne s'écrit pas", {});
-    std::fclose(file);
-    CCarnet back;
-    if (!back.Load(&txt, "/proc/self/fd/" + std::to_string(fd), {}, 0, &frontEnd))
-        Broken("la GéoBase écrite ne se relit pas", {});
-    close(fd);
-    if (back.GetSize() != read.GetSize()) Broken("relue, la GéoBase n'a pas le même nombre d'éléments", {});
-    for (int i = 0; i < read.GetSize(); ++i)
-        if (back.GetType(i) != read.GetType(i) || back.matAt(i) != read.matAt(i))
-            Broken("relu, un élément a changé", read.matAt(i));
 }
 
 } // namespace
@@ -74,6 +51,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     reader.SetParent(&frontEnd);
     CCarnet read;
     reader.ReadText(bytes, read);
-    CheckRoundTrip(read, txt, frontEnd);
+    fuzz::CheckRoundTrip("fuzz_gsi", read, txt, frontEnd);
     return 0;
 }
