@@ -24,15 +24,15 @@ std::size_t CColumnarFields::Offset(int column) const {
     return m_line.size();
 }
 
-std::string_view CColumnarFields::Field(const FieldSpec& spec, std::size_t) const {
-    const std::size_t from = Offset(spec.first - 1);
-    const std::size_t to = spec.last > 0 ? Offset(spec.last) : m_line.size();
+std::string_view CColumnarFields::Field(const FieldPlace& place, std::size_t) const {
+    const std::size_t from = Offset(place.first - 1);
+    const std::size_t to = place.last > 0 ? Offset(place.last) : m_line.size();
     return from < to ? Trimmed(m_line.substr(from, to - from)) : std::string_view();
 }
 
-std::string_view CColumnarFields::After(const FieldSpec& spec, std::size_t) const {
-    if (spec.last <= 0) return {};
-    return Trimmed(m_line.substr(Offset(spec.last)));
+std::string_view CColumnarFields::After(const FieldPlace& place, std::size_t) const {
+    if (place.last <= 0) return {};
+    return Trimmed(m_line.substr(Offset(place.last)));
 }
 
 } // namespace pyr

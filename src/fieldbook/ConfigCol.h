@@ -15,8 +15,8 @@ public:
     CColumnarFields() = default;
     explicit CColumnarFields(const RecordLayout&) {} // every field carries its columns
     void Split(std::string_view line) override;
-    std::string_view Field(const FieldSpec& spec, std::size_t index) const override;
-    std::string_view After(const FieldSpec& spec, std::size_t index) const override;
+    std::string_view Field(const FieldPlace& place, std::size_t index) const override;
+    std::string_view After(const FieldPlace& place, std::size_t index) const override;
     std::size_t Extra(std::size_t) const override { return 0; }
 
 private:

@@ -83,11 +83,11 @@ std::size_t CDelimitedFields::ReadField(std::size_t position) {
     return next;
 }
 
-std::string_view CDelimitedFields::Field(const FieldSpec&, std::size_t index) const {
+std::string_view CDelimitedFields::Field(const FieldPlace&, std::size_t index) const {
     return index < m_fields.size() ? m_fields[index].text : std::string_view();
 }
 
-std::string_view CDelimitedFields::After(const FieldSpec&, std::size_t index) const {
+std::string_view CDelimitedFields::After(const FieldPlace&, std::size_t index) const {
     if (index + 1 >= m_fields.size()) return {};
     // A single field after it is taken unquoted; several are the text of the line as it stands.
     if (index + 2 == m_fields.size()) return m_fields[index + 1].text;

@@ -19,8 +19,8 @@ public:
     explicit CDelimitedFields(const RecordLayout& layout) : CDelimitedFields(layout.separator) {}
 
     void Split(std::string_view line) override;
-    std::string_view Field(const FieldSpec& spec, std::size_t index) const override;
-    std::string_view After(const FieldSpec& spec, std::size_t index) const override;
+    std::string_view Field(const FieldPlace& place, std::size_t index) const override;
+    std::string_view After(const FieldPlace& place, std::size_t index) const override;
     std::size_t Extra(std::size_t count) const override;
 
     std::size_t Count() const { return m_fields.size(); }

@@ -23,10 +23,10 @@ enum class RecordKind { Station, Reference, Mesure, Point, Code, Comment };
 
 // A kind of record: the word of its TYPE field, and where that field lies (in the list of the kind; codes
 // and comments have theirs where the other records have it).
-struct KindSpec {
+struct RecordKindWords {
     RecordKind kind;
     std::string_view word;
-    const std::vector<FieldSpec>* fields;
+    const std::vector<FieldPlace>* fields;
     std::size_t typeIndex;
 };
 
@@ -35,7 +35,7 @@ constexpr std::size_t kNoType = static_cast<std::size_t>(-1);
 constexpr std::size_t kLongestNumber = 63;
 constexpr std::size_t kFieldCount = static_cast<std::size_t>(RecordField::Ignore) + 1;
 
-std::size_t TypeIndex(const std::vector<FieldSpec>& fields) {
+std::size_t TypeIndex(const std::vector<FieldPlace>& fields) {
     for (std::size_t i = 0; i < fields.size(); ++i)
         if (fields[i].field == RecordField::Type) return i;
     return kNoType;
@@ -60,8 +60,8 @@ public:
     void ReadLine(std::string_view line, int number);
 
 private:
-    void Read(const KindSpec& kind, int line);
-    bool ReadValues(const std::vector<FieldSpec>& list, int line, Values& values);
+    void Read(const RecordKindWords& kind, int line);
+    bool ReadValues(const std::vector<FieldPlace>& list, int line, Values& values);
     bool ReadNumber(std::string_view text, RecordField field, int line, double& value) const;
     void Missing(int line, const char* datum) const;
 
@@ -70,15 +70,15 @@ private:
     CRecordFields& m_fields;
     CCarnet& m_records;
     CPyrTxtWnd* m_txt;
-    std::vector<KindSpec> m_kinds; // the kinds that a TYPE field can name, in the order they are tried
+    std::vector<RecordKindWords> m_kinds; // the kinds that a TYPE field can name, in the order they are tried
     bool m_typed = false;
 };
 
 RecordBuilder::RecordBuilder(const RecordLayout& layout, RecordUnits units, CRecordFields& fields,
                              CCarnet& records, CPyrTxtWnd* txt)
     : m_layout(layout), m_units(units), m_fields(fields), m_records(records), m_txt(txt) {
-    const std::vector<FieldSpec>* lists[] = {&layout.station, &layout.sighting, &layout.point};
-    auto add = [this](RecordKind kind, const std::string& word, const std::vector<FieldSpec>& list) {
+    const std::vector<FieldPlace>* lists[] = {&layout.station, &layout.sighting, &layout.point};
+    auto add = [this](RecordKind kind, const std::string& word, const std::vector<FieldPlace>& list) {
         const std::size_t type = TypeIndex(list);
         if (type == kNoType) return;
         m_typed = true;
@@ -107,12 +107,12 @@ void RecordBuilder::ReadLine(std::string_view line, int number) {
             if (m_txt) m_txt->Print(fb::kUnrecognised, number);
             return;
         }
-        static constexpr KindSpec kPoint{RecordKind::Point, {}, nullptr, kNoType};
+        static constexpr RecordKindWords kPoint{RecordKind::Point, {}, nullptr, kNoType};
         Read(kPoint, number);
         return;
     }
-    for (const KindSpec& kind : m_kinds) {
-        const FieldSpec& type = (*kind.fields)[kind.typeIndex];
+    for (const RecordKindWords& kind : m_kinds) {
+        const FieldPlace& type = (*kind.fields)[kind.typeIndex];
         if (EqualIgnoringCase(m_fields.Field(type, kind.typeIndex), kind.word)) {
             Read(kind, number);
             return;
@@ -121,7 +121,7 @@ void RecordBuilder::ReadLine(std::string_view line, int number) {
     if (m_txt) m_txt->Print(fb::kUnrecognised, number);
 }
 
-void RecordBuilder::Read(const KindSpec& kind, int line) {
+void RecordBuilder::Read(const RecordKindWords& kind, int line) {
     if (kind.kind == RecordKind::Code || kind.kind == RecordKind::Comment) {
         const std::string_view text = m_fields.After((*kind.fields)[kind.typeIndex], kind.typeIndex);
         if (kind.kind == RecordKind::Comment) {
@@ -133,9 +133,9 @@ void RecordBuilder::Read(const KindSpec& kind, int line) {
         }
         return;
     }
-    const std::vector<FieldSpec>& list = kind.kind == RecordKind::Station ? m_layout.station
-                                         : kind.kind == RecordKind::Point ? m_layout.point
-                                                                          : m_layout.sighting;
+    const std::vector<FieldPlace>& list = kind.kind == RecordKind::Station ? m_layout.station
+                                          : kind.kind == RecordKind::Point ? m_layout.point
+                                                                           : m_layout.sighting;
     Values v;
     if (!ReadValues(list, line, v)) return;
     if (v.mat.empty())
@@ -165,7 +165,7 @@ void RecordBuilder::Read(const KindSpec& kind, int line) {
     }
 }
 
-bool RecordBuilder::ReadValues(const std::vector<FieldSpec>& list, int line, Values& values) {
+bool RecordBuilder::ReadValues(const std::vector<FieldPlace>& list, int line, Values& values) {
     for (std::size_t i = 0; i < list.size(); ++i) {
         const RecordField field = list[i].field;
         if (field == RecordField::Type || field == RecordField::Ignore) continue;

@@ -36,10 +36,10 @@ public:
     virtual void Split(std::string_view line) = 0;
     // The text of a field, `index` being its rank in its list, its blanks trimmed; empty when the line
     // stops before it.
-    virtual std::string_view Field(const FieldSpec& spec, std::size_t index) const = 0;
+    virtual std::string_view Field(const FieldPlace& place, std::size_t index) const = 0;
     // Everything after that field to the end of the line, blanks trimmed: the text of a code or of a
     // comment.
-    virtual std::string_view After(const FieldSpec& spec, std::size_t index) const = 0;
+    virtual std::string_view After(const FieldPlace& place, std::size_t index) const = 0;
     // How many fields the line has past the `count` of a list, up to the last one holding something
     // (0 for a columnar line, whose columns past the last field are never read).
     virtual std::size_t Extra(std::size_t count) const = 0;

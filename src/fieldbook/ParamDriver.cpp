@@ -122,21 +122,21 @@ const char* FieldWord(RecordField field) {
 }
 
 // Reads "first-last" or "first-" (to the end of the line): columns counted from 1.
-bool ParseColumns(std::string_view text, FieldSpec& spec) {
+bool ParseColumns(std::string_view text, FieldPlace& place) {
     const std::size_t dash = text.find('-');
     if (dash == std::string_view::npos) return false;
     long long first = 0, last = 0;
     if (!ParseInt(text.substr(0, dash), first) || first < 1 || first > 100000) return false;
     const std::string_view end = Trimmed(text.substr(dash + 1));
     if (!end.empty() && (!ParseInt(end, last) || last < first || last > 100000)) return false;
-    spec.first = static_cast<int>(first);
-    spec.last = static_cast<int>(last);
+    place.first = static_cast<int>(first);
+    place.last = static_cast<int>(last);
     return true;
 }
 
-bool Contains(const std::vector<FieldSpec>& fields, RecordField field) {
+bool Contains(const std::vector<FieldPlace>& fields, RecordField field) {
     return std::any_of(fields.begin(), fields.end(),
-                       [field](const FieldSpec& f) { return f.field == field; });
+                       [field](const FieldPlace& f) { return f.field == field; });
 }
 
 // The fields a kind of record may hold, besides TYPE, CODE and IGNORE.
@@ -148,9 +148,9 @@ bool FieldFits(RecordField field, std::string_view key) {
     return field == X || field == Y || field == Z;
 }
 
-std::string CheckFieldList(std::string_view key, const std::vector<FieldSpec>& fields) {
-    for (const auto& spec : fields)
-        if (!FieldFits(spec.field, key)) return Sprintf(fb::kWhyFieldNotHere, FieldWord(spec.field));
+std::string CheckFieldList(std::string_view key, const std::vector<FieldPlace>& fields) {
+    for (const auto& place : fields)
+        if (!FieldFits(place.field, key)) return Sprintf(fb::kWhyFieldNotHere, FieldWord(place.field));
     if (!fields.empty() && !Contains(fields, RecordField::Matricule)) return fb::kWhyNoMatricule;
     return {};
 }
@@ -182,7 +182,7 @@ std::vector<std::string> SplitList(std::string_view text) {
     return items;
 }
 
-bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldSpec>& fields,
+bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldPlace>& fields,
                     std::string& error) {
     fields.clear();
     for (const std::string& item : SplitList(text)) {
@@ -195,8 +195,8 @@ bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldSpec>
             error = Sprintf(fb::kWhyUnknownField, word.c_str());
             return false;
         }
-        FieldSpec spec{name->field};
-        if (spec.field != RecordField::Ignore && Contains(fields, spec.field)) {
+        FieldPlace place{name->field};
+        if (place.field != RecordField::Ignore && Contains(fields, place.field)) {
             error = Sprintf(fb::kWhyFieldTwice, name->word);
             return false;
         }
@@ -208,11 +208,11 @@ bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldSpec>
             error = Sprintf(fb::kWhyColumnsInDelimited, name->word);
             return false;
         }
-        if (columnar && !ParseColumns(std::string_view(item).substr(colon + 1), spec)) {
+        if (columnar && !ParseColumns(std::string_view(item).substr(colon + 1), place)) {
             error = Sprintf(fb::kWhyBadColumns, name->word);
             return false;
         }
-        fields.push_back(spec);
+        fields.push_back(place);
     }
     return true;
 }
@@ -263,7 +263,7 @@ std::string CParamDriver::Validate() const {
             return Sprintf(fb::kMsgParamBadText, file, key.name, fb::kWhyEmptySeparator);
         const std::string_view name(key.name);
         if (name == kKeyChampsStation || name == kKeyChampsVisee || name == kKeyChampsPoint) {
-            std::vector<FieldSpec> fields;
+            std::vector<FieldPlace> fields;
             std::string why;
             if (ParseFieldList(value, m_format == FieldBookFormat::Colonne, fields, why))
                 why = CheckFieldList(name, fields);

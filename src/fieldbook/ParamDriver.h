@@ -67,11 +67,11 @@ enum class StationConvention {
 // The fields of a record of a delimited or columnar field book.
 enum class RecordField { Type, Matricule, HI, V0, HP, AH, AV, DI, X, Y, Z, Code, Ignore };
 
-struct FieldSpec {
+struct FieldPlace {
     RecordField field;
     int first = 0; // columnar: the first column (from 1); 0 in a delimited layout
     int last = 0;  // columnar: the last column, 0 for "to the end of the line"
-    bool operator==(const FieldSpec&) const = default;
+    bool operator==(const FieldPlace&) const = default;
 };
 
 // What a delimited or columnar settings file says of its records.
@@ -84,7 +84,7 @@ struct RecordLayout {
     std::string typeStation, typeReference, typeMesure, typePoint, typeCode, typeComment;
     // The fields of each kind of record, in their order (delimited) or with their columns (columnar). A
     // kind without fields is not read. When no list holds a TYPE field, every line is a point.
-    std::vector<FieldSpec> station, sighting, point;
+    std::vector<FieldPlace> station, sighting, point;
 };
 
 // The instrument-transfer parameter set of a format: the reader's own settings that a field book does
@@ -144,7 +144,8 @@ private:
 
 // Reads a list of fields, "TYPE,MATRICULE,X,Y,Z,CODE" (delimited) or "TYPE:1-2,MATRICULE:4-15,CODE:17-"
 // (columnar); the French reason in `error` when it is wrong.
-bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldSpec>& fields, std::string& error);
+bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldPlace>& fields,
+                    std::string& error);
 
 // The items of a list separated by commas, blanks trimmed, empty ones dropped.
 std::vector<std::string> SplitList(std::string_view text);

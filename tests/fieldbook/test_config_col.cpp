@@ -14,7 +14,7 @@ using Columnar = LayoutImportTest<CDlgConfigCol, FieldBookFormat::Colonne>;
 TEST(ColumnarFields, AFieldIsTakenAtItsColumns) {
     struct Case {
         std::string_view line;
-        FieldSpec spec;
+        FieldPlace place;
         std::string_view field;
         std::string_view after;
     };
@@ -34,8 +34,8 @@ TEST(ColumnarFields, AFieldIsTakenAtItsColumns) {
     CColumnarFields fields;
     for (const Case& c : cases) {
         fields.Split(c.line);
-        EXPECT_EQ(fields.Field(c.spec, 0), c.field) << c.line;
-        EXPECT_EQ(fields.After(c.spec, 0), c.after) << c.line;
+        EXPECT_EQ(fields.Field(c.place, 0), c.field) << c.line;
+        EXPECT_EQ(fields.After(c.place, 0), c.after) << c.line;
     }
 }
 

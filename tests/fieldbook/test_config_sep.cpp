@@ -52,7 +52,7 @@ TEST(DelimitedFields, ALineIsCutAtItsSeparator) {
 
 TEST(DelimitedFields, TheTextAfterAFieldRunsToTheEndOfTheLine) {
     CDelimitedFields fields(";");
-    const FieldSpec type{RecordField::Type};
+    const FieldPlace type{RecordField::Type};
     fields.Split("CO;Levé du 12 mars ; temps clair ");
     EXPECT_EQ(fields.After(type, 0), "Levé du 12 mars ; temps clair");
     fields.Split(R"(CO;"Levé ; ""clair""")");

@@ -107,7 +107,7 @@ TEST(ParamDriver, TheLayoutsOfTheDelimitedAndColumnarFiles) {
     EXPECT_EQ(layout.headerLines, 2);
     EXPECT_EQ(layout.typeStation, "ST");
     using F = RecordField;
-    EXPECT_EQ(layout.station, (std::vector<FieldSpec>{{F::Type}, {F::Matricule}, {F::Ignore}, {F::HI}}));
+    EXPECT_EQ(layout.station, (std::vector<FieldPlace>{{F::Type}, {F::Matricule}, {F::Ignore}, {F::HI}}));
     EXPECT_TRUE(layout.sighting.empty()); // not read
     EXPECT_EQ(layout.point.size(), 6u);
 
@@ -115,8 +115,8 @@ TEST(ParamDriver, TheLayoutsOfTheDelimitedAndColumnarFiles) {
     ASSERT_TRUE(columnar.Load(nullptr));
     const RecordLayout columns = columnar.Layout();
     EXPECT_TRUE(columns.columnar);
-    EXPECT_EQ(columns.point.front(), (FieldSpec{F::Type, 1, 2}));
-    EXPECT_EQ(columns.point.back(), (FieldSpec{F::Code, 62, 0}));
+    EXPECT_EQ(columns.point.front(), (FieldPlace{F::Type, 1, 2}));
+    EXPECT_EQ(columns.point.back(), (FieldPlace{F::Code, 62, 0}));
 }
 
 // The "editor": the file shown; a new one is a copy of the installation's, or holds the defaults.
