@@ -158,19 +158,21 @@ void CFieldBookReader::AddComment(std::string text) {
     Result().Add(std::make_unique<CComment>(std::move(text)), kKindComment);
 }
 
-CElement* CFieldBookReader::AddCode(std::string_view code) {
+CElement* CFieldBookReader::AddCode(std::string_view code, std::string_view point) {
     code = Trimmed(code);
     if (code.empty()) return nullptr;
+    // Named before it is added: renaming an element of the store would have it indexed again.
     if (Choices().interpret && m_table) {
-        std::vector<std::string> words;
-        m_table->Make_str_cmd(code, words);
+        m_table->Make_str_cmd(code, m_words);
         int kind = 0;
-        if (auto command = m_table->InterpreteTexte(words, kind)) {
+        if (auto command = m_table->InterpreteTexte(m_words, kind)) {
+            if (!point.empty()) command->setMat(std::string(point));
             const int index = Result().Add(std::move(command), kind);
             if (index >= 0) return Result().GetAt(index);
         }
     }
-    const int index = Result().Add(std::make_unique<CCommande>(std::string(code)), kKindCommand);
+    const int index = Result().Add(
+        std::make_unique<CCommande>(std::string(code), std::string(), std::string(point)), kKindCommand);
     return Result().GetAt(index);
 }
 

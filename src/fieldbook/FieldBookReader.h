@@ -124,8 +124,8 @@ protected:
     // A field code: with interpretation on, split into its words and interpreted through the code table;
     // the command it stands for is appended with its kind. Otherwise, or when the table knows no such
     // code, the text is kept as it stands as an uninterpreted command (1009). An empty code adds nothing.
-    // Returns the command added, or null.
-    CElement* AddCode(std::string_view code);
+    // The command carries the point it was written for, when given. Returns the command added, or null.
+    CElement* AddCode(std::string_view code, std::string_view point = {});
     // Splits a field holding a point's name followed by its code at the code position of the table's
     // separator; without a table the whole field is the name.
     void SplitNameAndCode(std::string_view field, std::string& name, std::string& code) const;
@@ -147,6 +147,7 @@ private:
 
     const ReadingChoices* m_choices = nullptr;
     const CTableCode* m_table = nullptr;
+    std::vector<std::string> m_words; // the words of the last code, kept for the next one
     const CParamDriver* m_driver = nullptr;
     CPyrTxtWnd* m_txt = nullptr;
     ui::FrontEnd* m_parent = nullptr;

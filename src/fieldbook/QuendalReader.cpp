@@ -176,8 +176,7 @@ void CQuendalReader::ReadCode(int line, bool interpreted) {
     std::string parameters(m_fields[2]);
     if (!interpreted && Choices().interpret && CodeTable()) {
         // The command keeps the point the code was written for.
-        if (CElement* command = AddCode(parameters.empty() ? word : word + ' ' + parameters))
-            if (!m_fields[3].empty()) command->setMat(std::string(m_fields[3]));
+        AddCode(parameters.empty() ? word : word + ' ' + parameters, m_fields[3]);
         return;
     }
     const int kind = interpreted ? CommandKind(word) : kKindCommand;
