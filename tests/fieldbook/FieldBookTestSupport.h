@@ -19,6 +19,14 @@ inline std::string DefaultCodeTable() {
     return std::string(PYR_SOURCE_DIR) + "/data/Config/Defaut.cod";
 }
 
+// The texts of the message boxes shown, in order, "|" between them.
+inline std::string MessageTexts(const pyr::ui::ScriptedFrontEnd& frontEnd) {
+    std::string texts;
+    for (const auto& message : frontEnd.messages)
+        texts += (texts.empty() ? "" : "|") + message.text;
+    return texts;
+}
+
 // A reader with its choices, its window and its front end, reading into `result`.
 template <class Reader>
 struct ReaderRun {

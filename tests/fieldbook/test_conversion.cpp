@@ -71,28 +71,15 @@ protected:
 
 } // namespace
 
+// What is written and said is run end to end by the host's tests; here, what the settings keep.
 TEST_F(Conversion, ANewGeoBaseIsWrittenBesideTheFieldBookAndRecorded) {
     EXPECT_EQ(Convert({dir / "carnet.qdl"}), DialogResult::Ok);
-    CCarnet written;
-    ASSERT_TRUE(written.Load(nullptr, dir / "carnet.geo"));
-    ASSERT_EQ(written.GetSize(), 3);
-    EXPECT_EQ(written.GetType(0), kKindStation);
-    EXPECT_EQ(written.GetType(2), kKindMesure);
-    EXPECT_TRUE(Said(" ... terminée : 3 lignes écrites."));
-    EXPECT_TRUE(Said("GéoBase créée = <" + dir / "carnet.geo" + ">."));
     EXPECT_EQ(frontEnd.dialogs, std::vector<std::string>{"Lecture du carnet Quendal-Pc"});
-    // The dialog's values and the last file.
+    EXPECT_TRUE(Said("GéoBase créée = <" + dir / "carnet.geo" + ">."));
     EXPECT_EQ(Key("Carnet.Quendal", "Carnet"), dir / "carnet.qdl");
-    EXPECT_EQ(Key("Carnet.Quendal", "Interprétation"), "0");
-    EXPECT_EQ(Key("Carnet.Quendal", "EcrireAppareil"), "0");
+    EXPECT_EQ(Key("Carnet.Quendal", "Interprétation") + Key("Carnet.Quendal", "EcrireAppareil"), "00");
     EXPECT_EQ(ReadLastGeoBase(Params()), dir / "carnet.geo");
     EXPECT_EQ(LastFile(), dir / "carnet.geo");
-    // The next conversion offers that field book again.
-    frontEnd.fileChoices.clear();
-    frontEnd.answers = {Answer::Yes}; // the GéoBase exists now: replaced
-    EXPECT_EQ(Convert({}), DialogResult::Ok);
-    ASSERT_EQ(frontEnd.fileChoices.size(), 1u);
-    EXPECT_EQ(frontEnd.fileChoices[0].startPath, dir / "carnet.qdl");
 }
 
 TEST_F(Conversion, AFieldBookWithNothingToReadMakesAnEmptyGeoBase) {
@@ -137,8 +124,7 @@ TEST_F(Conversion, AFailedWriteLeavesTheLastFileKeysAsTheyWere) {
     WriteLastGeoBase(Params(), "avant.geo");
     WriteParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "avant.geo");
     EXPECT_EQ(Convert({dir / "carnet.qdl", "--geobase", dir / "absent/carnet.geo"}), DialogResult::Failed);
-    ASSERT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(frontEnd.messages[0].text, "Impossible d'écrire dans la GéoBase indiquée !");
+    EXPECT_EQ(MessageTexts(frontEnd), "Impossible d'écrire dans la GéoBase indiquée !");
     EXPECT_EQ(ReadLastGeoBase(Params()), "avant.geo");
     EXPECT_EQ(LastFile(), "avant.geo");
     EXPECT_FALSE(fs::exists(dir / "absent"));
@@ -171,8 +157,7 @@ TEST_F(Conversion, AMergeAppendsInReadingOrderWithTheInstrumentFirst) {
     EXPECT_FALSE(fs::exists(dir / "carnet.geo"));
     EXPECT_EQ(LastFile(), "");
     // The editor held no code table: this format says it in its own words.
-    ASSERT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(frontEnd.messages[0].text, "Cas impossible en théorie !!!");
+    EXPECT_EQ(MessageTexts(frontEnd), "Cas impossible en théorie !!!");
 }
 
 TEST_F(Conversion, EachFormatSaysInItsWordsThatTheEditorHasNoCodeTable) {
@@ -186,8 +171,7 @@ TEST_F(Conversion, EachFormatSaysInItsWordsThatTheEditorHasNoCodeTable) {
         converter.makeReader = [] { return std::make_unique<CQuendalReader>(); };
         converter.showDialog = [](CLectCarnet&) { return DialogResult::Cancel; };
         RunConversion(converter, nullptr);
-        ASSERT_EQ(fe.messages.size(), 1u);
-        EXPECT_EQ(fe.messages[0].text, text);
+        EXPECT_EQ(MessageTexts(fe), text);
         // A table the editor holds is used, and named in the dialog.
         CTableCode table;
         ASSERT_TRUE(table.Init(DefaultCodeTable()));
@@ -247,47 +231,43 @@ TEST_F(Conversion, WithoutATableOfItsOwnTheJobUsesTheDefaultOne) {
     EXPECT_TRUE(frontEnd.questions.empty());
 }
 
-// The Wild format's pre-formatting program writes "<name>.tmp", which is read instead and then deleted.
-TEST_F(Conversion, ThePreformattingProgramRunsAndAMissingOneIsSaid) {
+// The Wild format's pre-formatting program writes "<name>.tmp", which is read instead and then deleted; a
+// zero prism height is told when the format tests it, and that key is read, never written back.
+TEST_F(Conversion, TheWildSettingsPreformattingAndZeroPrismHeight) {
     const std::string script = dir / "préformat.sh";
     WriteBytes(script, "#!/bin/sh\nsed 's/^X;/MESURE;/' \"$1\" > \"${1%.*}.tmp\"\n");
     chmod(script.c_str(), 0755);
-    WriteBytes(dir / "levé.gsi", "STATION;S1;1.5\nX;101;1.3;10;100;25\n");
-    for (const bool present : {true, false}) {
+    const std::string book = "STATION;S1;1.5\nX;101;1.3;10;100;25\n",
+                      zero = "STATION;S1;1.5\nMESURE;101;0;10;100;25\n";
+    const std::string noProgram =
+        "Impossible de trouver le programme de préformattage :\n" + dir / "absent.sh";
+    const std::string zeroHp = "Certaines observations ont une hauteur de prisme à zéro !";
+    const struct {
+        std::string program, testHp, book;
+        int size;
+        std::string message;
+    } cases[] = {
+        {script, "0", book, 2, ""},
+        {dir / "absent.sh", "0", book, 1, noProgram},
+        {"", "1", zero, 2, zeroHp},
+        {"", "0", zero, 2, ""},
+    };
+    for (const auto& c : cases) {
         frontEnd = {};
         fs::remove(dir / "levé.geo");
-        WriteParamString(Params(), "Carnet.Wild", kKeyPreformattage, present ? script : dir / "absent.sh");
-        EXPECT_EQ(Convert({dir / "levé.gsi"}, nullptr, FieldBookFormat::Wild), DialogResult::Ok);
+        WriteBytes(dir / "levé.gsi", c.book);
+        WriteParamString(Params(), "Carnet.Wild", kKeyPreformattage, c.program);
+        WriteParamString(Params(), "Carnet.Wild", kKeyTestHpNulle, c.testHp);
+        EXPECT_EQ(Convert({dir / "levé.gsi"}, nullptr, FieldBookFormat::Wild), DialogResult::Ok) << c.message;
         CCarnet written;
         ASSERT_TRUE(written.Load(nullptr, dir / "levé.geo"));
-        EXPECT_EQ(written.GetSize(), present ? 2 : 1);
+        EXPECT_EQ(written.GetSize(), c.size) << c.message;
         EXPECT_FALSE(fs::exists(dir / "levé.tmp"));
-        EXPECT_EQ(ReadBytes(dir / "levé.gsi"), "STATION;S1;1.5\nX;101;1.3;10;100;25\n");
-        if (present) {
-            EXPECT_TRUE(frontEnd.messages.empty());
-        } else {
-            ASSERT_EQ(frontEnd.messages.size(), 1u);
-            EXPECT_EQ(frontEnd.messages[0].text,
-                      "Impossible de trouver le programme de préformattage :\n" + dir / "absent.sh");
-            EXPECT_TRUE(Said("Erreur ligne 2 : donnée non reconnue !"));
-        }
+        EXPECT_EQ(ReadBytes(dir / "levé.gsi"), c.book);
+        EXPECT_EQ(MessageTexts(frontEnd), c.message);
+        EXPECT_TRUE(c.message != zeroHp || frontEnd.messages.at(0).icon == ui::kIconInformation);
+        EXPECT_EQ(c.message == noProgram, Said("Erreur ligne 2 : donnée non reconnue !"));
     }
-}
-
-TEST_F(Conversion, AZeroPrismHeightIsToldWhenTheFormatTestsIt) {
-    WriteBytes(dir / "zero.gsi", "STATION;S1;1.5\nMESURE;101;0;10;100;25\n");
-    for (const auto& [test, told] : {std::pair{"1", true}, std::pair{"0", false}}) {
-        frontEnd = {};
-        fs::remove(dir / "zero.geo");
-        WriteParamString(Params(), "Carnet.Wild", kKeyTestHpNulle, test);
-        EXPECT_EQ(Convert({dir / "zero.gsi"}, nullptr, FieldBookFormat::Wild), DialogResult::Ok);
-        ASSERT_EQ(frontEnd.messages.size(), told ? 1u : 0u);
-        if (told) {
-            EXPECT_EQ(frontEnd.messages[0].text, "Certaines observations ont une hauteur de prisme à zéro !");
-            EXPECT_EQ(frontEnd.messages[0].icon, ui::kIconInformation);
-        }
-    }
-    // The test key is read, never written back.
     EXPECT_EQ(Key("Carnet.Wild", kKeyTestHpNulle), "0");
     EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), install + "Config/Wild.ini");
 }
@@ -296,9 +276,8 @@ TEST_F(Conversion, AFormatWithoutItsReaderYetSaysSo) {
     auto converter = Make(FieldBookFormat::Sokkia);
     converter->makeReader = [] { return nullptr; }; // a format whose reader is not built yet
     EXPECT_EQ(RunConversion(*converter, nullptr), DialogResult::Failed);
-    ASSERT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(frontEnd.messages[0].text, "La lecture des carnets Sokkia n'est pas encore disponible dans "
-                                         "cette version de PYRALIS Calculs Topo.");
+    EXPECT_EQ(MessageTexts(frontEnd), "La lecture des carnets Sokkia n'est pas encore disponible dans "
+                                      "cette version de PYRALIS Calculs Topo.");
     EXPECT_TRUE(frontEnd.dialogs.empty());
 }
 

@@ -17,9 +17,9 @@ protected:
     LectCarnet() : params(dir / "Pyralis.ini"), dialog(FieldBookFormat::Wild, params, dir.Path("")) {
         WriteBytes(dir / "carnet.gsi", "STATION;S1;1.5\n");
         WriteBytes(dir / "Wild.ini", "[Parametrage]\n");
-        WriteBytes(dir / "job.cod", "Séparateur = A...Z\nPIQ ExcentRad\n");
         dialog.SetCarnetFromSettings(dir / "carnet.gsi");
         dialog.SetParamFile(dir / "Wild.ini");
+        dialog.SetInstruments({{"Appareil Standard"}, {"TCR 307"}});
     }
     TempDir dir;
     CParamFile params;
@@ -35,64 +35,50 @@ TEST_F(LectCarnet, WhatTheDialogShows) {
     dialog.SetCreateNew(false);
     EXPECT_FALSE(dialog.GeoBaseFieldVisible());
     // The instrument combo and the code table follow their boxes.
-    EXPECT_FALSE(dialog.InstrumentEnabled());
-    EXPECT_FALSE(dialog.CodeTableEnabled());
+    EXPECT_FALSE(dialog.InstrumentEnabled() || dialog.CodeTableEnabled());
     dialog.SetWriteInstrument(true);
     dialog.SetInterpret(true);
-    EXPECT_TRUE(dialog.InstrumentEnabled());
-    EXPECT_TRUE(dialog.CodeTableEnabled());
+    EXPECT_TRUE(dialog.InstrumentEnabled() && dialog.CodeTableEnabled());
     // The instrument named by the settings, else the first of the list.
-    dialog.SetInstruments({{"Appareil Standard"}, {"TCR 307"}});
     dialog.SetInstrumentName("TCR 307");
     EXPECT_EQ(dialog.InstrumentIndex(), 1);
     dialog.SetInstrumentName("Disparu");
     EXPECT_EQ(dialog.InstrumentIndex(), 0);
     EXPECT_EQ(dialog.Choices().instrumentName, "Appareil Standard");
-}
-
-// An empty "Carnet" key leaves the GéoBase to create empty until a field book is chosen.
-TEST_F(LectCarnet, ChoosingAFieldBookNamesTheGeoBaseBesideIt) {
+    // An empty "Carnet" key leaves the GéoBase empty until a field book is chosen beside which it is named.
     dialog.SetCarnetFromSettings("");
     EXPECT_EQ(dialog.GeoBasePath(), "");
-    frontEnd.files.push_back(dir / "levé.du.3.txt");
+    frontEnd.files = {dir / "levé.du.3.txt", std::nullopt}; // then the person cancels: nothing changes
     EXPECT_TRUE(dialog.BrowseCarnet(frontEnd));
     EXPECT_EQ(dialog.GeoBasePath(), dir / "levé.du.3.geo");
-    frontEnd.files.push_back(std::nullopt); // the person cancels: nothing changes
     EXPECT_FALSE(dialog.BrowseCarnet(frontEnd));
     EXPECT_EQ(dialog.Carnet(), dir / "levé.du.3.txt");
 }
 
 TEST_F(LectCarnet, TheBrowseButtonsTitlesAndFilters) {
-    dialog.BrowseCarnet(frontEnd);
     dialog.BrowseGeoBase(frontEnd);
     dialog.BrowseParamFile(frontEnd);
     dialog.BrowseCodeTable(frontEnd);
-    CLectCarnet delimited(FieldBookFormat::Separateur, params, "");
-    delimited.BrowseParamFile(frontEnd);
-    CLectCarnet columnar(FieldBookFormat::Colonne, params, "");
-    columnar.BrowseParamFile(frontEnd);
+    CLectCarnet(FieldBookFormat::Separateur, params, "").BrowseParamFile(frontEnd);
+    CLectCarnet(FieldBookFormat::Colonne, params, "").BrowseParamFile(frontEnd);
+    dialog.BrowseCarnet(frontEnd);
+    const std::string params = "Sélectionnez le fichier de paramétrage à utiliser :";
     const struct {
         bool save;
-        const char* title;
-        const char* filter;
-        const char* extension;
+        std::string title, filter, extension;
     } expected[] = {
-        {false, "Sélectionnez le fichier carnet à traiter :", "Tous les fichiers (*.*)|*.*||", ""},
         {true, "Nom de la GéoBase à créer :", "GéoBase PYRALIS (*.geo)|*.geo||", "geo"},
-        {false, "Sélectionnez le fichier de paramétrage à utiliser :",
-         "Fichiers de paramètres (*.ini)|*.ini||", "ini"},
+        {false, params, "Fichiers de paramètres (*.ini)|*.ini||", "ini"},
         {false, "Nom de la table à utiliser :", "Table de Codes PYRALIS (*.cod)|*.cod||", "cod"},
-        {false, "Sélectionnez le fichier de paramétrage à utiliser :",
-         "Fichiers de paramètres (*.sep)|*.sep||", "sep"},
-        {false, "Sélectionnez le fichier de paramétrage à utiliser :",
-         "Fichiers de paramètres (*.col)|*.col||", "col"},
+        {false, params, "Fichiers de paramètres (*.sep)|*.sep||", "sep"},
+        {false, params, "Fichiers de paramètres (*.col)|*.col||", "col"},
+        {false, "Sélectionnez le fichier carnet à traiter :", "Tous les fichiers (*.*)|*.*||", ""},
     };
     ASSERT_EQ(frontEnd.fileChoices.size(), std::size(expected));
     for (std::size_t i = 0; i < std::size(expected); ++i) {
-        EXPECT_EQ(frontEnd.fileChoices[i].save, expected[i].save) << i;
-        EXPECT_EQ(frontEnd.fileChoices[i].title, expected[i].title) << i;
-        EXPECT_EQ(frontEnd.fileChoices[i].filter, expected[i].filter) << i;
-        EXPECT_EQ(frontEnd.fileChoices[i].defaultExtension, expected[i].extension) << i;
+        const auto& choice = frontEnd.fileChoices[i];
+        EXPECT_EQ(std::tie(choice.save, choice.title, choice.filter, choice.defaultExtension),
+                  std::tie(expected[i].save, expected[i].title, expected[i].filter, expected[i].extension));
     }
 }
 
@@ -102,113 +88,83 @@ TEST_F(LectCarnet, TheChecksOfOkInTheirOrder) {
         "Aucune table de codes n'est indiquée.\nVoulez-vous qu'aucune commande ne soit "
         "interprétée ?";
     const std::string missingTable =
-        "La table de codes indiquée n'existe pas.\nVoulez-vous qu'aucune commande ne "
-        "soit interprétée ?";
+        "La table de codes indiquée n'existe pas.\nVoulez-vous qu'aucune commande "
+        "ne soit interprétée ?";
     const std::string replace = "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?";
-    struct Case {
-        const char* what;
-        std::function<void(CLectCarnet&)> set;
-        std::vector<Answer> answers;
+    const std::string badIni =
+        "Fichier de paramétrage <" + dir / "Wild.ini" +
+        "> :\nvaleur « toutes » incorrecte pour References (valeurs possibles : aucune, "
+        "premiere, codes) !";
+    const std::string noCarnet = "Le fichier carnet indiqué n'existe pas !";
+    const std::string noParams = "Le fichier de paramétrage indiqué n'existe pas !";
+    struct Setup {
+        const char *carnet = nullptr, *paramFile = nullptr, *table = nullptr,
+                   *ini = nullptr; // nullptr: the fixture's
+        bool interpret = false, geoExists = false;
+    };
+    struct Expected {
         DialogResult result;
         Field focus;
-        std::vector<std::string> questions;
-        std::string message;
+        std::vector<std::string> questions = {};
+        std::string message = {};
     };
-    const std::string geo = dir / "carnet.geo";
-    const Case cases[] = {
-        {"tout va bien", [](CLectCarnet&) {}, {}, DialogResult::Ok, Field::None, {}, ""},
+    const struct {
+        const char* what;
+        Setup s;
+        std::vector<Answer> answers;
+        Expected e;
+    } cases[] = {
+        {"tout va bien", {}, {}, {DialogResult::Ok, Field::None}},
         {"carnet absent, et tout le reste faux",
-         [&](CLectCarnet& d) {
-             d.SetCarnet(dir / "absent.gsi");
-             d.SetParamFile(dir / "absent.ini");
-             d.SetInterpret(true);
-         },
+         {"absent.gsi", "absent.ini", nullptr, nullptr, true, true},
          {},
-         DialogResult::Failed,
-         Field::Carnet,
-         {},
-         "Le fichier carnet indiqué n'existe pas !"},
+         {DialogResult::Failed, Field::Carnet, {}, noCarnet}},
         {"paramétrage absent",
-         [&](CLectCarnet& d) { d.SetParamFile(dir / "absent.ini"); },
+         {nullptr, "absent.ini"},
          {},
-         DialogResult::Failed,
-         Field::ParamFile,
-         {},
-         "Le fichier de paramétrage indiqué n'existe pas !"},
+         {DialogResult::Failed, Field::ParamFile, {}, noParams}},
         {"pas de table, non",
-         [](CLectCarnet& d) { d.SetInterpret(true); },
+         {.interpret = true},
          {Answer::No},
-         DialogResult::Cancel,
-         Field::CodeTable,
-         {noTable},
-         ""},
+         {DialogResult::Cancel, Field::CodeTable, {noTable}}},
         {"table absente, oui",
-         [&](CLectCarnet& d) {
-             d.SetInterpret(true);
-             d.SetCodeTablePath("  " + dir / "absente.cod" + " ");
-         },
+         {nullptr, nullptr, "absente.cod", nullptr, true},
          {Answer::Yes},
-         DialogResult::Ok,
-         Field::None,
-         {missingTable},
-         ""},
+         {DialogResult::Ok, Field::None, {missingTable}}},
         {"paramétrage faux",
-         [&](CLectCarnet&) { WriteBytes(dir / "Wild.ini", "[Parametrage]\nReferences=toutes\n"); },
+         {.ini = "[Parametrage]\nReferences=toutes\n"},
          {},
-         DialogResult::Failed,
-         Field::CodeTable,
-         {},
-         "Fichier de paramétrage <" + dir / "Wild.ini" +
-             "> :\nvaleur « toutes » incorrecte pour References (valeurs possibles : aucune, premiere, "
-             "codes) !"},
+         {DialogResult::Failed, Field::CodeTable, {}, badIni}},
         {"GéoBase existante, non",
-         [&](CLectCarnet&) { WriteBytes(geo, ""); },
+         {.geoExists = true},
          {Answer::No},
-         DialogResult::Cancel,
-         Field::GeoBase,
-         {replace},
-         ""},
+         {DialogResult::Cancel, Field::GeoBase, {replace}}},
         {"GéoBase existante, oui",
-         [&](CLectCarnet&) { WriteBytes(geo, ""); },
+         {.geoExists = true},
          {Answer::Yes},
-         DialogResult::Ok,
-         Field::None,
-         {replace},
-         ""},
+         {DialogResult::Ok, Field::None, {replace}}},
     };
-    for (const Case& c : cases) {
-        WriteBytes(dir / "Wild.ini", "[Parametrage]\n");
-        std::filesystem::remove(geo);
+    for (const auto& c : cases) {
+        WriteBytes(dir / "Wild.ini", c.s.ini ? c.s.ini : "[Parametrage]\n");
+        std::filesystem::remove(dir / "carnet.geo");
+        if (c.s.geoExists) WriteBytes(dir / "carnet.geo", "");
         CLectCarnet d(FieldBookFormat::Wild, params, "");
         d.SetCarnetFromSettings(dir / "carnet.gsi");
-        d.SetParamFile(dir / "Wild.ini");
-        c.set(d);
+        if (c.s.carnet) d.SetCarnet(dir / c.s.carnet);
+        d.SetParamFile(dir / (c.s.paramFile ? c.s.paramFile : "Wild.ini"));
+        d.SetInterpret(c.s.interpret);
+        if (c.s.table) d.SetCodeTablePath("  " + dir / c.s.table + " ");
         ui::ScriptedFrontEnd fe;
         fe.answers.assign(c.answers.begin(), c.answers.end());
-        EXPECT_EQ(d.OnOK(fe), c.result) << c.what;
-        EXPECT_EQ(d.FocusField(), c.focus) << c.what;
-        EXPECT_EQ(fe.questions, c.questions) << c.what;
-        if (c.message.empty()) {
-            EXPECT_TRUE(fe.messages.empty()) << c.what;
-        } else {
-            ASSERT_EQ(fe.messages.size(), 1u) << c.what;
-            EXPECT_EQ(fe.messages[0].text, c.message) << c.what;
-        }
+        EXPECT_EQ(d.OnOK(fe), c.e.result) << c.what;
+        EXPECT_EQ(d.FocusField(), c.e.focus) << c.what;
+        EXPECT_EQ(fe.questions, c.e.questions) << c.what;
+        EXPECT_EQ(MessageTexts(fe), c.e.message) << c.what;
+        // Going on without the missing table reads the codes as they stand; the box stays ticked.
+        EXPECT_TRUE(!c.s.table || (d.NoCodeTable() && !d.Choices().interpret && d.Interpret()));
     }
-}
-
-// Going on without the missing table reads the codes as they stand.
-TEST_F(LectCarnet, WithoutItsTableNoCommandIsInterpreted) {
-    dialog.SetInterpret(true);
-    frontEnd.answers = {Answer::Yes};
-    ASSERT_EQ(dialog.OnOK(frontEnd), DialogResult::Ok);
-    EXPECT_TRUE(dialog.NoCodeTable());
-    EXPECT_FALSE(dialog.Choices().interpret);
-    EXPECT_TRUE(dialog.Interpret()); // the box stays ticked
-}
-
-// The Quendal-Pc dialog has no parameter file to check.
-TEST_F(LectCarnet, TheQuendalDialogHasNoParameterFile) {
+    // The Quendal-Pc dialog has no parameter file to check.
+    std::filesystem::remove(dir / "carnet.geo");
     CLecQuendal quendal(params, "");
     quendal.SetCarnetFromSettings(dir / "carnet.gsi");
     EXPECT_EQ(quendal.Caption(), "Lecture du carnet Quendal-Pc");
@@ -217,19 +173,21 @@ TEST_F(LectCarnet, TheQuendalDialogHasNoParameterFile) {
 }
 
 TEST_F(LectCarnet, EditingTheParametersAsksToCreateAMissingFileAndShowsIt) {
+    dialog.ShowFieldFile(frontEnd, Field::Carnet);
+    dialog.ShowFieldFile(frontEnd, Field::CodeTable); // none named: a file is shown only when it exists
     dialog.SetParamFile(dir / "Nouveau.ini");
+    dialog.ShowFieldFile(frontEnd, Field::ParamFile);
+    EXPECT_EQ(frontEnd.shownFiles, std::vector<std::string>{dir / "carnet.gsi"});
     frontEnd.answers = {Answer::No, Answer::Yes};
     EXPECT_FALSE(dialog.OnEditParams(frontEnd));
     EXPECT_EQ(dialog.FocusField(), Field::ParamFile);
-    EXPECT_TRUE(frontEnd.shownFiles.empty());
+    EXPECT_EQ(frontEnd.shownFiles.size(), 1u);
     EXPECT_TRUE(dialog.OnEditParams(frontEnd));
     EXPECT_EQ(frontEnd.questions,
-              std::vector<std::string>(
-                  2, "Le fichier de paramétrage indiqué n'existe pas !\nVoulez-vous en créer un "
-                     "nouveau ?"));
-    EXPECT_EQ(frontEnd.shownFiles, std::vector<std::string>{dir / "Nouveau.ini"});
+              std::vector<std::string>(2, "Le fichier de paramétrage indiqué n'existe pas "
+                                          "!\nVoulez-vous en créer un nouveau ?"));
+    EXPECT_EQ(frontEnd.shownFiles, (std::vector<std::string>{dir / "carnet.gsi", dir / "Nouveau.ini"}));
     EXPECT_TRUE(std::filesystem::exists(dir / "Nouveau.ini"));
-
     // The delimited layout is also recorded for the loading of points.
     CLectCarnet delimited(FieldBookFormat::Separateur, params, "");
     delimited.SetParamFile(dir / "Mon.sep");
@@ -240,32 +198,20 @@ TEST_F(LectCarnet, EditingTheParametersAsksToCreateAMissingFileAndShowsIt) {
     EXPECT_EQ(recorded, dir / "Mon.sep");
 }
 
-TEST_F(LectCarnet, AFieldsFileIsShownOnlyWhenItExists) {
-    dialog.ShowFieldFile(frontEnd, Field::Carnet);
-    dialog.ShowFieldFile(frontEnd, Field::CodeTable); // none named
-    dialog.SetParamFile(dir / "absent.ini");
-    dialog.ShowFieldFile(frontEnd, Field::ParamFile);
-    EXPECT_EQ(frontEnd.shownFiles, std::vector<std::string>{dir / "carnet.gsi"});
-}
-
 // From a command line: the field book as the positional word, the values replacing the settings'.
 TEST_F(LectCarnet, ACommandLineReplacesTheValuesOfTheSettings) {
-    dialog.SetInstruments({{"Appareil Standard"}, {"TCR 307"}});
     frontEnd.dialogArguments = {
         dir / "carnet.gsi", "--geobase",  dir / "autre.geo", "--interpretation",  "1", "--table",
         dir / "job.cod",    "--appareil", "TCR 307",         "--ecrire-appareil", "1"};
     EXPECT_EQ(frontEnd.DoModal(dialog), DialogResult::Ok);
     EXPECT_TRUE(frontEnd.fileChoices.empty()); // the field book was named: nothing offered
     EXPECT_EQ(dialog.GeoBasePath(), dir / "autre.geo");
-    EXPECT_TRUE(dialog.Interpret());
     EXPECT_EQ(dialog.CodeTablePath(), dir / "job.cod");
     EXPECT_EQ(dialog.InstrumentName(), "TCR 307");
-    EXPECT_TRUE(dialog.WriteInstrument());
-
+    EXPECT_TRUE(dialog.Interpret() && dialog.WriteInstrument());
     ui::ScriptedFrontEnd refused;
     refused.dialogArguments = {"--appareil", "Disparu"};
     EXPECT_EQ(refused.DoModal(dialog), DialogResult::Failed);
-    ASSERT_EQ(refused.messages.size(), 1u);
-    EXPECT_EQ(refused.messages[0].text,
+    EXPECT_EQ(MessageTexts(refused),
               "L'appareil « Disparu » n'est pas dans la liste des appareils des options.");
 }

@@ -82,8 +82,7 @@ TEST(ParamDriver, AWrongValueIsRefusedWithItsReason) {
         ui::ScriptedFrontEnd frontEnd;
         CParamDriver driver("", c.path, c.format);
         EXPECT_FALSE(driver.Load(&frontEnd)) << c.contents;
-        ASSERT_EQ(frontEnd.messages.size(), 1u) << c.contents;
-        EXPECT_EQ(frontEnd.messages[0].text, "Fichier de paramétrage <" + c.path + "> :\n" + c.why);
+        EXPECT_EQ(MessageTexts(frontEnd), "Fichier de paramétrage <" + c.path + "> :\n" + c.why);
     }
     ui::ScriptedFrontEnd frontEnd;
     CParamDriver missing("", dir / "absent.ini", FieldBookFormat::Zeiss);
