@@ -10,17 +10,7 @@
 template <class Config, pyr::FieldBookFormat kFormat>
 class LayoutImportTest : public ::testing::Test {
 protected:
-    pyr::CCarnet& Import(std::string_view text) {
-        Config::ImportText(layout, text, records, &txt);
-        return records;
-    }
-    // A layout without a TYPE field, whose lines are all points.
-    void PointsOnly(const char* fields) {
-        layout.SetText(pyr::kKeyChampsStation, "");
-        layout.SetText(pyr::kKeyChampsVisee, "");
-        layout.SetText(pyr::kKeyChampsPoint, fields);
-        ASSERT_EQ(layout.Validate(), "");
-    }
+    void Import(std::string_view text) { Config::ImportText(layout, text, records, &txt); }
 
     pyr::CParamDriver layout{"", "", kFormat};
     pyr::ui::ScriptedFrontEnd frontEnd;
