@@ -27,6 +27,14 @@ inline std::string MessageTexts(const pyr::ui::ScriptedFrontEnd& frontEnd) {
     return texts;
 }
 
+// The kinds of a GéoBase's elements, in order.
+inline std::vector<int> Kinds(const pyr::CCarnet& carnet) {
+    std::vector<int> kinds;
+    for (int i = 0; i < carnet.GetSize(); ++i)
+        kinds.push_back(carnet.GetType(i));
+    return kinds;
+}
+
 // A reader with its choices, its window and its front end, reading into `result`.
 template <class Reader>
 struct ReaderRun {

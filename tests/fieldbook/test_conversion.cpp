@@ -146,11 +146,8 @@ TEST_F(Conversion, AMergeAppendsInReadingOrderWithTheInstrumentFirst) {
     frontEnd.dialogArguments = {dir / "carnet.qdl", "--ecrire-appareil", "1", "--appareil", "TCR 307"};
     EXPECT_EQ(RunConversion(*converter, &target), DialogResult::Ok);
     EXPECT_FALSE(geoBaseShown);
-    const std::vector<int> kinds{kKindComment, kKindPoint,     kKindAppareil,
-                                 kKindStation, kKindReference, kKindMesure};
-    ASSERT_EQ(target.GetSize(), static_cast<int>(kinds.size()));
-    for (int i = 0; i < target.GetSize(); ++i)
-        EXPECT_EQ(target.GetType(i), kinds[static_cast<std::size_t>(i)]) << i;
+    ASSERT_EQ(Kinds(target), (std::vector<int>{kKindComment, kKindPoint, kKindAppareil, kKindStation,
+                                               kKindReference, kKindMesure}));
     EXPECT_EQ(target.matAt(2), "TCR 307");
     EXPECT_EQ(target.matAt(5), "102");
     EXPECT_EQ(converter->result.GetSize(), 0);
@@ -213,9 +210,7 @@ TEST_F(Conversion, TheDefaultCodeTableIsNeitherReloadedNorSaved) {
         EXPECT_EQ(converter->codeTable->FileName(), c.kept) << c.table;
         CCarnet written;
         ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
-        ASSERT_EQ(written.GetSize(), 3);
-        EXPECT_EQ(written.GetType(1), c.firstKind) << c.table;
-        EXPECT_EQ(written.GetType(2), c.secondKind) << c.table;
+        EXPECT_EQ(Kinds(written), (std::vector<int>{kKindStation, c.firstKind, c.secondKind})) << c.table;
     }
 }
 
@@ -225,8 +220,7 @@ TEST_F(Conversion, WithoutATableOfItsOwnTheJobUsesTheDefaultOne) {
     EXPECT_EQ(Convert({dir / "codes.qdl", "--interpretation", "1"}), DialogResult::Ok);
     CCarnet written;
     ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
-    ASSERT_EQ(written.GetSize(), 2);
-    EXPECT_EQ(written.GetType(1), kKindExcentrement);
+    EXPECT_EQ(Kinds(written), (std::vector<int>{kKindStation, kKindExcentrement}));
     EXPECT_EQ(Key(kSectionGeocodification, kKeyTableDeCode), "");
     EXPECT_TRUE(frontEnd.questions.empty());
 }

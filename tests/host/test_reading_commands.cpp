@@ -89,15 +89,8 @@ TEST_F(ReadingCommands, AReaderNotBuiltYetSaysSoAndTheHelpNamesTheFieldBook) {
     EXPECT_TRUE(Has(Run("LecWild --help").out, "--parametrage FICHIER"));
 }
 
-TEST_F(ReadingCommands, TheEditorAppendsAFieldBookToItsGeoBaseAfterAsking) {
+TEST_F(ReadingCommands, TheEditorAppendsAFieldBookToItsGeoBaseWhenTold) {
     WriteBytes(dir / "job.geo", kJob);
-    // In a batch the question takes its default: cancel, nothing changes.
-    const Outcome asked = Run("GeoEdit job.geo --lecture Quendal carnet.qdl");
-    EXPECT_EQ(asked.status, 0) << asked.err;
-    EXPECT_TRUE(Has(asked.err, "La GéoBase courante n'est pas vide !")) << asked.err;
-    EXPECT_TRUE(Has(asked.err, "Réponse : Annuler"));
-    EXPECT_EQ(ReadBytes(dir / "job.geo"), kJob);
-
     const Outcome appended = Run("--oui GeoEdit job.geo --lecture quendal-pc carnet.qdl");
     EXPECT_EQ(appended.status, 0) << appended.err;
     EXPECT_EQ(ReadBytes(dir / "job.geo"), std::string(kJob) +
