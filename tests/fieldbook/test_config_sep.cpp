@@ -16,24 +16,18 @@ TEST(DelimitedFields, ALineIsCutAtItsSeparator) {
         const char* separator;
         std::string_view line;
         std::vector<std::string> fields;
-        const char* after = nullptr; // the text after the first field, when checked
     };
     const Case cases[] = {
         // Empty fields are fields; blanks around a field do not count.
         {";", "PT;P1;;10.5; 20 ;", {"PT", "P1", "", "10.5", "20", ""}},
         // A quoted field holds the separator, and a doubled quote stands for one.
-        {";",
-         R"(CO;"Texte ; avec ""guillemets""")",
-         {"CO", R"(Texte ; avec "guillemets")"},
-         R"(Texte ; avec "guillemets")"},
+        {";", R"(CO;"Texte ; avec ""guillemets""";x)", {"CO", R"(Texte ; avec "guillemets")", "x"}},
         {";", R"(PT; " P1 " ;1)", {"PT", "P1", "1"}},
         {",", R"(PT,P1,"1,5")", {"PT", "P1", "1,5"}},
         // A quote never closed runs to the end of the line.
         {";", R"(PT;"non fermé;1)", {"PT", "non fermé;1"}},
-        {";", "CO", {"CO"}, ""},
         // Blanks: any run of spaces and tabs, those at both ends of the line making no field.
         {" ", "  PT   P1\t 10.5   20  ", {"PT", "P1", "10.5", "20"}},
-        {" ", "CO   Levé  du 12 mars", {"CO", "Levé", "du", "12", "mars"}, "Levé  du 12 mars"},
         // A tabulation is one separator: two in a row enclose an empty field.
         {"\t", "PT\tP1\t\t10.5", {"PT", "P1", "", "10.5"}},
         {" | ", "PT | P1 | 10.5", {"PT", "P1", "10.5"}},
@@ -45,70 +39,61 @@ TEST(DelimitedFields, ALineIsCutAtItsSeparator) {
         for (std::size_t i = 0; i < fields.Count(); ++i)
             texts.emplace_back(fields.Field({RecordField::Ignore}, i));
         EXPECT_EQ(texts, c.fields) << c.line;
-        if (c.after) {
-            EXPECT_EQ(fields.After({RecordField::Type}, 0), c.after) << c.line;
-        }
     }
 }
 
-TEST_F(Delimited, EveryKindOfRecordOfTheShippedLayout) {
-    // The type words are compared without regard to case; a field code is kept as typed.
+// Every kind of record of the shipped layout, its type word in any case, and the lines that cannot be used
+// reported with their number and skipped.
+TEST_F(Delimited, TheRecordsOfTheShippedLayoutAndTheLinesThatCannotBeUsed) {
     Import("CO;Levé du 12 mars ; temps clair \n"
            "PT;B1;652110.214;6861845.637;61.208;BORNE\n"
            "st;S10;1.574;ST\n"
            "RF;B1;1.3;221.82868;100.47842;106.3933\n"
            "MS;203;1.8;43.05682;99.80803;40.4778;ARBRE\n"
-           "CD;ARB 6\n");
-    EXPECT_TRUE(frontEnd.lines.empty()) << frontEnd.AllLines();
-    ASSERT_EQ(records.GetSize(), 6);
-    const int kinds[] = {kKindComment, kKindPoint, kKindStation, kKindReference, kKindMesure, kKindCommand};
-    for (int i = 0; i < 6; ++i)
-        EXPECT_EQ(records.GetType(i), kinds[i]) << i;
-    EXPECT_EQ(records.As<CComment>(0)->text(), "Levé du 12 mars ; temps clair");
-    EXPECT_EQ(
-        (std::vector<std::string>{records.matAt(1), records.symAt(1), records.symAt(4), records.cmdAt(5)}),
-        (std::vector<std::string>{"B1", "BORNE", "ARBRE", "ARB 6"}));
-    EXPECT_EQ(
-        (std::vector<double>{records.xAt(1), records.yAt(1), records.zAt(1), records.hiAt(2), records.hpAt(4),
-                             records.ahAt(4), records.avAt(4), records.diAt(4)}),
-        (std::vector<double>{652110.214, 6861845.637, 61.208, 1.574, 1.8, 43.05682, 99.80803, 40.4778}));
-}
-
-TEST_F(Delimited, LinesThatCannotBeUsedAreReportedWithTheirNumberAndSkipped) {
-    layout.SetText(kKeyChampsVisee, ""); // sightings are not read with this layout
-    Import("PT;P1;1;2;3\n"
+           "CD;ARB 6\n"
            "XX;P2;1;2;3\n"
            "PT;;1;2;3\n"
            "PT;P4;1;2,5;3\n"
            "PT;P5;1;inf;3\n"
            "CD\n"
-           "MS;101;1.5\n"
            "PT;P8;1;2;3;BORNE;;en trop;\n"
            "\n"
            "   \n"
-           "ST;;1.5\n"
-           "PT;P12;1;2;3\n");
+           "ST;;1.5\n");
     EXPECT_EQ(frontEnd.lines, (std::vector<std::string>{
-                                  "Erreur ligne 2 : donnée non reconnue !",
-                                  "Erreur ligne 3 : donnée manquante pour le matricule du point !",
-                                  "Erreur ligne 4 : valeur numérique incorrecte <2,5> !",
-                                  "Erreur ligne 5 : valeur numérique incorrecte <inf> !",
-                                  "Erreur ligne 6 : donnée manquante pour le code !",
                                   "Erreur ligne 7 : donnée non reconnue !",
-                                  "Attention : ligne 8 : 2 champ(s) en trop, ignoré(s).",
-                                  "Erreur ligne 11 : donnée manquante pour le nom de la station !",
+                                  "Erreur ligne 8 : donnée manquante pour le matricule du point !",
+                                  "Erreur ligne 9 : valeur numérique incorrecte <2,5> !",
+                                  "Erreur ligne 10 : valeur numérique incorrecte <inf> !",
+                                  "Erreur ligne 11 : donnée manquante pour le code !",
+                                  "Attention : ligne 12 : 2 champ(s) en trop, ignoré(s).",
+                                  "Erreur ligne 15 : donnée manquante pour le nom de la station !",
                               }));
-    ASSERT_EQ(records.GetSize(), 3);
+    ASSERT_EQ(records.GetSize(), 7);
+    const int kinds[] = {kKindComment, kKindPoint,   kKindStation, kKindReference,
+                         kKindMesure,  kKindCommand, kKindPoint};
+    for (int i = 0; i < 7; ++i)
+        EXPECT_EQ(records.GetType(i), kinds[i]) << i;
+    EXPECT_EQ(records.As<CComment>(0)->text(), "Levé du 12 mars ; temps clair");
+    EXPECT_EQ((std::vector<std::string>{records.matAt(1), records.symAt(1), records.symAt(4),
+                                        records.cmdAt(5), records.matAt(6), records.symAt(6)}),
+              (std::vector<std::string>{"B1", "BORNE", "ARBRE", "ARB 6", "P8", "BORNE"}));
     EXPECT_EQ(
-        (std::vector<std::string>{records.matAt(0), records.matAt(1), records.symAt(1), records.matAt(2)}),
-        (std::vector<std::string>{"P1", "P8", "BORNE", "P12"}));
+        (std::vector<double>{records.xAt(1), records.yAt(1), records.zAt(1), records.hiAt(2), records.hpAt(4),
+                             records.ahAt(4), records.avAt(4), records.diAt(4)}),
+        (std::vector<double>{652110.214, 6861845.637, 61.208, 1.574, 1.8, 43.05682, 99.80803, 40.4778}));
+    // A kind whose fields are not given is not read.
+    layout.SetText(kKeyChampsVisee, "");
+    frontEnd.lines.clear();
+    Import("MS;101;1.5\n");
+    EXPECT_EQ(frontEnd.lines, (std::vector<std::string>{"Erreur ligne 1 : donnée non reconnue !"}));
+    EXPECT_EQ(records.GetSize(), 7);
 }
 
 // Angles come to grads and lengths to metres: 400 gr = 360° = 6400 mils, 1 ft = 0.3048 m exactly.
 TEST_F(Delimited, AnglesAndLengthsAreBroughtToGradsAndMetres) {
     struct Case {
-        const char *angles, *distances;
-        const char* angle; // written as AH, AV and V0
+        const char *angles, *distances, *angle; // the angle written as AH, AV and V0
         double grads;
         const char* length; // written as HI, HP, DI, X, Y and Z
         double metres;
@@ -147,32 +132,26 @@ TEST_F(Delimited, AnglesAndLengthsAreBroughtToGradsAndMetres) {
               (std::vector<double>{kUndefined, kUndefined, 0.0, kUndefined, kUndefined, kUndefined}));
 }
 
-// A spreadsheet set to French: tabulations, decimal commas, a line of titles.
-TEST_F(Delimited, TheSeparatorsAndTheHeaderLinesOfTheLayout) {
-    layout.SetText(kKeySeparateur, "TAB");
-    layout.SetText(kKeySeparateurDecimal, ",");
-    layout.SetText(kKeyLignesEntete, "2");
-    Import("Levé des Tilleuls\nType\tMatricule\tX\tY\tZ\tCode\nPT\tP1\t652110,214\t6861845,637\t61.2\nXX\n");
-    // The titles are not reported; the lines keep their numbers in the file; a decimal point is still read.
-    EXPECT_EQ(frontEnd.lines, (std::vector<std::string>{"Erreur ligne 4 : donnée non reconnue !"}));
-    ASSERT_EQ(records.GetSize(), 1);
-    EXPECT_EQ((std::vector<double>{records.xAt(0), records.yAt(0), records.zAt(0)}),
-              (std::vector<double>{652110.214, 6861845.637, 61.2}));
-}
-
-// Without a TYPE field, the field book is a list of points: "matricule X Y Z" aligned with blanks.
-TEST_F(Delimited, WithoutATypeFieldEveryLineIsAPoint) {
+// A list of points "matricule X Y Z" aligned with blanks, without a TYPE field, from a spreadsheet set to
+// French: decimal commas (a decimal point still read), a line of titles counted in the numbers of the lines.
+TEST_F(Delimited, AListOfPointsWithBlanksDecimalCommasAndTitles) {
     layout.SetText(kKeySeparateur, "ESPACE");
+    layout.SetText(kKeySeparateurDecimal, ",");
+    layout.SetText(kKeyLignesEntete, "1");
     layout.SetText(kKeyChampsStation, "");
     layout.SetText(kKeyChampsVisee, "");
     layout.SetText(kKeyChampsPoint, "MATRICULE,X,Y,Z,CODE");
     ASSERT_EQ(layout.Validate(), "");
-    Import("  1001   652110.214  6861845.637   61.208  BORNE\n  1002   652215.480  6861830.215\nST S1 1.5\n");
+    Import(
+        "Matricule X Y Z\n  1001   652110,214  6861845.637   61,208  BORNE\n  1002   652215,48  6861830,215\n"
+        "ST S1 1.5\n");
     EXPECT_EQ(frontEnd.lines,
-              (std::vector<std::string>{"Erreur ligne 3 : valeur numérique incorrecte <S1> !"}));
+              (std::vector<std::string>{"Erreur ligne 4 : valeur numérique incorrecte <S1> !"}));
     ASSERT_EQ(records.GetSize(), 2);
     EXPECT_EQ(records.GetType(1), kKindPoint);
-    EXPECT_EQ(records.matAt(1), "1002");
-    EXPECT_DOUBLE_EQ(records.xAt(1), 652215.48);
-    EXPECT_EQ(records.zAt(1), kUndefined);
+    EXPECT_EQ((std::vector<std::string>{records.matAt(0), records.symAt(0), records.matAt(1)}),
+              (std::vector<std::string>{"1001", "BORNE", "1002"}));
+    EXPECT_EQ(
+        (std::vector<double>{records.xAt(0), records.yAt(0), records.zAt(0), records.xAt(1), records.zAt(1)}),
+        (std::vector<double>{652110.214, 6861845.637, 61.208, 652215.48, kUndefined}));
 }
