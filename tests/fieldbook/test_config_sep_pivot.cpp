@@ -5,62 +5,52 @@
 #include "fieldbook/FieldBookConverter.h"
 #include "fieldbook/FieldBookFormats.h"
 
+#include <algorithm>
 #include <filesystem>
 #include <gtest/gtest.h>
 
 using namespace pyr;
 namespace fs = std::filesystem;
 
-namespace {
-
-class SepColConversion : public ::testing::Test {
-protected:
+TEST(SepColConversion, TheSameSurveyInTheThreeFormatsGivesTheSameGeoBase) {
+    TempDir dir;
+    ScopedEnv registry{"PYRALIS_REGISTRE", dir / "registre"};
+    ui::ScriptedFrontEnd frontEnd;
+    CPyrTxtWnd txt{frontEnd};
     // A field book or layout of the test data, copied into the test's folder (where the .tmp goes).
-    std::string Copy(const std::string& name) {
+    const auto copy = [&](const std::string& name) {
         fs::copy_file(FieldBookData(name), dir / name);
-        return dir / name;
-    }
+        return std::string(dir / name);
+    };
     // Converts a field book into a new GéoBase beside it, through the command's reader; its text.
-    std::string Convert(FieldBookFormat format, const std::string& carnet, const std::string& layout = {}) {
+    const auto convert = [&](FieldBookFormat format, const std::string& carnet,
+                             const std::string& layout = {}) {
         frontEnd.dialogArguments = {carnet};
         if (!layout.empty())
             frontEnd.dialogArguments.insert(frontEnd.dialogArguments.end(), {"--parametrage", layout});
         FieldBookConverter converter(format, &frontEnd, dir / "Pyralis.ini", dir / "installation/", &txt);
         EXPECT_EQ(RunConversion(converter, nullptr), ui::DialogResult::Ok) << frontEnd.AllLines();
         return ReadBytes(BesideCarnet(carnet, "geo"));
-    }
-    std::vector<std::string> Errors() const {
-        std::vector<std::string> errors;
-        for (const auto& line : frontEnd.lines)
-            if (line.starts_with("Erreur") || line.starts_with("Attention")) errors.push_back(line);
-        return errors;
-    }
-
-    TempDir dir;
-    ScopedEnv registry{"PYRALIS_REGISTRE", dir / "registre"};
-    ui::ScriptedFrontEnd frontEnd;
-    CPyrTxtWnd txt{frontEnd};
-};
-
-} // namespace
-
-TEST_F(SepColConversion, TheSameSurveyInTheThreeFormatsGivesTheSameGeoBase) {
-    const std::string quendal = Convert(FieldBookFormat::Quendal, Copy("leve-quendal.txt"));
+    };
+    const std::string quendal = convert(FieldBookFormat::Quendal, copy("leve-quendal.txt"));
     // A line that cannot be used is reported with its number in the surveyor's file, the others kept.
-    const std::string csv = Copy("leve-separateur.csv");
+    const std::string csv = copy("leve-separateur.csv");
     WriteBytes(csv, ReadBytes(csv) + "XX;205\n");
-    const std::string delimited = Convert(FieldBookFormat::Separateur, csv, Copy("leve.sep"));
+    const std::string delimited = convert(FieldBookFormat::Separateur, csv, copy("leve.sep"));
     const std::string columnar =
-        Convert(FieldBookFormat::Colonne, Copy("leve-colonne.txt"), Copy("leve.col"));
-    EXPECT_EQ(Errors(), (std::vector<std::string>{"Erreur ligne 14 : donnée non reconnue !"}));
+        convert(FieldBookFormat::Colonne, copy("leve-colonne.txt"), copy("leve.col"));
+    std::vector<std::string> errors;
+    std::copy_if(
+        frontEnd.lines.begin(), frontEnd.lines.end(), std::back_inserter(errors),
+        [](const std::string& line) { return line.starts_with("Erreur") || line.starts_with("Attention"); });
+    EXPECT_EQ(errors, (std::vector<std::string>{"Erreur ligne 14 : donnée non reconnue !"}));
     EXPECT_EQ(delimited, quendal);
     EXPECT_EQ(columnar, quendal);
     // The temporary Quendal-Pc files are gone.
     EXPECT_FALSE(fs::exists(dir / "leve-separateur.tmp"));
     EXPECT_FALSE(fs::exists(dir / "leve-colonne.tmp"));
 
-    // And the GéoBase holds the survey: the comment, three points, two stations and their sightings, the
-    // code.
+    // And the GéoBase holds the survey: a comment, three points, two stations and their sightings, a code.
     CCarnet geoBase;
     ASSERT_TRUE(geoBase.Load(nullptr, BesideCarnet(csv, "geo")));
     std::vector<int> kinds;
