@@ -217,10 +217,8 @@ TEST(LectWild, EveryLineIsReadOrReportedWithItsNumber) {
 }
 
 TEST(LectWild, EveryLineEndBlankAndControlLineGivesTheSameElements) {
-    std::string station = Gsi8({"110001+00000S10", "84..10+00010000", "85..10+00020000"});
-    std::string sighting = Gsi8({"110002+00000101", "21.102+12345678", "22.102+09876543", "31..00+00012345"});
-    station.pop_back();
-    sighting.pop_back();
+    const std::string station = "110001+00000S10 84..10+00010000 85..10+00020000 ";
+    const std::string sighting = "110002+00000101 21.102+12345678 22.102+09876543 31..00+00012345 ";
     const std::string cases[] = {
         station + "\n" + sighting + "\n",
         station + "\r\n" + sighting + "\r\n",
