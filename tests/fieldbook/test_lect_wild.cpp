@@ -91,14 +91,6 @@ std::string Sightings(const CCarnet& carnet, bool names = false) {
     return sightings;
 }
 
-// "*110001+..." blocks as a surveyor's instrument writes them, for the short field books of the tests.
-std::string Gsi8(std::initializer_list<const char*> words) {
-    std::string line;
-    for (const char* word : words)
-        line += std::string(word) + ' ';
-    return line + "\n";
-}
-
 const std::string kGsi8 = "1000 Format               = GSI-8; ";
 
 } // namespace
@@ -239,13 +231,14 @@ TEST(LectWild, EveryLineEndBlankAndControlLineGivesTheSameElements) {
 // Point 205 has coordinates: a reference whatever the marking. The codes marking references are matched
 // whatever their case, from a code block or on the sighting.
 TEST(LectWild, ReferencesAreKnownPointsOrMarkedByTheirCodes) {
-    const std::string text = Gsi8({"110001+00000S10", "88..10+00001500"}) + Gsi8({"410002+00000099"}) +
-                             Gsi8({"110003+00000201", "21.102+10000000"}) +
-                             Gsi8({"110004+00000202", "21.102+10000000", "71....+00000REF"}) +
-                             Gsi8({"110005+00000203", "21.102+10000000", "71....+00000ref"}) +
-                             Gsi8({"110006+00000204", "21.102+10000000", "71....+00000ARB"}) +
-                             Gsi8({"110007+00000205", "81..10+00001000", "82..10+00002000"}) +
-                             Gsi8({"110008+00000205", "21.102+10000000"});
+    const std::string text = "110001+00000S10 88..10+00001500 \n"
+                             "410002+00000099 \n"
+                             "110003+00000201 21.102+10000000 \n"
+                             "110004+00000202 21.102+10000000 71....+00000REF \n"
+                             "110005+00000203 21.102+10000000 71....+00000ref \n"
+                             "110006+00000204 21.102+10000000 71....+00000ARB \n"
+                             "110007+00000205 81..10+00001000 82..10+00002000 \n"
+                             "110008+00000205 21.102+10000000 \n";
     const std::pair<const char*, const char*> cases[] = {{"codes", "1002 1002 1002 1003 1002 "},
                                                          {"aucune", "1003 1003 1003 1003 1002 "},
                                                          {"premiere", "1002 1003 1003 1003 1002 "}};
@@ -259,11 +252,13 @@ TEST(LectWild, ReferencesAreKnownPointsOrMarkedByTheirCodes) {
 
 // Ids are kept as written but for their padding, and so they stay in the GéoBase written and read back.
 TEST(LectWild, IdsAreKeptAsWrittenButForTheirPadding) {
-    const std::string text =
-        Gsi8({"110001+00000S10", "88..10+00001500"}) + Gsi8({"110002+0000A007", "21.102+10000000"}) +
-        Gsi8({"110003+00000007", "21.102+10000000"}) + Gsi8({"110004+   A  12", "21.102+10000000"}) +
-        Gsi8({"110005+00001.50", "21.102+10000000"}) + Gsi8({"110006+0000007B", "21.102+10000000"}) +
-        "*110007+0000000000000012 21.102+0000000010000000 \n";
+    const std::string text = "110001+00000S10 88..10+00001500 \n"
+                             "110002+0000A007 21.102+10000000 \n"
+                             "110003+00000007 21.102+10000000 \n"
+                             "110004+   A  12 21.102+10000000 \n"
+                             "110005+00001.50 21.102+10000000 \n"
+                             "110006+0000007B 21.102+10000000 \n"
+                             "*110007+0000000000000012 21.102+0000000010000000 \n";
     WildRun run;
     CCarnet& read = run.Read(text);
     EXPECT_EQ(Reports(run), "");
@@ -276,9 +271,8 @@ TEST(LectWild, IdsAreKeptAsWrittenButForTheirPadding) {
 }
 
 TEST(LectWild, TheSettingsGiveTheUnitsAndTheOrderTheWordsDoNotSay) {
-    const std::string text =
-        Gsi8({"110001+00000S10", "84....+00010000", "85....+00020000", "88....+00001500"}) +
-        Gsi8({"110002+00000101", "21....+04530000", "22....+09000000", "31....+00010000"});
+    const std::string text = "110001+00000S10 84....+00010000 85....+00020000 88....+00001500 \n"
+                             "110002+00000101 21....+04530000 22....+09000000 31....+00010000 \n";
     WildRun run;
     const CCarnet& read = run.Set(kKeyUniteAngles, "dms")
                               .Set(kKeyUniteDistances, "pieds")
@@ -301,16 +295,16 @@ TEST(LectWild, AHorizontalDistanceGivesTheSlopeDistance) {
     for (const auto& [words, av, di] : cases) {
         WildRun run;
         const CCarnet& read =
-            run.Read(Gsi8({"110001+00000S10", "88..10+00001500"}) + "110002+00000101 " + words + "\n");
+            run.Read("110001+00000S10 88..10+00001500 \n110002+00000101 " + std::string(words));
         ASSERT_EQ(read.GetSize(), 3) << words;
         Expect(read, 2, {kUndefined, 100.0, av, di});
     }
 }
 
 TEST(LectWild, LevellingStaffReadingsBecomeBackAndForeReadings) {
-    const std::string text = Gsi8({"110001+000000R1", "32...8+02500000", "331.08+00123456"}) +
-                             Gsi8({"110002+000000R2", "32...8+02400000", "332.08+00098765"}) +
-                             Gsi8({"110003+000000R2", "83..18+04825000"});
+    const std::string text = "110001+000000R1 32...8+02500000 331.08+00123456 \n"
+                             "110002+000000R2 32...8+02400000 332.08+00098765 \n"
+                             "110003+000000R2 83..18+04825000 \n";
     WildRun run;
     const CCarnet& read = run.Read(text);
     EXPECT_EQ(Reports(run), "");
@@ -345,11 +339,10 @@ TEST(LectWild, AWildConversionWritesItsGeoBase) {
 // The time of a sighting is no header; constants repeated are said once. 220.0000 ppm (unit digit 6), a
 // prism constant of 0.0020 m.
 TEST(LectWild, HeaderInformationAndConstantsAreCommentsWrittenWhenTheyChange) {
-    const std::string text =
-        Gsi8({"12....+00640054", "13....+00TCR305", "17....+00010224", "19....+02081029"}) +
-        Gsi8({"110001+00000S10", "88..10+00001500", "58..16+00000020", "59..16+02200000"}) +
-        Gsi8({"110002+00000101", "21.102+10000000", "19....+02081031", "58..16+00000020"}) +
-        Gsi8({"110003+00000102", "21.102+10000000", "51..1.+0012-017", "17....+01032024"});
+    const std::string text = "12....+00640054 13....+00TCR305 17....+00010224 19....+02081029 \n"
+                             "110001+00000S10 88..10+00001500 58..16+00000020 59..16+02200000 \n"
+                             "110002+00000101 21.102+10000000 19....+02081031 58..16+00000020 \n"
+                             "110003+00000102 21.102+10000000 51..1.+0012-017 17....+01032024 \n";
     WildRun run;
     EXPECT_EQ(Summary(run.Read(text)),
               kGsi8 +
@@ -363,10 +356,9 @@ TEST(LectWild, HeaderInformationAndConstantsAreCommentsWrittenWhenTheyChange) {
 
 TEST(LectWild, AStationNumberOnTheMeasurementsOpensItsStation) {
     const std::string text =
-        Gsi8({"110001+00000101", "16....+00000S20", "21.102+10000000", "84..10+00010000", "85..10+00020000",
-              "88..10+00001500"}) +
-        Gsi8({"110002+00000102", "16....+00000S20", "21.102+20000000", "88..10+00001500"}) +
-        Gsi8({"110003+00000103", "16....+00000S21", "21.102+30000000"});
+        "110001+00000101 16....+00000S20 21.102+10000000 84..10+00010000 85..10+00020000 88..10+00001500 \n"
+        "110002+00000102 16....+00000S20 21.102+20000000 88..10+00001500 \n"
+        "110003+00000103 16....+00000S21 21.102+30000000 \n";
     for (const char* convention : {"auto", "84"}) {
         WildRun run;
         const CCarnet& read = run.Set(kKeyConventionStation, convention).Read(text);
