@@ -87,10 +87,10 @@ TEST(ParamDriver, AWrongValueIsRefusedWithItsReason) {
     ui::ScriptedFrontEnd frontEnd;
     CParamDriver missing("", dir / "absent.ini", FieldBookFormat::Zeiss);
     EXPECT_FALSE(missing.Load(&frontEnd));
-    ASSERT_EQ(frontEnd.messages.size(), 1u);
     EXPECT_EQ(
-        frontEnd.messages[0].text.find("Impossible de lire le fichier de paramétrage <" + dir / "absent.ini"),
+        MessageTexts(frontEnd).find("Impossible de lire le fichier de paramétrage <" + dir / "absent.ini"),
         0u);
+    EXPECT_EQ(frontEnd.messages.size(), 1u);
 }
 
 TEST(ParamDriver, TheLayoutsOfTheDelimitedAndColumnarFiles) {

@@ -87,12 +87,10 @@ TEST(ReaderSkeleton, ItAnnouncesReadsEveryLineReportsAndCounts) {
     EXPECT_EQ(run.frontEnd.lines, expected);
     EXPECT_EQ(run.reader.begun, 1);
     EXPECT_EQ(run.reader.ended, 1);
-    ASSERT_EQ(read.GetSize(), 4);
+    ASSERT_EQ(Kinds(read), (std::vector<int>{kKindComment, kKindStation, kKindMesure, kKindMesure}));
     // Header information: the label padded before " = ".
     EXPECT_EQ(static_cast<const CComment*>(read.GetAt(0))->text(), "Appareil             = TCR 307");
-    EXPECT_EQ(read.GetType(1), kKindStation);
     EXPECT_EQ(read.hiAt(1), 1.56);
-    EXPECT_EQ(read.GetType(3), kKindMesure);
     EXPECT_EQ(read.ahAt(3), 13.0);
     EXPECT_EQ(read.hpAt(3), 1.3);
 }
