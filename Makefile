@@ -10,7 +10,8 @@ RELEASE_DIR := build/release
 CHECK_DIR := build/check
 FUZZ_DIR := build/fuzz
 FUZZ_SECONDS ?= 60
-FUZZ_TARGETS := fuzz_geo_load fuzz_sepcol fuzz_gsi fuzz_quendal
+FUZZ_TARGETS := fuzz_geo_load fuzz_sepcol fuzz_gsi fuzz_quendal fuzz_geodim fuzz_nikon fuzz_sokkia \
+	fuzz_topcon fuzz_zeiss
 DEMO_DIR := build/demo-out
 
 .PHONY: all deps release demo check bench fuzz format clean

@@ -2,7 +2,12 @@
 
 #include "fieldbook/ConfigCol.h"
 #include "fieldbook/ConfigSep.h"
+#include "fieldbook/LectGeodim.h"
+#include "fieldbook/LectNikon.h"
+#include "fieldbook/LectSokkia.h"
+#include "fieldbook/LectTopcon.h"
 #include "fieldbook/LectWild.h"
+#include "fieldbook/LectZeiss.h"
 #include "fieldbook/QuendalPivot.h"
 #include "fieldbook/QuendalReader.h"
 
@@ -27,6 +32,18 @@ std::unique_ptr<CFieldBookReader> Pivot(RecordImporter importer) {
 
 std::unique_ptr<CFieldBookReader> MakeFieldBookReader(FieldBookFormat format) {
     switch (format) {
+    case FieldBookFormat::Geotronics:
+        return MakeGeodimReader();
+    case FieldBookFormat::NikonAtlas:
+    case FieldBookFormat::NikonKheops:
+    case FieldBookFormat::NikonPsion:
+        return MakeNikonReader();
+    case FieldBookFormat::Sokkia:
+        return MakeSokkiaReader();
+    case FieldBookFormat::TopconGT7:
+        return MakeTopconReader();
+    case FieldBookFormat::Zeiss:
+        return MakeZeissReader();
     case FieldBookFormat::Quendal:
         return std::make_unique<CQuendalReader>();
     case FieldBookFormat::Wild:
@@ -35,9 +52,8 @@ std::unique_ptr<CFieldBookReader> MakeFieldBookReader(FieldBookFormat format) {
         return Pivot(DelimitedImporter());
     case FieldBookFormat::Colonne:
         return Pivot(ColumnarImporter());
-    default:
-        return nullptr;
     }
+    return nullptr;
 }
 
 } // namespace pyr

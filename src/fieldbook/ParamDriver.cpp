@@ -58,6 +58,31 @@ const std::vector<Key>& WildKeys() {
     return keys;
 }
 
+// The keys of each instrument format: the common ones, then what that format's reader also needs.
+const std::vector<Key>& WithComputedPoints() {
+    static const std::vector<Key> keys = [] {
+        std::vector<Key> all = InstrumentKeys();
+        all.push_back({kKeyPointsCalcules, "0", {"0", "1"}});
+        return all;
+    }();
+    return keys;
+}
+const std::vector<Key>& GeotronicsKeys() {
+    return WithComputedPoints();
+}
+const std::vector<Key>& NikonKeys() {
+    return WithComputedPoints();
+}
+const std::vector<Key>& SokkiaKeys() {
+    return WithComputedPoints();
+}
+const std::vector<Key>& TopconKeys() {
+    return WithComputedPoints();
+}
+const std::vector<Key>& ZeissKeys() {
+    return WithComputedPoints();
+}
+
 std::vector<Key> LayoutKeys(bool columnar) {
     std::vector<Key> keys;
     if (!columnar) keys.push_back({kKeySeparateur, ";", {}});
@@ -88,6 +113,18 @@ std::span<const Key> KeysOf(FieldBookFormat format) {
     static const std::vector<Key> delimited = LayoutKeys(false);
     static const std::vector<Key> columnar = LayoutKeys(true);
     switch (format) {
+    case FieldBookFormat::Geotronics:
+        return GeotronicsKeys();
+    case FieldBookFormat::NikonAtlas:
+    case FieldBookFormat::NikonKheops:
+    case FieldBookFormat::NikonPsion:
+        return NikonKeys();
+    case FieldBookFormat::Sokkia:
+        return SokkiaKeys();
+    case FieldBookFormat::TopconGT7:
+        return TopconKeys();
+    case FieldBookFormat::Zeiss:
+        return ZeissKeys();
     case FieldBookFormat::Wild:
         return WildKeys();
     case FieldBookFormat::Separateur:
@@ -96,9 +133,8 @@ std::span<const Key> KeysOf(FieldBookFormat format) {
         return columnar;
     case FieldBookFormat::Quendal:
         return {};
-    default:
-        return InstrumentKeys();
     }
+    return InstrumentKeys();
 }
 
 struct FieldName {

@@ -1,0 +1,9 @@
+#include "fieldbook/LectTopcon.h"
+
+namespace pyr {
+
+std::unique_ptr<CFieldBookReader> MakeTopconReader() {
+    return nullptr;
+}
+
+} // namespace pyr
