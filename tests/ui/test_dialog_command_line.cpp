@@ -96,20 +96,16 @@ TEST(DialogCommandLine, AnOptionalValueIsTakenOnlyWhenGiven) {
                                   [this](const std::string& f) { return Record("fichier=" + f); });
         }
     };
-    const struct {
-        Words words;
-        Kind kind;
-        Words applied;
-    } cases[] = {
+    // clang-format off
+    const struct { Words words; Kind kind; Words applied; } cases[] = {
         {{"--fichier"}, Kind::Run, {"fichier= @derniere.geo"}},
-        {{"--fichier", "l.cv0", "--point", "A"},
-         Kind::Run,
-         {"fichier=l.cv0 @derniere.geo", "A @derniere.geo"}},
+        {{"--fichier", "l.cv0", "--point", "A"}, Kind::Run, {"fichier=l.cv0 @derniere.geo", "A @derniere.geo"}},
         {{"--fichier", "--point", "A"}, Kind::Run, {"fichier= @derniere.geo", "A @derniere.geo"}},
         {{"--fichier=l.cv0"}, Kind::Run, {"fichier=l.cv0 @derniere.geo"}},
         {{"--fichier", "a", "b"}, Kind::Usage, {}},
-        {{"--fichier", "--fichier"}, Kind::Usage, {}},
+        {{"--fichier", "--fichier"}, Kind::Usage, {}}, // twice without a value: no value to read
     };
+    // clang-format on
     for (const auto& c : cases) {
         ListingDialog dialog;
         EXPECT_EQ(ui::ApplyCommandLine(dialog, "calvis", c.words).kind, c.kind) << c.words.size();
