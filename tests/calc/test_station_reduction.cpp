@@ -75,14 +75,13 @@ protected:
 // The repeated sightings below cover the plain half turn, the whole turn and a direction left as it
 // stands; here, the way forward by 200, the whole turn the other way and the limits of the rule.
 TEST(ReductionFormulas, RepetitionsComeBackByHalfOrWholeTurnsAndOffsetsAreMeanedAcrossZero) {
-    const struct {
-        double ah, mean, expected;
-    } cases[] = {
+    // clang-format off
+    const struct { double ah, mean, expected; } cases[] = {
         {0.002, 200.0, 200.002}, // 199.998 away, short of the mean: forward by 200
         {395.0, 5.0, -5.0},      // 390 away across zero: a whole turn back
-        {310.0, 10.0, 310.0},    // 300, 150 and 250 away: as it stands
-        {160.0, 10.0, 160.0},    {260.0, 10.0, 260.0},
+        {310.0, 10.0, 310.0}, {160.0, 10.0, 160.0}, {260.0, 10.0, 260.0}, // 300, 150, 250 away: as they stand
     };
+    // clang-format on
     for (const auto& c : cases)
         EXPECT_NEAR(BringNearMean(c.ah, c.mean), c.expected, 1e-9) << c.ah << " / " << c.mean;
 
