@@ -157,32 +157,26 @@ TEST_F(Conversion, AMergeAppendsInReadingOrderWithTheInstrumentFirst) {
     EXPECT_EQ(MessageTexts(frontEnd), "Cas impossible en théorie !!!");
 }
 
-TEST_F(Conversion, EachFormatSaysInItsWordsThatTheEditorHasNoCodeTable) {
-    for (const auto& [format, text] :
-         {std::pair{FieldBookFormat::Wild, "Pas de table de codes actuellement chargée !!!"},
-          std::pair{FieldBookFormat::Geotronics, "Pas de table de codes actuellement chargée !!!"},
-          std::pair{FieldBookFormat::Sokkia, "Cas impossible en théorie !!!"}}) {
-        ui::ScriptedFrontEnd fe;
-        EditorDocument document;
-        FieldBookConverter converter(format, &fe, Params(), install, nullptr, &document);
-        converter.makeReader = [] { return std::make_unique<CQuendalReader>(); };
-        converter.showDialog = [](CLectCarnet&) { return DialogResult::Cancel; };
-        RunConversion(converter, nullptr);
-        EXPECT_EQ(MessageTexts(fe), text);
-        // A table the editor holds is used, and named in the dialog.
-        CTableCode table;
-        ASSERT_TRUE(table.Init(DefaultCodeTable()));
-        document.codeTable = &table;
-        std::string named;
-        converter.showDialog = [&named](CLectCarnet& dialog) {
-            named = dialog.CodeTablePath();
-            return DialogResult::Cancel;
-        };
-        RunConversion(converter, nullptr);
-        EXPECT_EQ(fe.messages.size(), 1u);
-        EXPECT_EQ(named, DefaultCodeTable());
-        EXPECT_EQ(converter.codeTable, &table);
-    }
+// The editor held no code table: the instrument formats say it in their own words; a table it holds is
+// used, and named in the dialog.
+TEST_F(Conversion, TheEditorsCodeTableIsUsedAndNamed) {
+    EditorDocument document;
+    auto converter = Make(FieldBookFormat::Wild, &document);
+    converter->makeReader = [] { return std::make_unique<CQuendalReader>(); };
+    std::string named = "?";
+    converter->showDialog = [&named](CLectCarnet& dialog) {
+        named = dialog.CodeTablePath();
+        return DialogResult::Cancel;
+    };
+    RunConversion(*converter, nullptr);
+    EXPECT_EQ(MessageTexts(frontEnd), "Pas de table de codes actuellement chargée !!!");
+    CTableCode table;
+    ASSERT_TRUE(table.Init(DefaultCodeTable()));
+    document.codeTable = &table;
+    RunConversion(*converter, nullptr);
+    EXPECT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(named, DefaultCodeTable());
+    EXPECT_EQ(converter->codeTable, &table);
 }
 
 // The default table, named in any case, is neither loaded in place of the job's table nor saved as it.
@@ -266,13 +260,16 @@ TEST_F(Conversion, TheWildSettingsPreformattingAndZeroPrismHeight) {
     EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), install + "Config/Wild.ini");
 }
 
-TEST_F(Conversion, AFormatWithoutItsReaderYetSaysSo) {
-    auto converter = Make(FieldBookFormat::Sokkia);
-    converter->makeReader = [] { return nullptr; }; // a format whose reader is not built yet
-    EXPECT_EQ(RunConversion(*converter, nullptr), DialogResult::Failed);
-    EXPECT_EQ(MessageTexts(frontEnd), "La lecture des carnets Sokkia n'est pas encore disponible dans "
-                                      "cette version de PYRALIS Calculs Topo.");
-    EXPECT_TRUE(frontEnd.dialogs.empty());
+// A GSI field book through its own reader and the shipped settings, which keep the computed points.
+TEST_F(Conversion, AWildFieldBookIsReadByItsOwnReader) {
+    fs::copy_file(FieldBookData("wild-gsi16-84.gsi"), dir / "levé.gsi");
+    frontEnd.dialogArguments = {dir / "levé.gsi"};
+    ASSERT_EQ(RunConversion(*Make(FieldBookFormat::Wild), nullptr), DialogResult::Ok);
+    CCarnet written;
+    ASSERT_TRUE(written.Load(nullptr, dir / "levé.geo"));
+    ASSERT_EQ(written.GetSize(), 18);
+    EXPECT_EQ(written.As<CComment>(0)->text(), "Fichier              = levé.gsi");
+    EXPECT_EQ(written.GetType(10), kKindReference);
 }
 
 // A delimited field book goes through a Quendal-Pc file beside it, read with the same choices, then deleted.

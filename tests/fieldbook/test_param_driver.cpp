@@ -4,6 +4,7 @@
 #include "fieldbook/ParamDriver.h"
 
 #include <gtest/gtest.h>
+#include <tuple>
 
 using namespace pyr;
 
@@ -44,53 +45,44 @@ TEST(ParamDriver, TheValuesOfTheInstrumentFormats) {
     EXPECT_EQ(driver.StationCodes(), (std::vector<std::string>{"2", "21"})); // the default
 }
 
+// One exact text for each kind of message; the other faults are only seen refused, with one message.
 TEST(ParamDriver, AWrongValueIsRefusedWithItsReason) {
     TempDir dir;
-    const std::string sep = dir / "p.sep";
-    const std::string col = dir / "p.col";
-    const struct {
-        FieldBookFormat format;
-        std::string path;
-        std::string contents;
-        std::string why; // after "Fichier de paramétrage <path> :\n"
-    } cases[] = {
-        {FieldBookFormat::Sokkia, dir / "s.ini", "[Parametrage]\nUniteAngles=radians\n",
-         "valeur « radians » incorrecte pour UniteAngles (valeurs possibles : grades, degres, dms, mils) !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nLignesEntete=-1\n",
-         "valeur « -1 » incorrecte pour LignesEntete (un nombre entier de 0 à 1000) !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nSeparateur=\"\"\n",
-         "Separateur incorrect : le séparateur est vide !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nChampsPoint=TYPE,MATRICULE,X,Y,W\n",
-         "ChampsPoint incorrect : champ inconnu « W » !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nChampsPoint=TYPE,MATRICULE,X,X\n",
-         "ChampsPoint incorrect : champ « X » donné deux fois !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nChampsVisee=TYPE,MATRICULE,X\n",
-         "ChampsVisee incorrect : champ « X » inattendu pour ce type d'enregistrement !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nChampsStation=TYPE,HI\n",
-         "ChampsStation incorrect : le champ MATRICULE manque !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nChampsPoint=MATRICULE,X,Y\n",
-         "ChampsPoint incorrect : le champ TYPE doit figurer dans toutes les listes ou dans aucune !"},
-        {FieldBookFormat::Separateur, sep, "[Parametrage]\nChampsPoint=TYPE:1-2,MATRICULE\n",
-         "ChampsPoint incorrect : colonnes données au champ « TYPE » d'un format séparateur !"},
-        {FieldBookFormat::Colonne, col, "[Parametrage]\nChampsPoint=TYPE:1-2,MATRICULE\n",
-         "ChampsPoint incorrect : champ « MATRICULE » sans ses colonnes (MATRICULE:début-fin) !"},
-        {FieldBookFormat::Colonne, col, "[Parametrage]\nChampsPoint=TYPE:1-2,MATRICULE:9-4\n",
-         "ChampsPoint incorrect : colonnes incorrectes pour le champ « MATRICULE » !"},
+    const auto load = [&](FieldBookFormat format, const char* name, const std::string& line,
+                          ui::ScriptedFrontEnd& frontEnd) {
+        WriteBytes(dir / name, "[Parametrage]\n" + line + "\n");
+        return CParamDriver("", dir / name, format).Load(&frontEnd);
     };
-    for (const auto& c : cases) {
-        WriteBytes(c.path, c.contents);
-        ui::ScriptedFrontEnd frontEnd;
-        CParamDriver driver("", c.path, c.format);
-        EXPECT_FALSE(driver.Load(&frontEnd)) << c.contents;
-        EXPECT_EQ(MessageTexts(frontEnd), "Fichier de paramétrage <" + c.path + "> :\n" + c.why);
-    }
     ui::ScriptedFrontEnd frontEnd;
-    CParamDriver missing("", dir / "absent.ini", FieldBookFormat::Zeiss);
-    EXPECT_FALSE(missing.Load(&frontEnd));
+    EXPECT_FALSE(load(FieldBookFormat::Sokkia, "s.ini", "UniteAngles=radians", frontEnd));
+    EXPECT_FALSE(load(FieldBookFormat::Separateur, "p.sep", "ChampsPoint=TYPE,MATRICULE,X,Y,W", frontEnd));
+    EXPECT_EQ(MessageTexts(frontEnd),
+              "Fichier de paramétrage <" + dir / "s.ini" +
+                  "> :\nvaleur « radians » incorrecte pour UniteAngles (valeurs "
+                  "possibles : grades, degres, dms, mils) !|Fichier de paramétrage <" +
+                  dir / "p.sep" + "> :\nChampsPoint incorrect : champ inconnu « W » !");
+    using enum FieldBookFormat;
+    const std::tuple<FieldBookFormat, const char*, const char*> refused[] = {
+        {Separateur, "p.sep", "LignesEntete=-1"},
+        {Separateur, "p.sep", "Separateur=\"\""},
+        {Separateur, "p.sep", "ChampsPoint=TYPE,MATRICULE,X,X"},  // a field twice
+        {Separateur, "p.sep", "ChampsVisee=TYPE,MATRICULE,X"},    // not a sighting's field
+        {Separateur, "p.sep", "ChampsStation=TYPE,HI"},           // no name
+        {Separateur, "p.sep", "ChampsPoint=MATRICULE,X,Y"},       // TYPE in some lists only
+        {Separateur, "p.sep", "ChampsPoint=TYPE:1-2,MATRICULE"},  // columns when delimited
+        {Colonne, "p.col", "ChampsPoint=TYPE:1-2,MATRICULE"},     // no columns
+        {Colonne, "p.col", "ChampsPoint=TYPE:1-2,MATRICULE:9-4"}, // columns backwards
+    };
+    for (const auto& [format, name, line] : refused) {
+        ui::ScriptedFrontEnd fe;
+        EXPECT_FALSE(load(format, name, line, fe)) << line;
+        EXPECT_EQ(fe.messages.size(), 1u) << line;
+    }
+    ui::ScriptedFrontEnd unread;
+    EXPECT_FALSE(CParamDriver("", dir / "absent.ini", Zeiss).Load(&unread));
     EXPECT_EQ(
-        MessageTexts(frontEnd).find("Impossible de lire le fichier de paramétrage <" + dir / "absent.ini"),
-        0u);
-    EXPECT_EQ(frontEnd.messages.size(), 1u);
+        MessageTexts(unread).find("Impossible de lire le fichier de paramétrage <" + dir / "absent.ini"), 0u);
+    EXPECT_EQ(unread.messages.size(), 1u);
 }
 
 TEST(ParamDriver, TheLayoutsOfTheDelimitedAndColumnarFiles) {

@@ -111,26 +111,20 @@ TEST(Quendal, HandWrittenLinesAreReadOrReportedWithTheirNumber) {
                                          "MESURE;108;1.5;50;100;42.1;C\n");
 }
 
-TEST(Quendal, AFieldCodeIsInterpretedThroughTheTableOnlyWhenAsked) {
-    const std::string text = "STATION;S1;1.5\nCODE;EXR 0.15;;12\nMESURE;12;1.3;10;100;25\nCODE;INCONNU 3\n";
+// Interpreted, a code keeps the point it was written for; one the table does not know stays as it stands.
+TEST(Quendal, AFieldCodeIsInterpretedThroughTheTable) {
     CTableCode table;
     ASSERT_TRUE(table.Init(DefaultCodeTable()));
-    for (const bool interpret : {false, true}) {
-        ReaderRun<CQuendalReader> run;
-        run.choices.interpret = interpret;
-        run.reader.SetCodeTable(&table);
-        const CCarnet& read = run.Read(text);
-        ASSERT_EQ(read.GetSize(), 4);
-        EXPECT_EQ(read.GetType(1), interpret ? kKindExcentrement : kKindCommand);
-        EXPECT_EQ(read.cmdAt(1), interpret ? "ExcentRad" : "EXR 0.15");
-        EXPECT_EQ(read.matAt(1), "12"); // the point the code was written for
-        if (interpret) {
-            EXPECT_EQ(static_cast<const CCommande*>(read.GetAt(1))->value(), 0.15);
-        }
-        // A code the table does not know is kept as it stands.
-        EXPECT_EQ(read.GetType(3), kKindCommand);
-        EXPECT_EQ(read.cmdAt(3), "INCONNU 3");
-    }
+    ReaderRun<CQuendalReader> run;
+    run.choices.interpret = true;
+    run.reader.SetCodeTable(&table);
+    const CCarnet& read =
+        run.Read("STATION;S1;1.5\nCODE;EXR 0.15;;12\nMESURE;12;1.3;10;100;25\nCODE;INCONNU 3\n");
+    ASSERT_EQ(Kinds(read), (std::vector<int>{kKindStation, kKindExcentrement, kKindMesure, kKindCommand}));
+    EXPECT_EQ(read.cmdAt(1), "ExcentRad");
+    EXPECT_EQ(read.matAt(1), "12");
+    EXPECT_EQ(read.As<CCommande>(1)->value(), 0.15);
+    EXPECT_EQ(read.cmdAt(3), "INCONNU 3");
 }
 
 TEST(Quendal, ExportReplacesOrCompletesAFileWithOneHeader) {
