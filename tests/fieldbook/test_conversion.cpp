@@ -183,7 +183,7 @@ TEST_F(Conversion, TheEditorsCodeTableIsUsedAndNamed) {
 TEST_F(Conversion, TheDefaultCodeTableIsNeitherReloadedNorSaved) {
     WriteBytes(dir / "job.cod", "Séparateur = A...Z\nPIQ   ExcentRad\n");
     WriteBytes(dir / "autre.cod", "Séparateur = A...Z\nEXR   ExcentRad\n");
-    WriteBytes(dir / "codes.qdl", "STATION;S1;1.5\nCODE;PIQ 0.2\nCODE;EXR 0.15\n");
+    WriteBytes(dir / "codes.qdl", "STATION;S1;1.5\nCODE;PIQ 0.2\nCODE;EXR 0.15;;12\n");
     const struct {
         const char* table;
         std::string kept;          // the key afterwards
@@ -205,6 +205,7 @@ TEST_F(Conversion, TheDefaultCodeTableIsNeitherReloadedNorSaved) {
         CCarnet written;
         ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
         EXPECT_EQ(Kinds(written), (std::vector<int>{kKindStation, c.firstKind, c.secondKind})) << c.table;
+        EXPECT_EQ(written.matAt(2), "12"); // the point the code was written for, interpreted or not
     }
 }
 

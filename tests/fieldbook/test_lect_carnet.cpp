@@ -70,83 +70,53 @@ TEST_F(LectCarnet, TheBrowseButtonsTitlesAndFilters) {
 // Each check in its order; a failure sends the person back to its field, a question answered No too.
 TEST_F(LectCarnet, TheChecksOfOkInTheirOrder) {
     const std::string noTable =
-        "Aucune table de codes n'est indiquée.\nVoulez-vous qu'aucune commande ne soit "
-        "interprétée ?";
+        "Aucune table de codes n'est indiquée.\nVoulez-vous qu'aucune commande ne soit interprétée ?|";
     const std::string missingTable =
-        "La table de codes indiquée n'existe pas.\nVoulez-vous qu'aucune commande "
-        "ne soit interprétée ?";
-    const std::string replace = "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?";
-    const std::string noCarnet = "Le fichier carnet indiqué n'existe pas !";
-    const std::string noParams = "Le fichier de paramétrage indiqué n'existe pas !";
-    struct Setup {
-        const char *carnet = nullptr, *paramFile = nullptr, *table = nullptr,
-                   *ini = nullptr; // nullptr: the fixture's
-        bool interpret = false, geoExists = false;
-    };
-    struct Expected {
-        DialogResult result;
-        Field focus;
-        std::vector<std::string> questions = {};
-        std::string message = {};
-    };
-    const struct {
-        const char* what;
-        Setup s;
-        std::vector<Answer> answers;
-        Expected e;
-    } cases[] = {
-        {"tout va bien", {}, {}, {DialogResult::Ok, Field::None}},
-        {"carnet absent, et tout le reste faux",
-         {"absent.gsi", "absent.ini", nullptr, nullptr, true, true},
-         {},
-         {DialogResult::Failed, Field::Carnet, {}, noCarnet}},
-        {"paramétrage absent",
-         {nullptr, "absent.ini"},
-         {},
-         {DialogResult::Failed, Field::ParamFile, {}, noParams}},
-        {"pas de table, non",
-         {.interpret = true},
-         {Answer::No},
-         {DialogResult::Cancel, Field::CodeTable, {noTable}}},
-        {"table absente, oui",
-         {nullptr, nullptr, "absente.cod", nullptr, true},
-         {Answer::Yes},
-         {DialogResult::Ok, Field::None, {missingTable}}},
-        {"paramétrage faux",
-         {.ini = "[Parametrage]\nReferences=toutes\n"},
-         {},
-         {DialogResult::Failed, Field::CodeTable, {}, "*"}}, // the file's reason, said once
-        {"GéoBase existante, non",
-         {.geoExists = true},
-         {Answer::No},
-         {DialogResult::Cancel, Field::GeoBase, {replace}}},
-        {"GéoBase existante, oui",
-         {.geoExists = true},
-         {Answer::Yes},
-         {DialogResult::Ok, Field::None, {replace}}},
-    };
-    for (const auto& c : cases) {
-        WriteBytes(dir / "Wild.ini", c.s.ini ? c.s.ini : "[Parametrage]\n");
-        std::filesystem::remove(dir / "carnet.geo");
-        if (c.s.geoExists) WriteBytes(dir / "carnet.geo", "");
+        "La table de codes indiquée n'existe pas.\nVoulez-vous qu'aucune commande ne soit interprétée ?|";
+    const std::string replace = "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?|";
+    const auto wild = [&] {
         CLectCarnet d(FieldBookFormat::Wild, params, "");
         d.SetCarnetFromSettings(dir / "carnet.gsi");
-        if (c.s.carnet) d.SetCarnet(dir / c.s.carnet);
-        d.SetParamFile(dir / (c.s.paramFile ? c.s.paramFile : "Wild.ini"));
-        d.SetInterpret(c.s.interpret);
-        if (c.s.table) d.SetCodeTablePath("  " + dir / c.s.table + " ");
+        d.SetParamFile(dir / "Wild.ini");
+        return d;
+    };
+    // OK pressed, with those answers: the result, the field to go back to, the questions and messages.
+    const auto check = [&](CLectCarnet& d, std::vector<Answer> answers = {}) {
         ui::ScriptedFrontEnd fe;
-        fe.answers.assign(c.answers.begin(), c.answers.end());
-        EXPECT_EQ(d.OnOK(fe), c.e.result) << c.what;
-        EXPECT_EQ(d.FocusField(), c.e.focus) << c.what;
-        EXPECT_EQ(fe.questions, c.e.questions) << c.what;
-        if (c.e.message == "*")
-            EXPECT_EQ(fe.messages.size(), 1u) << c.what;
-        else
-            EXPECT_EQ(MessageTexts(fe), c.e.message) << c.what;
-        // Going on without the missing table reads the codes as they stand; the box stays ticked.
-        EXPECT_TRUE(!c.s.table || (d.NoCodeTable() && !d.Choices().interpret && d.Interpret()));
-    }
+        fe.answers.assign(answers.begin(), answers.end());
+        const DialogResult result = d.OnOK(fe);
+        std::string said;
+        for (const std::string& question : fe.questions)
+            said += question + "|";
+        return std::tuple(result, d.FocusField(), said + MessageTexts(fe));
+    };
+    using std::tuple;
+    auto d = wild();
+    EXPECT_EQ(check(d), tuple(DialogResult::Ok, Field::None, ""));
+    d.SetParamFile(dir / "absent.ini");
+    EXPECT_EQ(check(d), tuple(DialogResult::Failed, Field::ParamFile,
+                              "Le fichier de paramétrage indiqué n'existe pas !"));
+    auto interpreting = wild();
+    interpreting.SetInterpret(true);
+    EXPECT_EQ(check(interpreting, {Answer::No}), tuple(DialogResult::Cancel, Field::CodeTable, noTable));
+    // Going on without the missing table reads the codes as they stand; the box stays ticked.
+    interpreting.SetCodeTablePath("  " + dir / "absente.cod" + " ");
+    EXPECT_EQ(check(interpreting, {Answer::Yes}), tuple(DialogResult::Ok, Field::None, missingTable));
+    EXPECT_TRUE(interpreting.NoCodeTable() && !interpreting.Choices().interpret && interpreting.Interpret());
+    WriteBytes(dir / "Wild.ini", "[Parametrage]\nReferences=toutes\n");
+    auto badSettings = wild();
+    const auto [result, focus, said] = check(badSettings);
+    EXPECT_EQ(tuple(result, focus), tuple(DialogResult::Failed, Field::CodeTable));
+    EXPECT_NE(said, "");
+    // The field book is checked first, whatever else is wrong.
+    WriteBytes(dir / "carnet.geo", "");
+    interpreting.SetCarnet(dir / "absent.gsi");
+    EXPECT_EQ(check(interpreting),
+              tuple(DialogResult::Failed, Field::Carnet, "Le fichier carnet indiqué n'existe pas !"));
+    WriteBytes(dir / "Wild.ini", "[Parametrage]\n");
+    auto existing = wild();
+    EXPECT_EQ(check(existing, {Answer::No}), tuple(DialogResult::Cancel, Field::GeoBase, replace));
+    EXPECT_EQ(check(existing, {Answer::Yes}), tuple(DialogResult::Ok, Field::None, replace));
     // The Quendal-Pc dialog has no parameter file to check.
     std::filesystem::remove(dir / "carnet.geo");
     CLecQuendal quendal(params, "");

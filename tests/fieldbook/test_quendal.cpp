@@ -3,7 +3,6 @@
 #include "FieldBookTestSupport.h"
 #include "fieldbook/ConfigQdl.h"
 #include "fieldbook/QuendalReader.h"
-#include "fieldbook/TableCode.h"
 #include "geobase/GeoFile.h"
 
 #include <gtest/gtest.h>
@@ -109,22 +108,6 @@ TEST(Quendal, HandWrittenLinesAreReadOrReportedWithTheirNumber) {
                                          "MESURE;7;0;12;100\n"
                                          "MESURE;105;1.5;50;100;42.1;\"code ;x\"\n"
                                          "MESURE;108;1.5;50;100;42.1;C\n");
-}
-
-// Interpreted, a code keeps the point it was written for; one the table does not know stays as it stands.
-TEST(Quendal, AFieldCodeIsInterpretedThroughTheTable) {
-    CTableCode table;
-    ASSERT_TRUE(table.Init(DefaultCodeTable()));
-    ReaderRun<CQuendalReader> run;
-    run.choices.interpret = true;
-    run.reader.SetCodeTable(&table);
-    const CCarnet& read =
-        run.Read("STATION;S1;1.5\nCODE;EXR 0.15;;12\nMESURE;12;1.3;10;100;25\nCODE;INCONNU 3\n");
-    ASSERT_EQ(Kinds(read), (std::vector<int>{kKindStation, kKindExcentrement, kKindMesure, kKindCommand}));
-    EXPECT_EQ(read.cmdAt(1), "ExcentRad");
-    EXPECT_EQ(read.matAt(1), "12");
-    EXPECT_EQ(read.As<CCommande>(1)->value(), 0.15);
-    EXPECT_EQ(read.cmdAt(3), "INCONNU 3");
 }
 
 TEST(Quendal, ExportReplacesOrCompletesAFileWithOneHeader) {
