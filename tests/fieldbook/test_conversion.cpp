@@ -179,45 +179,39 @@ TEST_F(Conversion, TheEditorsCodeTableIsUsedAndNamed) {
     EXPECT_EQ(converter->codeTable, &table);
 }
 
-// The default table, named in any case, is neither loaded in place of the job's table nor saved as it.
+// The default table, named in any case, is neither loaded in place of the job's table nor saved as it;
+// without a table of its own the job uses the installation's, which is not saved as its either.
 TEST_F(Conversion, TheDefaultCodeTableIsNeitherReloadedNorSaved) {
-    WriteBytes(dir / "job.cod", "Séparateur = A...Z\nPIQ   ExcentRad\n");
-    WriteBytes(dir / "autre.cod", "Séparateur = A...Z\nEXR   ExcentRad\n");
+    const std::string job = dir / "job.cod", other = dir / "autre.cod";
+    WriteBytes(job, "Séparateur = A...Z\nPIQ   ExcentRad\n");
+    WriteBytes(other, "Séparateur = A...Z\nEXR   ExcentRad\n");
     WriteBytes(dir / "codes.qdl", "STATION;S1;1.5\nCODE;PIQ 0.2\nCODE;EXR 0.15;;12\n");
     const struct {
-        const char* table;
-        std::string kept;          // the key afterwards
+        const char* table;         // on the command line
+        std::string before, kept;  // the key before and after
         int firstKind, secondKind; // how PIQ and EXR were read
     } cases[] = {
-        {"DEFAUT.COD", dir / "job.cod", kKindExcentrement, kKindCommand},
-        {"Defaut.cod", dir / "job.cod", kKindExcentrement, kKindCommand},
-        {"", dir / "autre.cod", kKindCommand, kKindExcentrement}, // the table named below
+        {"DEFAUT.COD", job, job, kKindExcentrement, kKindCommand},
+        {"Defaut.cod", job, job, kKindExcentrement, kKindCommand},
+        {other.c_str(), job, other, kKindCommand, kKindExcentrement},
+        {nullptr, "", "", CommandKind("Sym_sans_Ori"), kKindExcentrement},
     };
     for (const auto& c : cases) {
-        WriteParamString(Params(), kSectionGeocodification, kKeyTableDeCode, dir / "job.cod");
-        const std::string table = *c.table ? std::string(c.table) : dir / "autre.cod";
-        frontEnd.answers = {Answer::Yes, Answer::Yes};
+        WriteParamString(Params(), kSectionGeocodification, kKeyTableDeCode, c.before);
+        fs::remove(dir / "codes.geo");
+        frontEnd = {};
+        frontEnd.dialogArguments = {dir / "codes.qdl", "--interpretation", "1"};
+        if (c.table) frontEnd.dialogArguments.insert(frontEnd.dialogArguments.end(), {"--table", c.table});
         auto converter = Make(FieldBookFormat::Quendal);
-        frontEnd.dialogArguments = {dir / "codes.qdl", "--interpretation", "1", "--table", table};
-        ASSERT_EQ(RunConversion(*converter, nullptr), DialogResult::Ok) << c.table;
-        EXPECT_EQ(Key(kSectionGeocodification, kKeyTableDeCode), c.kept) << c.table;
-        EXPECT_EQ(converter->codeTable->FileName(), c.kept) << c.table;
+        ASSERT_EQ(RunConversion(*converter, nullptr), DialogResult::Ok) << c.kept;
+        EXPECT_TRUE(frontEnd.questions.empty()) << c.kept;
+        EXPECT_EQ(Key(kSectionGeocodification, kKeyTableDeCode), c.kept) << c.kept;
+        EXPECT_EQ(converter->codeTable->FileName(), c.table ? c.kept : install + "Config/Defaut.cod");
         CCarnet written;
         ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
-        EXPECT_EQ(Kinds(written), (std::vector<int>{kKindStation, c.firstKind, c.secondKind})) << c.table;
+        EXPECT_EQ(Kinds(written), (std::vector<int>{kKindStation, c.firstKind, c.secondKind})) << c.kept;
         EXPECT_EQ(written.matAt(2), "12"); // the point the code was written for, interpreted or not
     }
-}
-
-// Without a table of its own the job uses the installation's default table, which is not saved as its.
-TEST_F(Conversion, WithoutATableOfItsOwnTheJobUsesTheDefaultOne) {
-    WriteBytes(dir / "codes.qdl", "STATION;S1;1.5\nCODE;EXR 0.15\n");
-    EXPECT_EQ(Convert({dir / "codes.qdl", "--interpretation", "1"}), DialogResult::Ok);
-    CCarnet written;
-    ASSERT_TRUE(written.Load(nullptr, dir / "codes.geo"));
-    EXPECT_EQ(Kinds(written), (std::vector<int>{kKindStation, kKindExcentrement}));
-    EXPECT_EQ(Key(kSectionGeocodification, kKeyTableDeCode), "");
-    EXPECT_TRUE(frontEnd.questions.empty());
 }
 
 // The Wild format's pre-formatting program writes "<name>.tmp", which is read instead and then deleted; a
@@ -261,7 +255,7 @@ TEST_F(Conversion, TheWildSettingsPreformattingAndZeroPrismHeight) {
     EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), install + "Config/Wild.ini");
 }
 
-// A GSI field book through its own reader and the shipped settings, which keep the computed points.
+// A GSI field book through its own reader and the shipped settings; a comment names the field book.
 TEST_F(Conversion, AWildFieldBookIsReadByItsOwnReader) {
     fs::copy_file(FieldBookData("wild-gsi16-84.gsi"), dir / "levé.gsi");
     frontEnd.dialogArguments = {dir / "levé.gsi"};
