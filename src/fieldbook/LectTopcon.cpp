@@ -1,9 +1,425 @@
 #include "fieldbook/LectTopcon.h"
 
+#include "core/Angles.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/LectTopconTexts.h"
+#include "geobase/Carnet.h"
+#include "geobase/Matricule.h"
+#include "ui/PyrTxtWnd.h"
+
+#include <cmath>
+#include <filesystem>
+
 namespace pyr {
 
+namespace {
+
+using topcon::Keyword;
+namespace text = topcon::msg;
+
+// Beyond this a number is no measurement nor coordinate a field book holds: a wrong number, as are the
+// infinities and NaN that a number reader would otherwise let through.
+constexpr double kLargestValue = 1e9;
+constexpr double kDegreesToGrads = 400.0 / 360.0;
+constexpr double kHorizontalSighting = 100.0; // gr
+
+bool IsOn(const std::string& value) {
+    return value == "1" || EqualIgnoringCase(value, "oui");
+}
+
+char UpperInitial(std::string_view field) {
+    const char c = field.empty() ? '\0' : field.front();
+    return c >= 'a' && c <= 'z' ? static_cast<char>(c - 'a' + 'A') : c;
+}
+
+const char* AngleUnitName(AngleUnit unit) {
+    switch (unit) {
+    case AngleUnit::Grads:
+        return text::kGrads;
+    case AngleUnit::Dms:
+        return text::kDms;
+    case AngleUnit::Degrees:
+        return text::kDegrees;
+    case AngleUnit::Mils:
+        return text::kMils;
+    }
+    return text::kGrads;
+}
+
+bool Contains(const std::vector<std::string>& words, std::string_view word) {
+    for (const std::string& candidate : words)
+        if (EqualIgnoringCase(candidate, word)) return true;
+    return false;
+}
+
+} // namespace
+
 std::unique_ptr<CFieldBookReader> MakeTopconReader() {
-    return nullptr;
+    return std::make_unique<CLectTopcon>();
+}
+
+std::string CLectTopcon::OpenFailure(const std::string& path) const {
+    return Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str());
+}
+
+// ---- Settings and state ----------------------------------------------------------------------------------
+
+void CLectTopcon::ReadSettings() {
+    const CParamDriver* driver = Driver();
+    m_angles = driver ? driver->Angles() : AngleUnit::Grads;
+    m_lengths = driver ? driver->Distances() : DistanceUnit::Metres;
+    m_order = driver ? driver->Order() : CoordinateOrder::EastNorth;
+    m_marking = driver ? driver->References() : ReferenceMarking::None;
+    m_referenceCodes = driver ? driver->ReferenceCodes() : std::vector<std::string>{};
+    m_keepComputed = driver && IsOn(driver->Text(kKeyPointsCalcules));
+}
+
+void CLectTopcon::BeginReading() {
+    ReadSettings();
+    m_started = false;
+    m_stationPending = false;
+    m_stationName.clear();
+    m_stationCode.clear();
+    m_stationHi = kUndefined;
+    m_station = nullptr;
+    m_firstSighting = false;
+    m_backsight.clear();
+    m_sighting = SightingKind::None;
+    m_target.clear();
+    m_targetCode.clear();
+    m_targetHeight = kUndefined;
+    m_owner = PositionOwner::None;
+    m_ownerName.clear();
+    m_lastMeasured.clear();
+}
+
+void CLectTopcon::EndReading() {
+    if (m_stationPending) FlushStation();
+    if (m_sighting != SightingKind::None) ReportPendingSighting();
+}
+
+// ---- A line ----------------------------------------------------------------------------------------------
+
+void CLectTopcon::ReadLine(std::string_view line, int number) {
+    const std::string_view clean = topcon::CleanLine(line);
+    if (clean.empty()) return;
+    topcon::SplitRecord(clean, m_record);
+    const Keyword kind = m_record.kind;
+
+    const bool first = !m_started;
+    if (first) {
+        m_started = true;
+        if (!Path().empty())
+            AddHeaderComment(text::kLabelFile, std::filesystem::path(Path()).filename().string());
+    }
+    // A station waits only for its coordinates, a sighting only for its observation (a note between
+    // them is allowed), an XYZ line belongs only to the line just before it.
+    if (kind != Keyword::Position && m_stationPending) FlushStation();
+    const bool observation =
+        kind == Keyword::AnglesOnly || kind == Keyword::SlopeDistance || kind == Keyword::Horizontal;
+    if (!observation && kind != Keyword::Note && m_sighting != SightingKind::None) ReportPendingSighting();
+    const PositionOwner owner = m_owner;
+    m_owner = PositionOwner::None;
+
+    switch (kind) {
+    case Keyword::Job:
+        return Header(text::kLabelJob, m_record);
+    case Keyword::Date:
+        return Header(text::kLabelDate, m_record, " ");
+    case Keyword::Name:
+        return Header(text::kLabelName, m_record);
+    case Keyword::Instrument:
+        return Header(text::kLabelInstrument, m_record);
+    case Keyword::Scale:
+        return Header(text::kLabelScale, m_record);
+    case Keyword::Atmosphere:
+        return Header(text::kLabelAtmosphere, m_record);
+    case Keyword::Temperature:
+        return Header(text::kLabelTemperature, m_record);
+    case Keyword::Control:
+        return Header(text::kLabelControl, m_record);
+    case Keyword::Units:
+        return ReadUnits(number);
+    case Keyword::Station:
+        return ReadStation(number);
+    case Keyword::Position:
+        m_owner = owner;
+        return ReadPosition(number);
+    case Keyword::Backsight:
+        return ReadBacksight(number);
+    case Keyword::BackSighting:
+        return ReadSighting(SightingKind::Back, number);
+    case Keyword::ForeSighting:
+    case Keyword::SideSighting:
+        return ReadSighting(SightingKind::Fore, number);
+    case Keyword::AnglesOnly:
+    case Keyword::SlopeDistance:
+    case Keyword::Horizontal:
+        return ReadObservation(number);
+    case Keyword::Note:
+        if (!m_record.values.empty()) AddComment(std::string(m_record.values));
+        return;
+    case Keyword::Offset:
+        return ReadOffset(number);
+    case Keyword::Unknown:
+        break;
+    }
+    // The first line of a field book names the program that wrote it ("TopSURV v6.04(OnBoard)").
+    if (first) return AddHeaderComment(text::kLabelSoftware, clean);
+    LineUnrecognised(number);
+}
+
+void CLectTopcon::Header(const char* label, const topcon::Record& record, const char* separator) {
+    m_text.clear();
+    for (std::size_t i = 0; i < record.count; ++i) {
+        if (record.fields[i].empty()) continue;
+        if (!m_text.empty()) m_text += separator;
+        m_text += record.fields[i];
+    }
+    if (!m_text.empty()) AddHeaderComment(label, m_text);
+}
+
+// UNITS M|F,D|G: the lengths in metres or feet, the angles in ddd.mmss or grads. An empty field keeps
+// the unit in force.
+void CLectTopcon::ReadUnits(int number) {
+    DistanceUnit lengths = m_lengths;
+    AngleUnit angles = m_angles;
+    bool known = true;
+    switch (UpperInitial(m_record.Field(0))) {
+    case '\0':
+        break;
+    case 'M':
+        lengths = DistanceUnit::Metres;
+        break;
+    case 'F':
+        lengths = DistanceUnit::Feet;
+        break;
+    default:
+        known = false;
+    }
+    switch (UpperInitial(m_record.Field(1))) {
+    case '\0':
+        break;
+    case 'D':
+        angles = AngleUnit::Dms;
+        break;
+    case 'G':
+        angles = AngleUnit::Grads;
+        break;
+    default:
+        known = false;
+    }
+    if (!known) {
+        if (TextWindow()) TextWindow()->Print(text::kBadUnits, number, std::string(m_record.values).c_str());
+        return;
+    }
+    m_lengths = lengths;
+    m_angles = angles;
+    AddHeaderComment(text::kLabelUnits,
+                     Sprintf("%s, %s", lengths == DistanceUnit::Feet ? text::kFeet : text::kMetres,
+                             AngleUnitName(angles)));
+}
+
+// ---- Numbers ---------------------------------------------------------------------------------------------
+
+void CLectTopcon::BadNumber(std::string_view value, int number) const {
+    if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(value).c_str());
+}
+
+// An empty field is a missing value, kept undefined.
+bool CLectTopcon::ReadAngle(std::string_view value, double& grads, int number) const {
+    grads = kUndefined;
+    if (value.empty()) return true;
+    double read = 0.0;
+    const bool ok = m_angles == AngleUnit::Dms ? DmsTextToDegrees(value, read) : ParseDouble(value, read);
+    if (!ok || !std::isfinite(read) || std::fabs(read) > kLargestValue) {
+        BadNumber(value, number);
+        return false;
+    }
+    // ddd.mmss is read digit by digit into degrees, so that no rounding shifts a second.
+    grads = m_angles == AngleUnit::Dms ? read * kDegreesToGrads : ToGrads(read, m_angles);
+    return true;
+}
+
+bool CLectTopcon::ReadLength(std::string_view value, double& metres, int number) const {
+    metres = kUndefined;
+    if (value.empty()) return true;
+    double read = 0.0;
+    if (!ParseDouble(value, read) || !std::isfinite(read) || std::fabs(read) > kLargestValue) {
+        BadNumber(value, number);
+        return false;
+    }
+    metres = ToMetres(read, m_lengths);
+    return true;
+}
+
+// ---- Stations and points ---------------------------------------------------------------------------------
+
+// STN id,ih,code: the station is written once the next line says whether its coordinates follow.
+void CLectTopcon::ReadStation(int number) {
+    const std::string_view name = FormMatView(m_record.Field(0));
+    if (name.empty()) return LineMissing(number, text::kDatumStation);
+    double hi = kUndefined;
+    if (!ReadLength(m_record.Field(1), hi, number)) return;
+    m_stationPending = true;
+    m_stationName.assign(name);
+    m_stationCode.assign(m_record.Field(2));
+    m_stationHi = hi;
+    m_stationLine = number;
+    m_owner = PositionOwner::Station;
+    m_ownerName.assign(name);
+}
+
+void CLectTopcon::FlushStation() {
+    m_stationPending = false;
+    AddCode(m_stationCode, m_stationName);
+    m_station = AddStation(m_stationName, m_stationHi);
+    if (!m_station) LineError(text::kRefused, m_stationLine);
+    m_firstSighting = true;
+    m_backsight.clear();
+}
+
+bool CLectTopcon::OpenUnknownStation(int number) {
+    m_station = AddStation(text::kUnknownStation, kUndefined);
+    if (!m_station) {
+        LineError(text::kRefused, number);
+        return false;
+    }
+    if (TextWindow()) TextWindow()->Print(text::kUnknownStationOpened, number, text::kUnknownStation);
+    m_firstSighting = true;
+    m_backsight.clear();
+    return true;
+}
+
+// XYZ E,N,Z (N,E,Z with "OrdreCoordonnees=YX"): the station's point, the backsight's, or the point the
+// instrument computed from the sighting just read.
+void CLectTopcon::ReadPosition(int number) {
+    const PositionOwner owner = m_owner;
+    m_owner = PositionOwner::None;
+    if (owner == PositionOwner::None) return LineError(text::kNoOwner, number);
+    double first = kUndefined, second = kUndefined, elevation = kUndefined;
+    if (!ReadLength(m_record.Field(0), first, number) || !ReadLength(m_record.Field(1), second, number) ||
+        !ReadLength(m_record.Field(2), elevation, number))
+        return;
+    // A point may hold its planimetry, its altimetry or both, never half a planimetry.
+    if (IsKnown(first) != IsKnown(second) || (IsUndefined(first) && IsUndefined(elevation)))
+        return LineMissing(number, text::kDatumCoordinates);
+    if (owner == PositionOwner::Measured && !m_keepComputed) return;
+    const bool swap = m_order == CoordinateOrder::NorthEast;
+    if (owner == PositionOwner::Station) {
+        AddCode(m_stationCode, m_stationName);
+        m_stationCode.clear();
+    }
+    if (!AddPoint(m_ownerName, swap ? second : first, swap ? first : second, elevation))
+        LineError(text::kRefused, number);
+    if (owner == PositionOwner::Station) FlushStation();
+}
+
+// BKB id,bearing,reading: the backsight of the station, and the orientation set on it. The V0 is left to
+// the orientation computation, which checks it against every reference; the comment keeps what the
+// instrument was told.
+void CLectTopcon::ReadBacksight(int number) {
+    const std::string_view name = FormMatView(m_record.Field(0));
+    if (name.empty()) return LineMissing(number, text::kDatumPoint);
+    double bearing = kUndefined, reading = kUndefined;
+    if (!ReadAngle(m_record.Field(1), bearing, number) || !ReadAngle(m_record.Field(2), reading, number))
+        return;
+    m_backsight.assign(name);
+    if (IsKnown(bearing) || IsKnown(reading)) {
+        const auto shown = [](double grads) {
+            return IsKnown(grads) ? FormatFixed(grads, 5) : std::string("?");
+        };
+        AddComment(
+            Sprintf(text::kOrientation, m_backsight.c_str(), shown(bearing).c_str(), shown(reading).c_str()));
+    }
+    m_owner = PositionOwner::Backsight;
+    m_ownerName.assign(name);
+}
+
+// ---- Sightings -------------------------------------------------------------------------------------------
+
+// BS id[,th] or FS / SS id,th,code: written when its observation comes.
+void CLectTopcon::ReadSighting(SightingKind kind, int number) {
+    const std::string_view name = FormMatView(m_record.Field(0));
+    if (name.empty()) return LineMissing(number, text::kDatumPoint);
+    double height = kUndefined;
+    if (!ReadLength(m_record.Field(1), height, number)) return;
+    m_sighting = kind;
+    m_target.assign(name);
+    m_targetCode.assign(m_record.Field(2));
+    m_targetHeight = height;
+    m_targetLine = number;
+}
+
+void CLectTopcon::ReportPendingSighting() {
+    m_sighting = SightingKind::None;
+    LineMissing(m_targetLine, Sprintf(text::kDatumObservation, m_target.c_str()));
+}
+
+bool CLectTopcon::IsReference() const {
+    if (m_sighting == SightingKind::Back) return true;
+    if (!m_backsight.empty() && m_target == m_backsight) return true;
+    switch (m_marking) {
+    case ReferenceMarking::First:
+        return m_firstSighting;
+    case ReferenceMarking::Codes:
+        return !m_targetCode.empty() && Contains(m_referenceCodes, m_targetCode);
+    case ReferenceMarking::None:
+        break;
+    }
+    return false;
+}
+
+// HV ha,va; SD ha,va,sd; HD ha,hd,vd. A GéoBase sighting holds a zenith angle and a slope distance: a
+// horizontal distance hd with the height difference vd from the tilting axis to the target gives the
+// slope distance hypot(hd, vd) and the zenith angle atan2(hd, vd); without vd the sighting is taken as
+// horizontal (100 gr), so that its horizontal distance is kept.
+void CLectTopcon::ReadObservation(int number) {
+    if (m_sighting == SightingKind::None) return LineError(text::kNoSighting, number);
+    double ah = kUndefined, av = kUndefined, di = kUndefined;
+    bool read = ReadAngle(m_record.Field(0), ah, number);
+    if (read && m_record.kind == Keyword::Horizontal) {
+        double hd = kUndefined, vd = kUndefined;
+        read = ReadLength(m_record.Field(1), hd, number) && ReadLength(m_record.Field(2), vd, number);
+        if (IsKnown(hd) && IsKnown(vd)) {
+            di = std::hypot(hd, vd);
+            if (di > 0.0) av = RadiansToGrads(std::atan2(hd, vd));
+        } else if (IsKnown(hd)) {
+            av = kHorizontalSighting;
+            di = hd;
+        }
+    } else if (read) {
+        read = ReadAngle(m_record.Field(1), av, number);
+        if (read && m_record.kind == Keyword::SlopeDistance) read = ReadLength(m_record.Field(2), di, number);
+    }
+    if (read && IsUndefined(ah) && IsUndefined(av) && IsUndefined(di)) {
+        LineMissing(number, text::kDatumMeasures);
+        read = false;
+    }
+    if (!read) return ReportPendingSighting();
+    if (!m_station && !OpenUnknownStation(m_targetLine)) {
+        m_sighting = SightingKind::None;
+        return;
+    }
+    const bool reference = IsReference();
+    m_sighting = SightingKind::None;
+    m_firstSighting = false;
+    AddCode(m_targetCode, m_target);
+    const bool kept = reference ? AddReference(m_target, m_targetHeight, ah, av, di) != nullptr
+                                : AddMesure(m_target, m_targetHeight, ah, av, di) != nullptr;
+    if (!kept) return LineError(text::kRefused, number);
+    m_owner = PositionOwner::Measured;
+    m_ownerName = m_target;
+    m_lastMeasured = m_target;
+}
+
+// OFFSET: the values of an offset shot, which move the point of the last sighting; said, not applied.
+void CLectTopcon::ReadOffset(int number) {
+    if (TextWindow())
+        TextWindow()->Print(text::kOffsetIgnored, number, std::string(m_record.values).c_str(),
+                            m_lastMeasured.empty() ? "?" : m_lastMeasured.c_str());
 }
 
 } // namespace pyr
