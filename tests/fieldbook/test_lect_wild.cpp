@@ -232,7 +232,8 @@ TEST(LectWild, ReferencesAreKnownPointsOrMarkedByTheirCodes) {
                                                          {"premiere", "1002 1003 1003 1003 1002 "}};
     for (const auto& [marking, kinds] : cases) {
         WildRun run;
-        const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "REF, 99").Read(text);
+        const CCarnet& read =
+            run.Set(kKeyReferences, marking).Set(kKeyCodesReference, " REF, 99 ,").Read(text);
         EXPECT_EQ(Reports(run), "") << marking;
         EXPECT_EQ(Sightings(read), kinds) << marking;
     }
@@ -262,9 +263,9 @@ TEST(LectWild, TheSettingsGiveTheUnitsAndTheOrderTheWordsDoNotSay) {
     const std::string text = "110001+00000S10 84....+00010000 85....+00020000 88....+00001500 \n"
                              "110002+00000101 21....+04530000 22....+09000000 31....+00010000 \n";
     WildRun run;
-    const CCarnet& read = run.Set(kKeyUniteAngles, "dms")
+    const CCarnet& read = run.Set(kKeyUniteAngles, "DMS")
                               .Set(kKeyUniteDistances, "pieds")
-                              .Set(kKeyOrdreCoordonnees, "YX")
+                              .Set(kKeyOrdreCoordonnees, "yx")
                               .Read(text);
     ASSERT_EQ(Summary(read), kGsi8 + "1006 S10; 1001 S10; 1003 101; ");
     Expect(read, 1, {20.0 * 0.3048, 10.0 * 0.3048, kUndefined}); // 84 held the northing

@@ -30,21 +30,6 @@ TEST(ParamDriver, EveryShippedFileValidatesAndHoldsEveryKeyOfItsFormat) {
     }
 }
 
-TEST(ParamDriver, TheValuesOfTheInstrumentFormats) {
-    TempDir dir;
-    WriteBytes(dir / "Wild.ini", "[Parametrage]\nUniteAngles=DMS\nUniteDistances=pieds\nOrdreCoordonnees=yx\n"
-                                 "References=codes\nCodesReference= REF, V0 ,\nConventionStation=41\n");
-    CParamDriver driver("", dir / "Wild.ini", FieldBookFormat::Wild);
-    ASSERT_TRUE(driver.Load(nullptr));
-    EXPECT_EQ(driver.Angles(), AngleUnit::Dms);
-    EXPECT_EQ(driver.Distances(), DistanceUnit::Feet);
-    EXPECT_EQ(driver.Order(), CoordinateOrder::NorthEast);
-    EXPECT_EQ(driver.References(), ReferenceMarking::Codes);
-    EXPECT_EQ(driver.ReferenceCodes(), (std::vector<std::string>{"REF", "V0"}));
-    EXPECT_EQ(driver.Stations(), StationConvention::CodeBlock41);
-    EXPECT_EQ(driver.StationCodes(), (std::vector<std::string>{"2", "21"})); // the default
-}
-
 // One exact text for each kind of message; the other faults are only seen refused, with one message.
 TEST(ParamDriver, AWrongValueIsRefusedWithItsReason) {
     TempDir dir;
@@ -85,29 +70,17 @@ TEST(ParamDriver, AWrongValueIsRefusedWithItsReason) {
     EXPECT_EQ(unread.messages.size(), 1u);
 }
 
-TEST(ParamDriver, TheLayoutsOfTheDelimitedAndColumnarFiles) {
+// What the surveyed layouts do not show: the TAB keyword, the default record types, a list left empty.
+TEST(ParamDriver, TheLayoutKeywordsAndDefaults) {
     TempDir dir;
-    WriteBytes(dir / "p.sep", "[Parametrage]\nSeparateur=TAB\nSeparateurDecimal=,\nLignesEntete=2\n"
-                              "ChampsStation=TYPE,MATRICULE,IGNORE,HI\nChampsVisee=\n");
+    WriteBytes(dir / "p.sep", "[Parametrage]\nSeparateur=TAB\nChampsVisee=\n");
     CParamDriver delimited("", dir / "p.sep", FieldBookFormat::Separateur);
     ASSERT_TRUE(delimited.Load(nullptr));
     const RecordLayout layout = delimited.Layout();
-    EXPECT_FALSE(layout.columnar);
     EXPECT_EQ(layout.separator, "\t");
-    EXPECT_EQ(layout.decimal, ',');
-    EXPECT_EQ(layout.headerLines, 2);
     EXPECT_EQ(layout.typeStation, "ST");
-    using F = RecordField;
-    EXPECT_EQ(layout.station, (std::vector<FieldPlace>{{F::Type}, {F::Matricule}, {F::Ignore}, {F::HI}}));
     EXPECT_TRUE(layout.sighting.empty()); // not read
     EXPECT_EQ(layout.point.size(), 6u);
-
-    CParamDriver columnar("", Shipped("Param_Export.col"), FieldBookFormat::Colonne);
-    ASSERT_TRUE(columnar.Load(nullptr));
-    const RecordLayout columns = columnar.Layout();
-    EXPECT_TRUE(columns.columnar);
-    EXPECT_EQ(columns.point.front(), (FieldPlace{F::Type, 1, 2}));
-    EXPECT_EQ(columns.point.back(), (FieldPlace{F::Code, 62, 0}));
 }
 
 // The "editor": the file shown; a new one is a copy of the installation's, or holds the defaults.
