@@ -73,8 +73,15 @@ const std::vector<Key>& GeotronicsKeys() {
 const std::vector<Key>& NikonKeys() {
     return WithComputedPoints();
 }
+// SDR collectors write the northing first unless their header says otherwise.
 const std::vector<Key>& SokkiaKeys() {
-    return WithComputedPoints();
+    static const std::vector<Key> keys = [] {
+        std::vector<Key> all = WithComputedPoints();
+        for (Key& key : all)
+            if (std::string_view(key.name) == kKeyOrdreCoordonnees) key.defaultValue = kOrderYX;
+        return all;
+    }();
+    return keys;
 }
 const std::vector<Key>& TopconKeys() {
     return WithComputedPoints();

@@ -1,0 +1,97 @@
+#include "fieldbook/LectSokkiaRecords.h"
+
+#include "core/Strings.h"
+
+namespace pyr::sdr {
+
+namespace {
+
+constexpr int kFirstField = 5; // columns 1-2 the type, 3-4 the derivation code
+constexpr int kDescriptionWidth = 16;
+constexpr int kNoteWidth = 60;
+
+constexpr Layout kStation{
+    6,
+    {FieldKind::Id, FieldKind::Real, FieldKind::Real, FieldKind::Real, FieldKind::Real, FieldKind::Text},
+    kDescriptionWidth};
+constexpr Layout kTargetHeight{1, {FieldKind::Real}, 0};
+constexpr Layout kBacksight{4, {FieldKind::Id, FieldKind::Id, FieldKind::Real, FieldKind::Real}, 0};
+constexpr Layout kCoordinates{
+    5,
+    {FieldKind::Id, FieldKind::Real, FieldKind::Real, FieldKind::Real, FieldKind::Text},
+    kDescriptionWidth};
+constexpr Layout kObservation{
+    6,
+    {FieldKind::Id, FieldKind::Id, FieldKind::Real, FieldKind::Real, FieldKind::Real, FieldKind::Text},
+    kDescriptionWidth};
+constexpr Layout kNote{1, {FieldKind::Text}, kNoteWidth};
+
+int Width(FieldKind kind, Variant variant, const Layout& layout) {
+    switch (kind) {
+    case FieldKind::Id:
+        return variant == Variant::Sdr33 ? 16 : 4;
+    case FieldKind::Real:
+        return variant == Variant::Sdr33 ? 16 : 10;
+    case FieldKind::Text:
+        return layout.textWidth;
+    }
+    return 0;
+}
+
+} // namespace
+
+const Layout* LayoutOf(std::string_view type) {
+    if (type == "02") return &kStation;
+    if (type == "03") return &kTargetHeight;
+    if (type == "07") return &kBacksight;
+    if (type == "08") return &kCoordinates;
+    if (type == "09") return &kObservation;
+    if (type == "13") return &kNote;
+    return nullptr;
+}
+
+int RecordLength(const Layout& layout, Variant variant) {
+    int length = kFirstField - 1;
+    for (int i = 0; i < layout.count; ++i)
+        length += Width(layout.kinds[static_cast<std::size_t>(i)], variant, layout);
+    return length;
+}
+
+std::string_view Column(std::string_view line, int first, int width) {
+    const std::size_t start = static_cast<std::size_t>(first - 1);
+    if (start >= line.size()) return {};
+    return Trimmed(line.substr(start, static_cast<std::size_t>(width)));
+}
+
+void SplitRecord(std::string_view line, const Layout& layout, Variant variant, Fields& fields) {
+    int column = kFirstField;
+    for (int i = 0; i < layout.count; ++i) {
+        const FieldKind kind = layout.kinds[static_cast<std::size_t>(i)];
+        const int width =
+            kind == FieldKind::Text ? static_cast<int>(line.size()) : Width(kind, variant, layout);
+        fields.text[static_cast<std::size_t>(i)] = Column(line, column, width);
+        column += width;
+    }
+}
+
+Variant GuessVariant(std::string_view line, const Layout& layout) {
+    if (Column(line, kFirstField, 4).empty()) return Variant::Sdr33;
+    const std::string_view content = line.substr(0, line.find_last_not_of(' ') + 1);
+    return static_cast<int>(content.size()) > RecordLength(layout, Variant::Sdr2x) ? Variant::Sdr33
+                                                                                   : Variant::Sdr2x;
+}
+
+void Checksum::AddLine(std::string_view line) {
+    for (char c : line)
+        m_sum += static_cast<unsigned char>(c);
+    ++m_lines;
+}
+
+bool Checksum::Matches(unsigned value) const {
+    for (std::uint64_t lineEnd : {0u, 10u, 23u})
+        for (std::uint64_t lines : {m_lines, m_lines + 1})
+            if ((m_sum + lineEnd * lines) % 65536 == value) return true;
+    return false;
+}
+
+} // namespace pyr::sdr
