@@ -100,7 +100,6 @@ TEST_F(Conversion, AStoppedConversionTouchesNothing) {
         DialogResult result;
     } cases[] = {
         {"GéoBase existante gardée", {dir / "carnet.qdl"}, {Answer::No}, false, DialogResult::Cancel},
-        {"carnet absent", {dir / "absent.qdl"}, {}, false, DialogResult::Failed},
         {"table absente, pas d'interprétation refusée",
          {dir / "carnet.qdl", "--interpretation", "1", "--table", dir / "absente.cod"},
          {Answer::No},
@@ -157,26 +156,12 @@ TEST_F(Conversion, AMergeAppendsInReadingOrderWithTheInstrumentFirst) {
     EXPECT_EQ(MessageTexts(frontEnd), "Cas impossible en théorie !!!");
 }
 
-// The editor held no code table: the instrument formats say it in their own words; a table it holds is
-// used, and named in the dialog.
-TEST_F(Conversion, TheEditorsCodeTableIsUsedAndNamed) {
+TEST_F(Conversion, TheInstrumentFormatsSayTheEditorHoldsNoCodeTable) {
     EditorDocument document;
     auto converter = Make(FieldBookFormat::Wild, &document);
-    converter->makeReader = [] { return std::make_unique<CQuendalReader>(); };
-    std::string named = "?";
-    converter->showDialog = [&named](CLectCarnet& dialog) {
-        named = dialog.CodeTablePath();
-        return DialogResult::Cancel;
-    };
+    converter->showDialog = [](CLectCarnet&) { return DialogResult::Cancel; };
     RunConversion(*converter, nullptr);
     EXPECT_EQ(MessageTexts(frontEnd), "Pas de table de codes actuellement chargée !!!");
-    CTableCode table;
-    ASSERT_TRUE(table.Init(DefaultCodeTable()));
-    document.codeTable = &table;
-    RunConversion(*converter, nullptr);
-    EXPECT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(named, DefaultCodeTable());
-    EXPECT_EQ(converter->codeTable, &table);
 }
 
 // The default table, named in any case, is neither loaded in place of the job's table nor saved as it;
@@ -267,7 +252,8 @@ TEST_F(Conversion, AWildFieldBookIsReadByItsOwnReader) {
     EXPECT_EQ(written.GetType(10), kKindReference);
 }
 
-// A delimited field book goes through a Quendal-Pc file beside it, read with the same choices, then deleted.
+// A delimited field book goes through a Quendal-Pc file beside it, read with the same choices and the
+// editor's code table, then deleted.
 TEST_F(Conversion, ADelimitedFieldBookIsReadThroughAQuendalFile) {
     fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/Config/Param_Export.sep",
                   install + "Config/Param_Export.sep");
@@ -287,9 +273,16 @@ TEST_F(Conversion, ADelimitedFieldBookIsReadThroughAQuendalFile) {
     EditorDocument document{&table, {}};
     auto converter = Make(FieldBookFormat::Separateur, &document);
     converter->makeReader = [&] { return std::make_unique<CQuendalPivot>(importer); };
+    std::string named; // the editor's table, named in the dialog
+    converter->showDialog = [&](CLectCarnet& dialog) {
+        named = dialog.CodeTablePath();
+        return frontEnd.DoModal(dialog);
+    };
     frontEnd.dialogArguments = {dir / "points.txt", "--interpretation", "1"};
     CCarnet target;
     ASSERT_EQ(RunConversion(*converter, &target), DialogResult::Ok) << frontEnd.AllLines();
+    EXPECT_EQ(named, DefaultCodeTable());
+    EXPECT_EQ(converter->codeTable, &table);
     EXPECT_FALSE(fs::exists(dir / "points.tmp"));
     ASSERT_EQ(target.GetSize(), 3);
     EXPECT_EQ(target.GetType(1), kKindExcentrement);
