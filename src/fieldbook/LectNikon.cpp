@@ -1,9 +1,517 @@
 #include "fieldbook/LectNikon.h"
 
+#include "core/Angles.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/LectNikonTexts.h"
+#include "geobase/Carnet.h"
+#include "geobase/Matricule.h"
+#include "ui/PyrTxtWnd.h"
+
+#include <cmath>
+#include <filesystem>
+
 namespace pyr {
 
+namespace {
+
+namespace nik = nikon::msg;
+
+// The start (STX) and end (ETX, EOT) of a transmission and the end-of-file mark (Ctrl-Z) that a
+// download leaves around the records.
+bool IsControl(char c) {
+    return c == '\x02' || c == '\x03' || c == '\x04' || c == '\x1a';
+}
+
+bool IsDigits(std::string_view text) {
+    for (char c : text)
+        if (c < '0' || c > '9') return false;
+    return !text.empty();
+}
+
+bool IsNumber(std::string_view text) {
+    double value = 0.0;
+    return ParseDouble(text, value);
+}
+
+bool IsOn(const std::string& value) {
+    return value == "1" || EqualIgnoringCase(value, "oui");
+}
+
+bool Contains(const std::vector<std::string>& words, std::string_view word) {
+    for (const std::string& candidate : words)
+        if (EqualIgnoringCase(candidate, word)) return true;
+    return false;
+}
+
+bool IsAnyOf(std::string_view text, std::initializer_list<std::string_view> words) {
+    for (std::string_view word : words)
+        if (EqualIgnoringCase(text, word)) return true;
+    return false;
+}
+
+bool ContainsIgnoringCase(std::string_view text, std::string_view part) {
+    for (std::size_t i = 0; i + part.size() <= text.size(); ++i)
+        if (EqualIgnoringCase(text.substr(i, part.size()), part)) return true;
+    return false;
+}
+
+// The key of a declaration "Key: value": letters, blanks and dots only, so that the time of a text
+// such as "Downloaded 08-Feb-2010 11:17:17" is not taken for one.
+bool IsDeclarationKey(std::string_view key) {
+    for (char c : key)
+        if (!((c >= 'A' && c <= 'Z') || (c >= 'a' && c <= 'z') || c == ' ' || c == '.')) return false;
+    return !Trimmed(key).empty();
+}
+
+// The types of the coordinate records: uploaded, manually input, calculated, resection, and the
+// coordinates that a program computed.
+bool IsCoordinateType(std::string_view type) {
+    return IsAnyOf(type, {"UP", "MP", "CC", "RE", "MC"});
+}
+
+// A sighting's point: its number, else its identifier.
+std::string_view PointOf(std::string_view number, std::string_view id) {
+    const std::string_view name = FormMatView(number);
+    return name.empty() ? FormMatView(id) : name;
+}
+
+// The identifier of a DTM record and the instrument height written after it ("1002-1.63",
+// "1001--1.455"): the first hyphen whose rest is a number. False when there is no height.
+bool SplitHeight(std::string_view field, std::string_view& id, std::string_view& height) {
+    for (std::size_t i = field.find('-', 1); i != std::string_view::npos; i = field.find('-', i + 1)) {
+        if (IsNumber(field.substr(i + 1))) {
+            id = Trimmed(field.substr(0, i));
+            height = field.substr(i + 1);
+            return true;
+        }
+    }
+    id = field;
+    return false;
+}
+
+} // namespace
+
 std::unique_ptr<CFieldBookReader> MakeNikonReader() {
-    return nullptr;
+    return std::make_unique<CLectNikon>();
+}
+
+void CLectNikon::Split(std::string_view line, Fields& fields) {
+    fields.count = 0;
+    for (;;) {
+        const std::size_t comma = line.find(',');
+        if (fields.count < kMaxFields) fields.at[fields.count++] = Trimmed(line.substr(0, comma));
+        if (comma == std::string_view::npos) return;
+        line.remove_prefix(comma + 1);
+    }
+}
+
+// ---- Settings and state ----------------------------------------------------------------------------------
+
+void CLectNikon::ReadSettings() {
+    const CParamDriver* driver = Driver();
+    m_zeroAtZenith = true;
+    if (!driver) {
+        m_angles = AngleUnit::Grads;
+        m_distances = DistanceUnit::Metres;
+        m_order = CoordinateOrder::EastNorth;
+        m_marking = ReferenceMarking::None;
+        m_referenceCodes.clear();
+        m_keepComputed = false;
+        return;
+    }
+    m_angles = driver->Angles();
+    m_distances = driver->Distances();
+    m_order = driver->Order();
+    m_marking = driver->References();
+    m_referenceCodes = driver->ReferenceCodes();
+    m_keepComputed = IsOn(driver->Text(kKeyPointsCalcules));
+}
+
+void CLectNikon::BeginReading() {
+    ReadSettings();
+    m_hasStation = false;
+    m_station.clear();
+    m_backsight.clear();
+    m_firstSighting = false;
+    m_known.clear();
+    m_started = m_rawStarted = m_dtmStarted = false;
+}
+
+void CLectNikon::Started(const char* format) {
+    if (!m_started) {
+        m_started = true;
+        if (!Path().empty())
+            AddHeaderComment(nik::kLabelFile, std::filesystem::path(Path()).filename().string());
+    }
+    if (format) AddHeaderComment(nik::kLabelFormat, format);
+}
+
+// ---- A line ----------------------------------------------------------------------------------------------
+
+void CLectNikon::ReadLine(std::string_view line, int number) {
+    while (!line.empty() && IsControl(line.front()))
+        line.remove_prefix(1);
+    while (!line.empty() && IsControl(line.back()))
+        line.remove_suffix(1);
+    line = Trimmed(line);
+    if (line.empty()) return;
+
+    Split(line, m_fields);
+    const std::string_view type = m_fields[0];
+    // The instrument keeps a record that was measured again with a "*" in front: the later one counts.
+    if (type.starts_with('*')) return;
+    if (IsDigits(type)) {
+        if (!m_dtmStarted) {
+            m_dtmStarted = true;
+            Started(nik::kDtmFormat);
+        }
+        return ReadDtm(number);
+    }
+    if (!m_rawStarted) {
+        m_rawStarted = true;
+        Started(nullptr);
+    }
+    if (EqualIgnoringCase(type, "CO")) {
+        const std::size_t comma = line.find(',');
+        return ReadComment(comma == std::string_view::npos ? std::string_view() : line.substr(comma + 1),
+                           number);
+    }
+    if (IsCoordinateType(type)) return ReadCoordinates(number);
+    if (EqualIgnoringCase(type, "ST")) return ReadStation(number);
+    if (IsAnyOf(type, {"F1", "F2"})) return ReadShot(number, true);
+    if (IsAnyOf(type, {"SS", "CP", "SO"})) return ReadShot(number, false);
+    LineUnrecognised(number);
+}
+
+// ---- Raw format V2.00: comments and declarations ---------------------------------------------------------
+
+void CLectNikon::ReadComment(std::string_view text, int number) {
+    text = Trimmed(text);
+    if (text.empty()) return;
+    if (ContainsIgnoringCase(text, "RAW data format")) return AddHeaderComment(nik::kLabelFormat, text);
+    if (const std::size_t job = text.find("<JOB>"); job != std::string_view::npos) {
+        AddHeaderComment(nik::kLabelJob, Trimmed(text.substr(0, job)));
+        std::string_view created = Trimmed(text.substr(job + 5));
+        if (created.starts_with("Created")) created = Trimmed(created.substr(7));
+        if (!created.empty()) AddHeaderComment(nik::kLabelCreated, created);
+        return;
+    }
+    if (text.starts_with("Downloaded "))
+        return AddHeaderComment(nik::kLabelDownloaded, Trimmed(text.substr(11)));
+    if (const std::size_t colon = text.find(':');
+        colon != std::string_view::npos && IsDeclarationKey(text.substr(0, colon)) &&
+        ReadDeclaration(Trimmed(text.substr(0, colon)), Trimmed(text.substr(colon + 1)), number))
+        return;
+    AddComment(std::string(text));
+}
+
+// A declaration of the header. The units, the vertical zero and the axis order hold from here on;
+// what the reader does not know of is kept as a comment.
+bool CLectNikon::ReadDeclaration(std::string_view key, std::string_view value, int number) {
+    const auto unknown = [&] {
+        if (TextWindow())
+            TextWindow()->Print(nik::kUnknownSetting, number, std::string(value).c_str(),
+                                std::string(key).c_str());
+    };
+    const char* label = nullptr;
+    if (EqualIgnoringCase(key, "Dist Units")) {
+        label = nik::kLabelDistances;
+        if (ContainsIgnoringCase(value, "feet") || ContainsIgnoringCase(value, "ft"))
+            m_distances = DistanceUnit::Feet;
+        else if (ContainsIgnoringCase(value, "met"))
+            m_distances = DistanceUnit::Metres;
+        else
+            unknown();
+    } else if (EqualIgnoringCase(key, "Angle Units")) {
+        label = nik::kLabelAngles;
+        if (IsAnyOf(value, {"DDDMMSS", "DMS", "DDD.MMSS"}))
+            m_angles = AngleUnit::Dms;
+        else if (IsAnyOf(value, {"Gons", "Gon", "Grads", "Grades"}))
+            m_angles = AngleUnit::Grads;
+        else if (IsAnyOf(value, {"Dec.Degrees", "Dec. Degrees", "Degrees", "Decimal Degrees"}))
+            m_angles = AngleUnit::Degrees;
+        else if (IsAnyOf(value, {"Mils", "Mil"}))
+            m_angles = AngleUnit::Mils;
+        else
+            unknown();
+    } else if (EqualIgnoringCase(key, "Zero VA")) {
+        label = nik::kLabelZeroVA;
+        if (IsAnyOf(value, {"Zenith"}))
+            m_zeroAtZenith = true;
+        else if (IsAnyOf(value, {"Horizontal", "Horizon", "Level"}))
+            m_zeroAtZenith = false;
+        else
+            unknown();
+    } else if (EqualIgnoringCase(key, "Coord Order")) {
+        label = nik::kLabelOrder;
+        if (IsAnyOf(value, {"NEZ", "NE"}))
+            m_order = CoordinateOrder::NorthEast;
+        else if (IsAnyOf(value, {"ENZ", "EN"}))
+            m_order = CoordinateOrder::EastNorth;
+        else
+            unknown();
+    } else if (EqualIgnoringCase(key, "Zero azimuth")) {
+        label = nik::kLabelZeroAzimuth;
+    } else if (EqualIgnoringCase(key, "HA Raw data")) {
+        label = nik::kLabelRawHA;
+    } else if (EqualIgnoringCase(key, "Instrument")) {
+        label = nik::kLabelInstrument;
+    } else if (EqualIgnoringCase(key, "Software")) {
+        label = nik::kLabelSoftware;
+    } else if (EqualIgnoringCase(key, "Description")) {
+        label = nik::kLabelDescription;
+    } else if (EqualIgnoringCase(key, "Client")) {
+        label = nik::kLabelClient;
+    } else if (EqualIgnoringCase(key, "Comments")) {
+        label = nik::kLabelComments;
+    } else if (EqualIgnoringCase(key, "Tilt Correction")) {
+        label = nik::kLabelTilt;
+    } else {
+        return false;
+    }
+    if (!value.empty()) AddHeaderComment(label, value);
+    return true;
+}
+
+// ---- Raw format V2.00: points, stations, shots -----------------------------------------------------------
+
+// type, point, [point id], first, second, elevation, code. The identifier's place is there when the
+// record has seven fields, or six of which the third is no coordinate.
+void CLectNikon::ReadCoordinates(int number) {
+    const Fields& f = m_fields;
+    const bool idPlace = f.count >= 7 || (f.count == 6 && !IsNumber(f[2]));
+    const std::size_t first = idPlace ? 3 : 2;
+    const std::string_view name = PointOf(f[1], idPlace ? f[2] : std::string_view());
+    if (name.empty()) return LineMissing(number, nik::kDatumPoint);
+    // The coordinates that the instrument computed are kept only when the settings ask for them.
+    if (EqualIgnoringCase(f[0], "CC") && !m_keepComputed) return;
+    double a = kUndefined, b = kUndefined, z = kUndefined;
+    if (!Length(f[first], m_distances, a, number) || !Length(f[first + 1], m_distances, b, number) ||
+        !Length(f[first + 2], m_distances, z, number))
+        return;
+    AddPosition(name, a, b, z, f[first + 3], number);
+}
+
+// ST, station, [station id], backsight, [backsight id], instrument height, backsight azimuth, backsight
+// horizontal reading; the identifiers' places are there when the record has eight fields or more.
+void CLectNikon::ReadStation(int number) {
+    const Fields& f = m_fields;
+    const bool idPlaces = f.count >= 8;
+    const std::string_view name = PointOf(f[1], idPlaces ? f[2] : std::string_view());
+    const std::string_view backsight = idPlaces ? PointOf(f[3], f[4]) : PointOf(f[2], std::string_view());
+    const std::size_t hiAt = idPlaces ? 5 : 3;
+    double hi = kUndefined, azimuth = kUndefined, reading = kUndefined;
+    if (!Length(f[hiAt], m_distances, hi, number) || !Angle(f[hiAt + 1], m_angles, azimuth, number) ||
+        !Angle(f[hiAt + 2], m_angles, reading, number))
+        return;
+    if (!OpenStation(name, hi, number)) return;
+    m_backsight.assign(backsight);
+    // The orientation that the instrument was given is kept for the surveyor to see: the V0 itself is
+    // computed from the reference sightings.
+    if (backsight.empty() && IsUndefined(azimuth) && IsUndefined(reading)) return;
+    std::string text = Sprintf(nik::kBacksightStation, m_station.c_str());
+    const char* separator = "";
+    const auto part = [&](const char* format, const std::string& value) {
+        text += separator;
+        text += Sprintf(format, value.c_str());
+        separator = ",";
+    };
+    if (!backsight.empty()) part(nik::kBacksightPoint, m_backsight);
+    if (IsKnown(azimuth)) part(nik::kBacksightBearing, FormatFixed(azimuth, 5));
+    if (IsKnown(reading)) part(nik::kBacksightReading, FormatFixed(reading, 5));
+    AddComment(std::move(text));
+}
+
+// F1/F2 (backsight) or SS/CP/SO: type, point, [point id], target height, slope distance, horizontal
+// reading, vertical angle, time, code. The identifier's place is told by where the time (hh:mm:ss)
+// stands, or else by the number of fields.
+void CLectNikon::ReadShot(int number, bool backsight) {
+    const Fields& f = m_fields;
+    bool idPlace = f.count > (backsight ? 7u : 8u);
+    if (f[6].find(':') != std::string_view::npos)
+        idPlace = false;
+    else if (f[7].find(':') != std::string_view::npos)
+        idPlace = true;
+    const std::size_t first = idPlace ? 3 : 2;
+    std::string_view point = PointOf(f[1], idPlace ? f[2] : std::string_view());
+    if (point.empty() && backsight) point = m_backsight;
+    if (point.empty()) return LineMissing(number, nik::kDatumPoint);
+    if (!m_hasStation) return LineError(nik::kNoStationForSighting, number);
+    double hp = kUndefined, di = kUndefined, ah = kUndefined, av = kUndefined;
+    if (!Length(f[first], m_distances, hp, number) || !Length(f[first + 1], m_distances, di, number) ||
+        !Angle(f[first + 2], m_angles, ah, number) ||
+        !Zenith(f[first + 3], m_angles, m_zeroAtZenith, av, number))
+        return;
+    if (IsUndefined(di) && IsUndefined(ah) && IsUndefined(av))
+        return LineMissing(number, nik::kDatumObservation);
+    const std::string_view code = f[first + 5];
+    AddSighting(point, backsight || IsReference(point, code), hp, ah, av, di, code, number);
+}
+
+// ---- DTM-series format -----------------------------------------------------------------------------------
+
+// state, type, units, id[-instrument height], then for an observation (type 0) the slope distance, the
+// horizontal reading, the zenith angle and the target height, for coordinates (types 1 to 3) X, Y, Z.
+void CLectNikon::ReadDtm(int number) {
+    const Fields& f = m_fields;
+    long long type = -1;
+    if (!ParseInt(f[1], type) || type < 0 || type > 3) {
+        if (TextWindow()) TextWindow()->Print(nik::kBadType, number, std::string(f[1]).c_str());
+        return;
+    }
+    AngleUnit angles = m_angles;
+    DistanceUnit distances = m_distances;
+    const std::string_view units = f[2];
+    if (!units.empty()) {
+        const char d = units.size() == 2 ? units[0] : '?';
+        const char a = units.size() == 2 ? units[1] : '?';
+        if ((d != 'M' && d != 'F') || (a != 'D' && a != 'G' && a != 'M')) {
+            if (TextWindow()) TextWindow()->Print(nik::kBadUnits, number, std::string(units).c_str());
+            return;
+        }
+        distances = d == 'M' ? DistanceUnit::Metres : DistanceUnit::Feet;
+        angles = a == 'D' ? AngleUnit::Dms : a == 'G' ? AngleUnit::Grads : AngleUnit::Mils;
+    }
+    std::string_view id, heightText;
+    const bool station = SplitHeight(f[3], id, heightText);
+    const std::string_view name = FormMatView(id);
+    if (name.empty()) return LineMissing(number, station ? nik::kDatumStation : nik::kDatumPoint);
+    double hi = kUndefined;
+    if (station && !Length(heightText, distances, hi, number)) return;
+
+    if (type == 0) {
+        if (station) {
+            OpenStation(name, hi, number);
+            return;
+        }
+        if (!m_hasStation) return LineError(nik::kNoStationForSighting, number);
+        double di = kUndefined, ah = kUndefined, av = kUndefined, hp = kUndefined;
+        if (!Length(f[4], distances, di, number) || !Angle(f[5], angles, ah, number) ||
+            !Zenith(f[6], angles, true, av, number) || !Length(f[7], distances, hp, number))
+            return;
+        if (IsUndefined(di) && IsUndefined(ah) && IsUndefined(av))
+            return LineMissing(number, nik::kDatumObservation);
+        AddSighting(name, IsReference(name, {}), hp, ah, av, di, {}, number);
+        return;
+    }
+    double a = kUndefined, b = kUndefined, z = kUndefined;
+    if (!Length(f[4], distances, a, number) || !Length(f[5], distances, b, number) ||
+        !Length(f[6], distances, z, number))
+        return;
+    if (IsKnown(a) || IsKnown(b) || IsKnown(z)) {
+        if (!AddPosition(name, a, b, z, {}, number)) return;
+    } else if (!station) {
+        return LineMissing(number, nik::kDatumCoordinates);
+    }
+    if (station) OpenStation(name, hi, number);
+}
+
+// ---- Shared ----------------------------------------------------------------------------------------------
+
+bool CLectNikon::Length(std::string_view text, DistanceUnit unit, double& metres, int number) const {
+    metres = kUndefined;
+    if (text.empty()) return true;
+    double value = 0.0;
+    if (!ParseDouble(text, value) || !std::isfinite(value)) {
+        if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(text).c_str());
+        return false;
+    }
+    metres = ToMetres(value, unit);
+    return true;
+}
+
+bool CLectNikon::Angle(std::string_view text, AngleUnit unit, double& grads, int number) const {
+    grads = kUndefined;
+    if (text.empty()) return true;
+    double value = 0.0;
+    bool read = ParseDouble(text, value) && std::isfinite(value);
+    if (read && unit == AngleUnit::Dms) {
+        // ddd.mmss read digit by digit: 123.4530 is 123° 45' 30", exactly.
+        read = DmsTextToDegrees(text, value);
+        unit = AngleUnit::Degrees;
+    }
+    if (!read) {
+        if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(text).c_str());
+        return false;
+    }
+    grads = ToGrads(value, unit);
+    return true;
+}
+
+// A vertical angle as a zenith angle: one read from the horizon (positive upwards) is 100 gr less it.
+bool CLectNikon::Zenith(std::string_view text, AngleUnit unit, bool fromZenith, double& grads,
+                        int number) const {
+    if (!Angle(text, unit, grads, number)) return false;
+    if (!fromZenith && IsKnown(grads)) grads = WrapGrads(100.0 - grads);
+    return true;
+}
+
+bool CLectNikon::OpenStation(std::string_view name, double hi, int number) {
+    if (name.empty()) {
+        LineMissing(number, nik::kDatumStation);
+        return false;
+    }
+    CStation* station = AddStation(std::string(name), hi);
+    if (!station) {
+        LineError(nik::kRefused, number);
+        return false;
+    }
+    m_hasStation = true;
+    m_station = station->mat();
+    m_backsight.clear();
+    m_firstSighting = true;
+    return true;
+}
+
+// Coordinates in the declared order: the first is the easting unless the northing comes first. The
+// code goes in front of the point.
+bool CLectNikon::AddPosition(std::string_view name, double first, double second, double elevation,
+                             std::string_view code, int number) {
+    if (IsUndefined(first) && IsUndefined(second) && IsUndefined(elevation)) {
+        LineMissing(number, nik::kDatumCoordinates);
+        return false;
+    }
+    if (IsKnown(first) != IsKnown(second)) {
+        const bool northMissing = IsKnown(first) == (m_order == CoordinateOrder::EastNorth);
+        LineMissing(number, northMissing ? nik::kDatumNorth : nik::kDatumEast);
+        return false;
+    }
+    const bool swap = m_order == CoordinateOrder::NorthEast;
+    AddCode(code, name);
+    CPointGen* point = AddPoint(std::string(name), swap ? second : first, swap ? first : second, elevation);
+    if (!point) {
+        LineError(nik::kRefused, number);
+        return false;
+    }
+    if (point->hasXY()) m_known.insert(point->mat());
+    return true;
+}
+
+void CLectNikon::AddSighting(std::string_view point, bool reference, double hp, double ah, double av,
+                             double di, std::string_view code, int number) {
+    AddCode(code, point);
+    CVisee* sighting = reference ? static_cast<CVisee*>(AddReference(std::string(point), hp, ah, av, di))
+                                 : static_cast<CVisee*>(AddMesure(std::string(point), hp, ah, av, di));
+    m_firstSighting = false;
+    if (!sighting) LineError(nik::kRefused, number);
+}
+
+// A sighting that the field book does not mark as a backsight is a reference when its point was given
+// with coordinates, or as the settings say (the first sighting of each station, or a code among
+// "CodesReference").
+bool CLectNikon::IsReference(std::string_view point, std::string_view code) const {
+    if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
+    switch (m_marking) {
+    case ReferenceMarking::First:
+        return m_firstSighting;
+    case ReferenceMarking::Codes:
+        return !code.empty() && Contains(m_referenceCodes, code);
+    case ReferenceMarking::None:
+        break;
+    }
+    return false;
 }
 
 } // namespace pyr
