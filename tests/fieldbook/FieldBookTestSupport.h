@@ -8,6 +8,7 @@
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
 
+#include <gtest/gtest.h>
 #include <string>
 #include <vector>
 
@@ -63,3 +64,43 @@ struct ReaderRun {
         return reports;
     }
 };
+
+// The line reports of a run, one a line.
+template <class Run>
+std::string ReportText(const Run& run) {
+    std::string reports;
+    for (const std::string& line : run.Reports())
+        reports += line + "\n";
+    return reports;
+}
+
+// Each element as "kind name; ": the text of a comment, the word and parameters of a command.
+inline std::string ElementsSummary(const pyr::CCarnet& carnet) {
+    std::string lines;
+    for (int i = 0; i < carnet.GetSize(); ++i) {
+        const int kind = carnet.GetType(i);
+        lines += std::to_string(kind) + ' ';
+        if (kind == pyr::kKindComment)
+            lines += carnet.As<pyr::CComment>(i)->text();
+        else if (pyr::IsCommandKind(kind))
+            lines += carnet.cmdAt(i) + (carnet.parAt(i).empty() ? "" : " " + carnet.parAt(i));
+        else
+            lines += carnet.matAt(i);
+        lines += "; ";
+    }
+    return lines;
+}
+
+// HP, AH, AV, DI of a sighting, or X, Y, Z of a point, against values worked out independently, to 0.1 mm
+// and 0.1 mgon; kUndefined where there must be none.
+inline void ExpectValues(const pyr::CCarnet& carnet, int i, const std::vector<double>& expected) {
+    const bool point = expected.size() == 3;
+    const double actual[] = {point ? carnet.xAt(i) : carnet.hpAt(i), point ? carnet.yAt(i) : carnet.ahAt(i),
+                             point ? carnet.zAt(i) : carnet.avAt(i), carnet.diAt(i)};
+    for (std::size_t k = 0; k < expected.size() && k < 4; ++k) {
+        if (pyr::IsUndefined(expected[k]))
+            EXPECT_EQ(actual[k], pyr::kUndefined) << "value " << k << " of element " << i;
+        else
+            EXPECT_NEAR(actual[k], expected[k], 1e-4) << "value " << k << " of element " << i;
+    }
+}

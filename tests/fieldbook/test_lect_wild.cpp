@@ -39,47 +39,6 @@ struct WildRun : ReaderRun<CLectWild> {
     CCarnet& ReadFile(const std::string& name) { return Read(ReadBytes(FieldBookData(name))); }
 };
 
-// Each element as "kind name; ": the text of a comment, the word and parameters of a command.
-std::string Summary(const CCarnet& carnet) {
-    std::string lines;
-    for (int i = 0; i < carnet.GetSize(); ++i) {
-        const int kind = carnet.GetType(i);
-        std::string line = std::to_string(kind) + ' ';
-        if (kind == kKindComment)
-            line += carnet.As<CComment>(i)->text();
-        else if (IsCommandKind(kind))
-            line += carnet.cmdAt(i) + (carnet.parAt(i).empty() ? "" : " " + carnet.parAt(i));
-        else
-            line += carnet.matAt(i);
-        lines += line + "; ";
-    }
-    return lines;
-}
-
-// HP, AH, AV, DI of a sighting, or X, Y, Z of a point, against values worked out by hand, to 0.1 mm and
-// 0.1 mgon; kUndefined where there must be none.
-void Expect(const CCarnet& carnet, int i, std::vector<double> expected) {
-    const bool point = expected.size() == 3;
-    const double actual[] = {point ? carnet.xAt(i) : carnet.hpAt(i), point ? carnet.yAt(i) : carnet.ahAt(i),
-                             point ? carnet.zAt(i) : carnet.avAt(i), carnet.diAt(i)};
-    for (std::size_t k = 0; k < expected.size(); ++k) {
-        if (IsUndefined(expected[k])) {
-            EXPECT_EQ(actual[k], kUndefined) << "value " << k << " of element " << i;
-        } else {
-            EXPECT_NEAR(actual[k], expected[k], 1e-4) << "value " << k << " of element " << i;
-        }
-    }
-}
-
-// The line reports, one a line.
-template <class Run>
-std::string Reports(const Run& run) {
-    std::string reports;
-    for (const std::string& line : run.Reports())
-        reports += line + "\n";
-    return reports;
-}
-
 // Each sighting's kind, or with `names` its name, as "a b c ".
 std::string Sightings(const CCarnet& carnet, bool names = false) {
     std::string sightings;
@@ -96,33 +55,35 @@ const std::string kGsi8 = "1000 Format               = GSI-8; ";
 TEST(LectWild, AGsi16FieldBookWithStationBlocksGivesItsStationSightingsAndPoints) {
     WildRun run;
     const CCarnet& read = run.ReadFile("wild-gsi16-84.gsi");
-    EXPECT_EQ(Reports(run), "");
+    EXPECT_EQ(ReportText(run), "");
     // The station's coordinates, then the station; A1 has coordinates: a reference; the code comes before
     // its sighting; the instrument's coordinates of 104 are not kept without the setting.
-    ASSERT_EQ(Summary(read), "1000 Format               = GSI-16; 1000 Numéro de série      = 640054; "
-                             "1000 Appareil             = TCRP1201; 1000 Date                 = 01/02/2024; "
-                             "1006 S1; 1001 S1; 1006 A1; 1000 Correction atmosphérique = 0 ppm; "
-                             "1000 Constante de prisme  = 34 mm; 1002 A1; 1003 101; 1003 101; 1003 102; "
-                             "1003 A007; 1009 ARB 4.5; 1003 103; 1003 104; ");
-    Expect(read, 4, {1000.0, 2000.0, 100.0});
+    ASSERT_EQ(ElementsSummary(read),
+              "1000 Format               = GSI-16; 1000 Numéro de série      = 640054; "
+              "1000 Appareil             = TCRP1201; 1000 Date                 = 01/02/2024; "
+              "1006 S1; 1001 S1; 1006 A1; 1000 Correction atmosphérique = 0 ppm; "
+              "1000 Constante de prisme  = 34 mm; 1002 A1; 1003 101; 1003 101; 1003 102; "
+              "1003 A007; 1009 ARB 4.5; 1003 103; 1003 104; ");
+    ExpectValues(read, 4, {1000.0, 2000.0, 100.0});
     EXPECT_NEAR(read.hiAt(5), 1.55, kMetres);
     EXPECT_EQ(read.v0At(5), kUndefined);
-    Expect(read, 6, {1100.0, 2000.0, 100.0});
-    Expect(read, 9, {1.3, 100.0, 100.0, 100.0});
-    Expect(read, 10, {1.3, 50.0, 100.0, 50.0});               // 45°00'00", 90°00'00", 50.0000 m (0.1 mm)
-    Expect(read, 11, {1.3, 250.0, 300.0, 50.0});              // face II kept as read; 50.00000 m (0.01 mm)
-    Expect(read, 12, {1.3, 123.45678, 98.76543, kUndefined}); // distance missing, not 0
-    Expect(read, 13, {1.3, 50.0, 100.0, 3.048});              // 45.00000°, 1600.0000 mils, 10.000 ft
-    Expect(read, 15, {1.3, 50.0, 100.0, 12.345});
-    Expect(read, 16, {1.3, 0.0, 100.0, 10.0});
+    ExpectValues(read, 6, {1100.0, 2000.0, 100.0});
+    ExpectValues(read, 9, {1.3, 100.0, 100.0, 100.0});
+    ExpectValues(read, 10, {1.3, 50.0, 100.0, 50.0});  // 45°00'00", 90°00'00", 50.0000 m (0.1 mm)
+    ExpectValues(read, 11, {1.3, 250.0, 300.0, 50.0}); // face II kept as read; 50.00000 m (0.01 mm)
+    ExpectValues(read, 12, {1.3, 123.45678, 98.76543, kUndefined}); // distance missing, not 0
+    ExpectValues(read, 13, {1.3, 50.0, 100.0, 3.048});              // 45.00000°, 1600.0000 mils, 10.000 ft
+    ExpectValues(read, 15, {1.3, 50.0, 100.0, 12.345});
+    ExpectValues(read, 16, {1.3, 0.0, 100.0, 10.0});
 }
 
 TEST(LectWild, TheInstrumentsCoordinatesOfAMeasuredPointAreKeptWhenAsked) {
     WildRun run;
     const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("wild-gsi16-84.gsi");
     ASSERT_EQ(read.GetSize(), 18);
-    EXPECT_TRUE(Summary(read).ends_with("1003 103; 1003 104; 1006 104; ")); // the sighting, then its point
-    Expect(read, 17, {1000.0, 2010.0, 100.0 + 1.55 - 1.3});
+    EXPECT_TRUE(
+        ElementsSummary(read).ends_with("1003 103; 1003 104; 1006 104; ")); // the sighting, then its point
+    ExpectValues(read, 17, {1000.0, 2010.0, 100.0 + 1.55 - 1.3});
 }
 
 // Its first line ends in CR only. Word 43 is typed "1.55"; STA2 gives no height in its code block, the 88
@@ -130,19 +91,19 @@ TEST(LectWild, TheInstrumentsCoordinatesOfAMeasuredPointAreKeptWhenAsked) {
 TEST(LectWild, AGsi8FieldBookWithCodeBlockStationsAndCrLineEnds) {
     WildRun run;
     const CCarnet& read = run.Set(kKeyReferences, "premiere").ReadFile("wild-gsi8-41.gsi");
-    EXPECT_EQ(Reports(run), "");
-    ASSERT_EQ(Summary(read),
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read),
               kGsi8 + "1001 STA1; 1002 1; 1009 EXR 0.15; 1003 2; 1003 3; 1001 STA2; 1002 STA1; ");
     EXPECT_NEAR(read.hiAt(1), 1.55, kMetres);
-    Expect(read, 2, {1.6, 0.0, 100.0, 25.0});
-    Expect(read, 4, {1.6, 50.0, 95.0, 30.0});
-    Expect(read, 5, {1.6, 100.0, 105.0, kUndefined});
+    ExpectValues(read, 2, {1.6, 0.0, 100.0, 25.0});
+    ExpectValues(read, 4, {1.6, 50.0, 95.0, 30.0});
+    ExpectValues(read, 5, {1.6, 100.0, 105.0, kUndefined});
     EXPECT_NEAR(read.hiAt(6), 1.48, kMetres);
-    Expect(read, 7, {1.6, 200.0, 100.0, 50.0});
+    ExpectValues(read, 7, {1.6, 200.0, 100.0, 50.0});
 
     WildRun interpreting;
     const CCarnet& interpreted = interpreting.Interpreting().ReadFile("wild-gsi8-41.gsi");
-    EXPECT_TRUE(Summary(interpreted).find("; 1010 ExcentRad 0.15; 1003 2; ") != std::string::npos);
+    EXPECT_TRUE(ElementsSummary(interpreted).find("; 1010 ExcentRad 0.15; 1003 2; ") != std::string::npos);
     EXPECT_NEAR(interpreted.findER(4, 1), 0.15, kMetres);
     EXPECT_EQ(interpreted.findER(5, 1), 0.0);
 }
@@ -166,16 +127,17 @@ TEST(LectWild, TheStationConventionSaysWhichBlocksAreStations) {
     };
     for (const auto& [file, convention, elements, reports] : cases) {
         WildRun run;
-        const std::string summary = Summary(run.Set(kKeyConventionStation, convention).ReadFile(file));
+        const std::string summary =
+            ElementsSummary(run.Set(kKeyConventionStation, convention).ReadFile(file));
         EXPECT_TRUE(summary.ends_with(elements)) << file << " " << convention << ": " << summary;
-        EXPECT_EQ(Reports(run), reports) << file << " " << convention;
+        EXPECT_EQ(ReportText(run), reports) << file << " " << convention;
     }
 }
 
 TEST(LectWild, EveryLineIsReadOrReportedWithItsNumber) {
     WildRun run;
     const CCarnet& read = run.ReadFile("wild-erreurs.gsi");
-    EXPECT_EQ(Reports(run),
+    EXPECT_EQ(ReportText(run),
               "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"
               "Erreur ligne 3 : valeur numérique incorrecte <21.102+1234567X> !\n"
               "Erreur ligne 4 : donnée non reconnue !\n"
@@ -191,10 +153,11 @@ TEST(LectWild, EveryLineIsReadOrReportedWithItsNumber) {
               "Visée <210> : angle zénithal incorrect (450 gr, entre 0 et 400) : elle n'est pas ajoutée à la "
               "GéoBase !\n"
               "Erreur ligne 13 : donnée refusée par les contrôles de la GéoBase !\n");
-    EXPECT_EQ(Summary(read), kGsi8 + "1001 INCONNUE; 1003 200; 1006 ST10; 1001 ST10; 1003 204; 1003 205; "
-                                     "1003 206; 1003 208; 1003 209; ");
-    Expect(read, 3, {10.0, 20.0, kUndefined});
-    Expect(read, 7, {kUndefined, 100.0, kUndefined, kUndefined}); // unit digit 0 read in grads
+    EXPECT_EQ(ElementsSummary(read), kGsi8 +
+                                         "1001 INCONNUE; 1003 200; 1006 ST10; 1001 ST10; 1003 204; 1003 205; "
+                                         "1003 206; 1003 208; 1003 209; ");
+    ExpectValues(read, 3, {10.0, 20.0, kUndefined});
+    ExpectValues(read, 7, {kUndefined, 100.0, kUndefined, kUndefined}); // unit digit 0 read in grads
 }
 
 TEST(LectWild, EveryLineEndBlankAndControlLineGivesTheSameElements) {
@@ -210,9 +173,9 @@ TEST(LectWild, EveryLineEndBlankAndControlLineGivesTheSameElements) {
     for (const std::string& text : cases) {
         WildRun run;
         const CCarnet& read = run.Read(text);
-        EXPECT_EQ(Reports(run), "") << text;
-        ASSERT_EQ(Summary(read), kGsi8 + "1006 S10; 1001 S10; 1003 101; ") << text;
-        Expect(read, 3, {kUndefined, 123.45678, 98.76543, 12.345});
+        EXPECT_EQ(ReportText(run), "") << text;
+        ASSERT_EQ(ElementsSummary(read), kGsi8 + "1006 S10; 1001 S10; 1003 101; ") << text;
+        ExpectValues(read, 3, {kUndefined, 123.45678, 98.76543, 12.345});
     }
 }
 
@@ -234,7 +197,7 @@ TEST(LectWild, ReferencesAreKnownPointsOrMarkedByTheirCodes) {
         WildRun run;
         const CCarnet& read =
             run.Set(kKeyReferences, marking).Set(kKeyCodesReference, " REF, 99 ,").Read(text);
-        EXPECT_EQ(Reports(run), "") << marking;
+        EXPECT_EQ(ReportText(run), "") << marking;
         EXPECT_EQ(Sightings(read), kinds) << marking;
     }
 }
@@ -250,7 +213,7 @@ TEST(LectWild, IdsAreKeptAsWrittenButForTheirPadding) {
                              "*110007+0000000000000012 21.102+0000000010000000 \n";
     WildRun run;
     CCarnet& read = run.Read(text);
-    EXPECT_EQ(Reports(run), "");
+    EXPECT_EQ(ReportText(run), "");
     EXPECT_EQ(Sightings(read, true), "A007 7 A  12 1.50 7B 12 ");
     TempDir dir;
     ASSERT_TRUE(read.Save(dir / "ids.geo"));
@@ -267,10 +230,10 @@ TEST(LectWild, TheSettingsGiveTheUnitsAndTheOrderTheWordsDoNotSay) {
                               .Set(kKeyUniteDistances, "pieds")
                               .Set(kKeyOrdreCoordonnees, "yx")
                               .Read(text);
-    ASSERT_EQ(Summary(read), kGsi8 + "1006 S10; 1001 S10; 1003 101; ");
-    Expect(read, 1, {20.0 * 0.3048, 10.0 * 0.3048, kUndefined}); // 84 held the northing
+    ASSERT_EQ(ElementsSummary(read), kGsi8 + "1006 S10; 1001 S10; 1003 101; ");
+    ExpectValues(read, 1, {20.0 * 0.3048, 10.0 * 0.3048, kUndefined}); // 84 held the northing
     EXPECT_NEAR(read.hiAt(2), 1.5 * 0.3048, kMetres);
-    Expect(read, 3, {kUndefined, 45.5 * 400.0 / 360.0, 100.0, 10.0 * 0.3048});
+    ExpectValues(read, 3, {kUndefined, 45.5 * 400.0 / 360.0, 100.0, 10.0 * 0.3048});
 }
 
 // sin(50 gr) = √2 / 2; a 3-4-5 triangle (horizontal 3, height difference 4, cos AV = 4 / 5); a horizontal
@@ -286,7 +249,7 @@ TEST(LectWild, AHorizontalDistanceGivesTheSlopeDistance) {
         const CCarnet& read =
             run.Read("110001+00000S10 88..10+00001500 \n110002+00000101 " + std::string(words));
         ASSERT_EQ(read.GetSize(), 3) << words;
-        Expect(read, 2, {kUndefined, 100.0, av, di});
+        ExpectValues(read, 2, {kUndefined, 100.0, av, di});
     }
 }
 
@@ -296,12 +259,12 @@ TEST(LectWild, LevellingStaffReadingsBecomeBackAndForeReadings) {
                              "110003+000000R2 83..18+04825000 \n";
     WildRun run;
     const CCarnet& read = run.Read(text);
-    EXPECT_EQ(Reports(run), "");
-    ASSERT_EQ(Summary(read), kGsi8 + "1004 R1; 1005 R2; 1006 R2; ");
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read), kGsi8 + "1004 R1; 1005 R2; 1006 R2; ");
     EXPECT_NEAR(read.lmAt(1), 1.23456, kMetres);
     EXPECT_NEAR(read.dhAt(1), 25.0, kMetres);
     EXPECT_NEAR(read.lmAt(2), 0.98765, kMetres);
-    Expect(read, 3, {kUndefined, kUndefined, 48.25});
+    ExpectValues(read, 3, {kUndefined, kUndefined, 48.25});
 }
 
 // The time of a sighting is no header; constants repeated are said once. 220.0000 ppm (unit digit 6), a
@@ -312,14 +275,14 @@ TEST(LectWild, HeaderInformationAndConstantsAreCommentsWrittenWhenTheyChange) {
                              "110002+00000101 21.102+10000000 19....+02081031 58..16+00000020 \n"
                              "110003+00000102 21.102+10000000 51..1.+0012-017 17....+01032024 \n";
     WildRun run;
-    EXPECT_EQ(Summary(run.Read(text)),
+    EXPECT_EQ(ElementsSummary(run.Read(text)),
               kGsi8 +
                   "1000 Numéro de série      = 640054; 1000 Appareil             = TCR305; "
                   "1000 Date                 = 01/02/24; 1000 Date et heure        = 08/02 10:29; "
                   "1000 Correction atmosphérique = 220 ppm; 1000 Constante de prisme  = 2 mm; 1001 S10; "
                   "1003 101; 1000 Date                 = 01/03/2024; 1000 Correction atmosphérique = 12 ppm; "
                   "1000 Constante de prisme  = -17 mm; 1003 102; ");
-    EXPECT_EQ(Reports(run), "");
+    EXPECT_EQ(ReportText(run), "");
 }
 
 TEST(LectWild, AStationNumberOnTheMeasurementsOpensItsStation) {
@@ -330,9 +293,10 @@ TEST(LectWild, AStationNumberOnTheMeasurementsOpensItsStation) {
     for (const char* convention : {"auto", "84"}) {
         WildRun run;
         const CCarnet& read = run.Set(kKeyConventionStation, convention).Read(text);
-        EXPECT_EQ(Reports(run), "");
-        EXPECT_EQ(Summary(read), kGsi8 + "1006 S20; 1001 S20; 1003 101; 1003 102; 1001 S21; 1003 103; ");
-        Expect(read, 1, {10.0, 20.0, kUndefined});
+        EXPECT_EQ(ReportText(run), "");
+        EXPECT_EQ(ElementsSummary(read),
+                  kGsi8 + "1006 S20; 1001 S20; 1003 101; 1003 102; 1001 S21; 1003 103; ");
+        ExpectValues(read, 1, {10.0, 20.0, kUndefined});
         EXPECT_NEAR(read.hiAt(2), 1.5, kMetres);
         EXPECT_EQ(read.hiAt(5), kUndefined);
     }
