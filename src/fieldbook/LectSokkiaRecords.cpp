@@ -82,15 +82,27 @@ Variant GuessVariant(std::string_view line, const Layout& layout) {
 }
 
 void Checksum::AddLine(std::string_view line) {
-    for (char c : line)
-        m_sum += static_cast<unsigned char>(c);
+    for (std::size_t i = 0; i < line.size(); ++i) {
+        const auto c = static_cast<unsigned char>(line[i]);
+        m_bytes += c;
+        // A Latin-1 letter that the reading brought to UTF-8 (two bytes, C2 or C3 first) was one byte
+        // when the collector summed it.
+        if ((c == 0xC2 || c == 0xC3) && i + 1 < line.size()) {
+            const auto next = static_cast<unsigned char>(line[++i]);
+            m_bytes += next;
+            m_latin1 += static_cast<unsigned>((c & 0x1F) << 6 | (next & 0x3F));
+        } else {
+            m_latin1 += c;
+        }
+    }
     ++m_lines;
 }
 
 bool Checksum::Matches(unsigned value) const {
-    for (std::uint64_t lineEnd : {0u, 10u, 23u})
-        for (std::uint64_t lines : {m_lines, m_lines + 1})
-            if ((m_sum + lineEnd * lines) % 65536 == value) return true;
+    for (std::uint64_t sum : {m_bytes, m_latin1})
+        for (std::uint64_t lineEnd : {0u, 10u, 23u})
+            for (std::uint64_t lines : {m_lines, m_lines + 1})
+                if ((sum + lineEnd * lines) % 65536 == value) return true;
     return false;
 }
 

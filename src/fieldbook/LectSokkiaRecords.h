@@ -51,15 +51,16 @@ Variant GuessVariant(std::string_view line, const Layout& layout);
 // The checksum that closes a framed transfer: the sum of the data bytes modulo 65536. Whether the line
 // ends were counted depends on the collector and on what the transfer made of them, so every usual
 // counting is accepted: the bytes alone, with LF, or with CR LF after each line (the line of the STX
-// counted or not).
+// counted or not); a Latin-1 text counts its letters as the single bytes they were.
 class Checksum {
 public:
-    void Reset() { m_sum = 0, m_lines = 0; }
+    void Reset() { m_bytes = m_latin1 = m_lines = 0; }
     void AddLine(std::string_view line);
     bool Matches(unsigned value) const;
 
 private:
-    std::uint64_t m_sum = 0;
+    std::uint64_t m_bytes = 0;
+    std::uint64_t m_latin1 = 0;
     std::uint64_t m_lines = 0;
 };
 
