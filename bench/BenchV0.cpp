@@ -1,12 +1,12 @@
 // Orienting every station of a big job at once ("Toutes"): the time must grow with the number of
 // stations, each found with its references through the store's index, never by a scan of the GéoBase.
 #include "JobGenerator.h"
+#include "SilentFrontEnd.h"
 #include "calc/CalculV0Sta.h"
 #include "calc/Corrections.h"
 #include "core/Angles.h"
 #include "geobase/Elements.h"
 #include "geobase/Kinds.h"
-#include "ui/FrontEnd.h"
 
 #include <benchmark/benchmark.h>
 #include <cmath>
@@ -16,21 +16,6 @@
 namespace pyr::bench {
 
 namespace {
-
-// A front end that nobody watches: the messages and lines of thousands of stations go nowhere.
-class SilentFrontEnd : public ui::FrontEnd {
-public:
-    void MessageBox(std::string_view, std::string_view, int) override { ++messages; }
-    ui::Answer Ask(std::string_view, std::string_view, ui::Buttons, ui::Answer byDefault, int) override {
-        return byDefault;
-    }
-    std::optional<std::string> ChooseFile(const ui::FileChoice& choice) override { return choice.startPath; }
-    void TextLine(std::string_view) override {}
-    ui::DialogResult DoModal(ui::DialogModel&) override { return ui::DialogResult::Cancel; }
-    void ShowFile(const std::string&) override {}
-
-    int messages = 0;
-};
 
 // The job's reference sightings read again as a good instrument would read them from the coordinates:
 // each station's circle turned by a V0 of its own, the directions off by at most 0.1 mgon.

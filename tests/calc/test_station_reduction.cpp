@@ -9,7 +9,6 @@
 #include "ui/ScriptedFrontEnd.h"
 
 #include <array>
-#include <chrono>
 #include <cmath>
 #include <gtest/gtest.h>
 
@@ -280,33 +279,6 @@ TEST_F(Reduction, BlocksRunFromTheOffsetsInFrontOfTheStationToItsLastSightingAnd
     ExpectSighting(geo, 9, "T", 110.0, 100.0, 20.5, 1.6);
     EXPECT_NEAR(geo.hpAt(10), 1.35, 1e-9);
     EXPECT_NEAR(geo.hpAt(11), 1.6, 1e-9);
-}
-
-// 10 000 stations: 5 000 points occupied twice, each set-up with three references (one of them
-// repeated) and a face-right measure on an eccentric target; the second set-up turned back by 7 gr.
-TEST(ReductionSpeed, TenThousandStationsReduceInWellUnderASecond) {
-    Geo geo;
-    for (int s = 0; s < 5000; ++s)
-        for (double turn : {0.0, 7.0}) {
-            const std::string name = "S" + std::to_string(s), ref = "R" + std::to_string(s) + "_";
-            geo.Exc(kExcentVer, 0.05).Sta(name, 1.5 + turn / 70.0);
-            for (int r : {0, 1, 2})
-                geo.Ref(ref + std::to_string(r), 1.3, WrapGrads(r * 100.0 - turn), 100.0, 50.0);
-            geo.Exc(kExcentRad, 0.1).Mes("P" + std::to_string(s), 1.3, WrapGrads(250.0 - turn), 300.0, 20.0);
-            geo.Ref(ref + "0", 1.3, WrapGrads(-turn), 100.0, 50.0).Pt(name, s, s, 0);
-        }
-    geo.Sta("FIN", 1.0);
-    CReduction_Station dialog(&geo);
-    dialog.Options() = ReductionOptions{.suppress = true, .doMeans = true, .inExcent = true};
-    ui::ScriptedFrontEnd frontEnd;
-    const auto start = std::chrono::steady_clock::now();
-    dialog.Reduce(frontEnd);
-    // Generous enough for a sanitized debug build; a scan of the whole GéoBase per station takes minutes.
-    EXPECT_LT(std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count(), 5.0);
-
-    // Each point's two known points where they were; after the last station, the merged stations.
-    EXPECT_EQ(geo.GetSize(), 5000 * 7 + 1);
-    EXPECT_EQ(geo.matAt(10001), "S0");
 }
 
 } // namespace
