@@ -3,6 +3,7 @@
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectSokkiaTexts.h"
 #include "geobase/Carnet.h"
@@ -179,7 +180,7 @@ void CLectSokkia::ReadRecord(std::string_view line, int number) {
     if (const sdr::Layout* layout = sdr::LayoutOf(type)) {
         if (!m_variantKnown && type != "03" && type != "13") SetVariant(sdr::GuessVariant(content, *layout));
         const int expected = sdr::RecordLength(*layout, m_variant);
-        if (static_cast<int>(content.size()) > expected) CheckLength(number, line, expected);
+        if (static_cast<int>(Utf8Length(content)) > expected) CheckLength(number, line, expected);
         sdr::SplitRecord(content, *layout, m_variant, m_fields);
         switch (type[1]) {
         case '2':
