@@ -1,9 +1,578 @@
 #include "fieldbook/LectZeiss.h"
 
+#include "core/Angles.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/LectWildTexts.h"
+#include "fieldbook/LectZeissTexts.h"
+#include "geobase/Carnet.h"
+#include "geobase/Matricule.h"
+#include "ui/PyrTxtWnd.h"
+
+#include <algorithm>
+#include <cctype>
+#include <cmath>
+#include <filesystem>
+
 namespace pyr {
 
+namespace {
+
+namespace text = zeiss::msg;
+namespace shared = gsi::msg;
+using zeiss::Layout;
+
+// A zenith angle this close to 0 or 200 gr gives no horizontal distance to divide by.
+constexpr double kVerticalSine = 1e-9;
+constexpr double kHorizontalSighting = 100.0; // gr
+constexpr double kRightAngle = 100.0;         // gr
+constexpr double kNadir = 200.0;              // gr
+
+// The end of a transmission (ETX, EOT) or of a file (Ctrl-Z) ends the data of its line; the start of a
+// transmission (STX) in front of a line is dropped.
+constexpr std::string_view kEndControls{"\x03\x04\x1a", 3};
+constexpr char kSTX = '\x02';
+
+// The marker that the code field of a point line holds for the instrument's station.
+constexpr std::string_view kStationMarker = "S";
+
+enum class Unit { None, Metres, Feet, Grads, Degrees, Dms, Mils, Percent, Unknown };
+
+Unit UnitOf(std::string_view unit) {
+    if (unit.empty()) return Unit::None;
+    struct Name {
+        const char* word;
+        Unit unit;
+    };
+    static constexpr Name kNames[] = {{"m", Unit::Metres},  {"ft", Unit::Feet},  {"gon", Unit::Grads},
+                                      {"grd", Unit::Grads}, {"gr", Unit::Grads}, {"deg", Unit::Degrees},
+                                      {"DMS", Unit::Dms},   {"mil", Unit::Mils}, {"%", Unit::Percent}};
+    for (const Name& name : kNames)
+        if (EqualIgnoringCase(unit, name.word)) return name.unit;
+    return Unit::Unknown;
+}
+
+bool IsLength(Unit unit) {
+    return unit == Unit::Metres || unit == Unit::Feet;
+}
+
+bool IsAngle(Unit unit) {
+    return unit == Unit::Grads || unit == Unit::Degrees || unit == Unit::Dms || unit == Unit::Mils;
+}
+
+AngleUnit AngleUnitOf(Unit unit) {
+    switch (unit) {
+    case Unit::Degrees:
+        return AngleUnit::Degrees;
+    case Unit::Dms:
+        return AngleUnit::Dms;
+    case Unit::Mils:
+        return AngleUnit::Mils;
+    default:
+        return AngleUnit::Grads;
+    }
+}
+
+// What a value's type says it is.
+enum class Kind {
+    Slope,
+    Horizontal,
+    HeightDifference,
+    Hz,
+    Zenith,    // V1
+    Elevation, // V2: from the horizon, up positive
+    Nadir,     // V3: from the nadir
+    Grade,     // V4: the slope of the sighting, in % (or an angle from the horizon)
+    X,
+    Y,
+    Z,
+    East,
+    North,
+    Reflector,
+    Instrument,
+    Orientation,
+    Scale,
+    Temperature,
+    Pressure,
+    HeaderWord,
+    Unknown
+};
+
+Kind KindOf(std::string_view type) {
+    struct Name {
+        const char* word;
+        Kind kind;
+    };
+    static constexpr Name kNames[] = {{"SD", Kind::Slope},
+                                      {"HD", Kind::Horizontal},
+                                      {"h", Kind::HeightDifference},
+                                      {"Hz", Kind::Hz},
+                                      {"V1", Kind::Zenith},
+                                      {"V2", Kind::Elevation},
+                                      {"V3", Kind::Nadir},
+                                      {"V4", Kind::Grade},
+                                      {"X", Kind::X},
+                                      {"x", Kind::X},
+                                      {"Y", Kind::Y},
+                                      {"y", Kind::Y},
+                                      {"Z", Kind::Z},
+                                      {"E", Kind::East},
+                                      {"e", Kind::East},
+                                      {"N", Kind::North},
+                                      {"n", Kind::North},
+                                      {"th", Kind::Reflector},
+                                      {"ih", Kind::Instrument},
+                                      {"Om", Kind::Orientation},
+                                      {"m", Kind::Scale},
+                                      {"T", Kind::Temperature},
+                                      {"T_", Kind::Temperature},
+                                      {"P", Kind::Pressure}};
+    for (const Name& name : kNames)
+        if (type == name.word) return name.kind;
+    if (type.size() == 2 && std::isdigit(static_cast<unsigned char>(type[0])) &&
+        std::isdigit(static_cast<unsigned char>(type[1])))
+        return Kind::HeaderWord;
+    return Kind::Unknown;
+}
+
+bool IsLengthKind(Kind kind) {
+    return kind <= Kind::HeightDifference || (kind >= Kind::X && kind <= Kind::Instrument);
+}
+
+// Programs of the instrument that set up a station: their sightings orient it.
+bool IsSetUpProgram(std::string_view words) {
+    return words.find("STAT") != std::string_view::npos || words.starts_with("OR.") ||
+           words.starts_with("ORIENT") || words.starts_with("RESECT");
+}
+
+// Texts that say something within a program without starting another one.
+bool IsWithinProgram(std::string_view words) {
+    for (const char* word : {"INPUT", "ADJUST", "COM-ON", "COM-OFF", "START", "END"})
+        if (words.starts_with(word)) return true;
+    return words.empty();
+}
+
+const char* LayoutName(Layout layout) {
+    switch (layout) {
+    case Layout::M5:
+        return "M5";
+    case Layout::R4:
+        return "R4";
+    case Layout::R5:
+        return "R5";
+    case Layout::Rec500:
+        return "Rec 500";
+    case Layout::Unknown:
+        break;
+    }
+    return "";
+}
+
+std::string WithUnit(std::string_view number, std::string_view unit) {
+    std::string shown(number);
+    if (!unit.empty()) shown.append(" ").append(unit);
+    return shown;
+}
+
+bool Contains(const std::vector<std::string>& words, std::string_view word) {
+    return std::any_of(words.begin(), words.end(),
+                       [&](const std::string& candidate) { return EqualIgnoringCase(candidate, word); });
+}
+
+} // namespace
+
+// The values of one line in grads and metres, kUndefined where the line gives none.
+struct CLectZeiss::Values {
+    double hz = kUndefined, zenith = kUndefined;
+    double slope = kUndefined, horizontal = kUndefined, heightDifference = kUndefined;
+    double east = kUndefined, north = kUndefined, elevation = kUndefined;
+    double reflector = kUndefined, instrument = kUndefined;
+
+    bool HasObservation() const {
+        return IsKnown(hz) || IsKnown(zenith) || IsKnown(slope) || IsKnown(horizontal);
+    }
+    bool HasPosition() const { return IsKnown(east) || IsKnown(north) || IsKnown(elevation); }
+};
+
+// ---- Settings and state ----------------------------------------------------------------------------------
+
+void CLectZeiss::ReadSettings() {
+    const CParamDriver* driver = Driver();
+    m_angles = driver ? driver->Angles() : AngleUnit::Grads;
+    m_distances = driver ? driver->Distances() : DistanceUnit::Metres;
+    // The instrument's X is its northing unless the settings say the easting comes first in X.
+    m_xNorth = !driver || driver->Order() == CoordinateOrder::NorthEast;
+    m_marking = driver ? driver->References() : ReferenceMarking::None;
+    m_referenceCodes = driver ? driver->ReferenceCodes() : std::vector<std::string>{};
+    const std::string& computed = driver ? driver->Text(kKeyPointsCalcules) : std::string();
+    m_keepComputed = computed == "1" || EqualIgnoringCase(computed, "oui");
+}
+
+void CLectZeiss::BeginReading() {
+    ReadSettings();
+    m_layout = Layout::Unknown;
+    m_places = {};
+    m_station = nullptr;
+    m_sighted = m_settingUp = m_setUp = m_knownStation = false;
+    m_hi = m_reflector = kUndefined;
+    m_typesSaid.clear();
+    m_unitsSaid.clear();
+    for (std::string* last : {&m_instrument, &m_serial, &m_version, &m_axes, &m_scale, &m_orientation,
+                              &m_temperature, &m_pressure})
+        last->clear();
+    m_started = false;
+}
+
+// ---- A line ----------------------------------------------------------------------------------------------
+
+void CLectZeiss::ReadLine(std::string_view line, int number) {
+    if (!line.empty() && line.front() == kSTX) line.remove_prefix(1);
+    line = line.substr(0, line.find_first_of(kEndControls));
+    const std::string_view words = Trimmed(line);
+    if (words.empty() || words == "END") return;
+    if (!Split(line, number)) {
+        LineUnrecognised(number);
+        if (TextWindow()) TextWindow()->Print(fb::kStringRead, std::string(words).c_str());
+        return;
+    }
+    Values values;
+    if (!ReadValues(number, values)) return;
+    if (m_record.errorFlag && TextWindow()) TextWindow()->Print(text::kFlaggedLine, number);
+    if (m_record.text)
+        ReadTextRecord(values);
+    else
+        ReadPoint(values, number);
+}
+
+bool CLectZeiss::Split(std::string_view line, int number) {
+    Layout layout = zeiss::LayoutOf(line);
+    if (layout == Layout::Unknown && (m_layout == Layout::Unknown || m_layout == Layout::Rec500))
+        layout = Layout::Rec500;
+    // A fixed-width line may carry blanks beyond its last column, not fewer columns.
+    const int width = layout == Layout::M5       ? zeiss::kM5Width
+                      : layout == Layout::Rec500 ? zeiss::kRec500Width
+                                                 : 0;
+    const auto Checked = [&](bool cut) {
+        if (!cut) return false;
+        const std::size_t filled = line.find_last_not_of(' ') + 1;
+        if (width > 0 && static_cast<int>(line.size()) != width &&
+            (static_cast<int>(line.size()) < width || static_cast<int>(filled) > width))
+            CheckLength(number, line, width);
+        return true;
+    };
+    bool cut = false;
+    switch (layout) {
+    case Layout::M5:
+        cut = Checked(zeiss::SplitM5(line, m_places, m_record));
+        break;
+    case Layout::R4:
+    case Layout::R5:
+        cut = Checked(zeiss::SplitR4R5(line, layout == Layout::R5, m_record));
+        break;
+    case Layout::Rec500:
+        cut = Checked(zeiss::SplitRec500(line, m_record));
+        break;
+    case Layout::Unknown:
+        break;
+    }
+    if (!cut) return false;
+    if (!m_started) {
+        m_started = true;
+        m_layout = layout;
+        if (!Path().empty())
+            AddHeaderComment(text::kLabelFile, std::filesystem::path(Path()).filename().string());
+        AddHeaderComment(text::kLabelFormat, LayoutName(layout));
+    }
+    return true;
+}
+
+void CLectZeiss::WarnOnce(std::vector<std::string>& said, const char* format, std::string_view what,
+                          int number) {
+    if (Contains(said, what)) return;
+    said.emplace_back(what);
+    if (TextWindow()) TextWindow()->Print(format, number, said.back().c_str());
+}
+
+// Every value of the line into grads and metres. False, the line reported, when a number cannot be read.
+bool CLectZeiss::ReadValues(int number, Values& values) {
+    for (std::size_t i = 0; i < m_record.valueCount; ++i) {
+        const zeiss::Value& value = m_record.values[i];
+        const Kind kind = KindOf(value.type);
+        if (kind == Kind::HeaderWord) {
+            ReadHeaderWord(value.type, WithUnit(value.number, value.unit));
+            continue;
+        }
+        if (kind == Kind::Unknown) {
+            WarnOnce(m_typesSaid, text::kUnknownType, value.type, number);
+            continue;
+        }
+        if (value.number.empty()) continue; // a type without its value: nothing measured
+        const std::string shown = WithUnit(value.number, value.unit);
+        switch (kind) {
+        case Kind::Scale:
+            Header(m_scale, text::kLabelScale, shown);
+            continue;
+        case Kind::Temperature:
+            Header(m_temperature, text::kLabelTemperature, shown);
+            continue;
+        case Kind::Pressure:
+            Header(m_pressure, text::kLabelPressure, shown);
+            continue;
+        default:
+            break;
+        }
+
+        // A unit that does not fit the value (an angle in metres) is not trusted: the settings' one is taken.
+        Unit unit = UnitOf(value.unit);
+        const bool percent = unit == Unit::Percent && kind == Kind::Grade;
+        const bool fits = IsLengthKind(kind) ? IsLength(unit) : IsAngle(unit);
+        if (unit != Unit::None && !percent && !fits) {
+            WarnOnce(m_unitsSaid, text::kUnknownUnit, value.unit, number);
+            unit = Unit::None;
+        }
+        double read = 0.0;
+        bool ok = false;
+        if (IsLengthKind(kind)) {
+            ok = ParseDouble(value.number, read);
+            const DistanceUnit distances = unit == Unit::None   ? m_distances
+                                           : unit == Unit::Feet ? DistanceUnit::Feet
+                                                                : DistanceUnit::Metres;
+            read = ToMetres(read, distances);
+        } else if (percent) {
+            ok = ParseDouble(value.number, read);
+            read = kRightAngle - RadiansToGrads(std::atan(read / 100.0));
+        } else {
+            const AngleUnit angles = unit == Unit::None ? m_angles : AngleUnitOf(unit);
+            double degrees = 0.0;
+            if (angles == AngleUnit::Dms) {
+                ok = DmsTextToDegrees(value.number, degrees);
+                read = ToGrads(degrees, AngleUnit::Degrees);
+            } else {
+                ok = ParseDouble(value.number, read);
+                read = ToGrads(read, angles);
+            }
+        }
+        if (!ok || !std::isfinite(read)) {
+            if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(value.number).c_str());
+            return false;
+        }
+        switch (kind) {
+        case Kind::Slope:
+            values.slope = read;
+            break;
+        case Kind::Horizontal:
+            values.horizontal = read;
+            break;
+        case Kind::HeightDifference:
+            values.heightDifference = read;
+            break;
+        case Kind::Hz:
+            values.hz = WrapGrads(read);
+            break;
+        case Kind::Zenith:
+            values.zenith = WrapGrads(read);
+            break;
+        case Kind::Elevation:
+            values.zenith = WrapGrads(kRightAngle - read);
+            break;
+        case Kind::Nadir:
+            values.zenith = WrapGrads(kNadir - read);
+            break;
+        case Kind::Grade:
+            values.zenith = WrapGrads(percent ? read : kRightAngle - read);
+            break;
+        case Kind::X:
+            (m_xNorth ? values.north : values.east) = read;
+            break;
+        case Kind::Y:
+            (m_xNorth ? values.east : values.north) = read;
+            break;
+        case Kind::Z:
+            values.elevation = read;
+            break;
+        case Kind::East:
+            values.east = read;
+            break;
+        case Kind::North:
+            values.north = read;
+            break;
+        case Kind::Reflector:
+            values.reflector = read;
+            break;
+        case Kind::Instrument:
+            values.instrument = read;
+            break;
+        case Kind::Orientation:
+            Header(m_orientation, text::kLabelOrientation, FormatShortest(RoundToDecimals(read, 5)) + " gr");
+            break;
+        default:
+            break;
+        }
+    }
+    if (IsKnown(values.reflector)) m_reflector = values.reflector;
+    if (IsKnown(values.instrument)) m_hi = values.instrument;
+    return true;
+}
+
+void CLectZeiss::Header(std::string& last, const char* label, std::string_view value) {
+    if (value.empty() || value == last) return;
+    last.assign(value);
+    AddHeaderComment(label, value);
+}
+
+// The words of an instrument's header (between "START" and "END").
+void CLectZeiss::ReadHeaderWord(std::string_view type, std::string_view value) {
+    if (type == "01") return Header(m_instrument, text::kLabelInstrument, value);
+    if (type == "02") return Header(m_serial, text::kLabelSerial, value);
+    if (type == "03") return Header(m_version, text::kLabelVersion, value);
+    const int number = LenientAtoi(value);
+    if (type == "05") {
+        // The axes of the coordinates: 1 X east and Y north, 2 X north and Y east, 3 N and E.
+        if (number == 1) m_xNorth = false;
+        if (number == 2) m_xNorth = true;
+        if (number >= 1 && number <= 3)
+            Header(m_axes, text::kLabelAxes,
+                   number == 1   ? text::kAxesXEast
+                   : number == 2 ? text::kAxesXNorth
+                                 : text::kAxesNorthEast);
+        return;
+    }
+    // The places of the information, the code and the point id in the information block.
+    if (number < 1 || number > 27) return;
+    if (type == "20") m_places.information = number;
+    if (type == "21") m_places.code = number;
+    if (type == "22") m_places.point = number;
+}
+
+// ---- Texts -----------------------------------------------------------------------------------------------
+
+void CLectZeiss::ReadTextRecord(const Values& values) {
+    const std::string_view words = m_record.words;
+    if (!IsWithinProgram(words)) {
+        m_settingUp = false;
+        m_setUp = IsSetUpProgram(words);
+        m_knownStation = words.starts_with("KN STAT");
+        AddComment(std::string(words));
+    }
+    if (IsKnown(values.instrument)) SetInstrumentHeight(values.instrument);
+}
+
+// ---- Points, stations and sightings ----------------------------------------------------------------------
+
+void CLectZeiss::ReadPoint(const Values& values, int number) {
+    if (m_record.point.empty()) {
+        // A line of settings only (a Rec 500 line of m and Om) names no point.
+        if (m_record.code.empty() && m_record.valueCount > 0 && !values.HasObservation() &&
+            !values.HasPosition())
+            return ReadTextRecord(values);
+        return LineMissing(number, shared::kDatumPoint);
+    }
+    if (m_record.code == kStationMarker) return ReadStation(values, number);
+    if (values.HasObservation()) return ReadSighting(values, number);
+    if (values.HasPosition()) {
+        AddPosition(m_record.point, values, true, number);
+        return;
+    }
+    if (IsKnown(values.instrument)) return SetInstrumentHeight(values.instrument);
+    if (IsUndefined(values.reflector)) LineMissing(number, text::kDatumContent);
+}
+
+void CLectZeiss::ReadStation(const Values& values, int number) {
+    const std::string_view name = FormMatView(m_record.point);
+    // The lines of one set-up (its coordinates, then its height) name the same station.
+    const bool same = m_station && m_settingUp && m_station->mat() == name;
+    if (!same && !OpenStation(name, number)) return;
+    if (IsKnown(values.instrument)) SetInstrumentHeight(values.instrument);
+    if (values.HasPosition()) AddPosition(name, values, false, number);
+}
+
+bool CLectZeiss::OpenStation(std::string_view name, int number) {
+    CStation* station = AddStation(std::string(name), m_hi, m_knownStation ? 0.0 : kUndefined);
+    if (!station) {
+        LineError(shared::kRefused, number);
+        return false;
+    }
+    m_station = station;
+    m_sighted = false;
+    m_settingUp = true;
+    return true;
+}
+
+// An instrument height given within a set-up is that of its station; given once the station measures
+// or another program has begun, it waits for the next station.
+void CLectZeiss::SetInstrumentHeight(double hi) {
+    m_hi = hi;
+    if (m_station && m_settingUp) m_station->setHI(hi);
+}
+
+bool CLectZeiss::IsReference() const {
+    if (m_setUp) return true;
+    switch (m_marking) {
+    case ReferenceMarking::First:
+        return !m_sighted;
+    case ReferenceMarking::Codes:
+        return !m_record.code.empty() && Contains(m_referenceCodes, m_record.code);
+    case ReferenceMarking::None:
+        break;
+    }
+    return false;
+}
+
+void CLectZeiss::ReadSighting(const Values& values, int number) {
+    if (!m_station) {
+        if (!OpenStation(shared::kUnknownStation, number)) return;
+        if (TextWindow()) TextWindow()->Print(shared::kUnknownStationOpened, number, shared::kUnknownStation);
+    }
+    double av = values.zenith, di = values.slope;
+    if (IsUndefined(di) && IsKnown(values.horizontal)) {
+        // The slope distance from the horizontal one: by the zenith angle, or with the height difference
+        // from the tilting axis to the target; alone, the sighting is taken as horizontal.
+        const double sine = IsKnown(av) ? std::fabs(SinGrads(av)) : 0.0;
+        if (sine > kVerticalSine) {
+            di = values.horizontal / sine;
+        } else if (IsUndefined(av) && IsKnown(values.heightDifference)) {
+            di = std::hypot(values.horizontal, values.heightDifference);
+            av = RadiansToGrads(std::atan2(values.horizontal, values.heightDifference));
+        } else if (IsUndefined(av)) {
+            av = kHorizontalSighting;
+            di = values.horizontal;
+        }
+    }
+    const std::string point(m_record.point);
+    AddCode(PointCode(), point);
+    const bool reference = IsReference();
+    CVisee* sighting = reference ? static_cast<CVisee*>(AddReference(point, m_reflector, values.hz, av, di))
+                                 : static_cast<CVisee*>(AddMesure(point, m_reflector, values.hz, av, di));
+    m_sighted = true;
+    m_settingUp = false;
+    if (!sighting) return LineError(shared::kRefused, number);
+    if (m_keepComputed && IsKnown(values.east) && IsKnown(values.north))
+        AddPosition(point, values, false, number);
+}
+
+// The code of the point line, followed by its information.
+const std::string& CLectZeiss::PointCode() {
+    m_text.assign(m_record.code);
+    if (!m_record.information.empty()) m_text.append(m_text.empty() ? "" : " ").append(m_record.information);
+    return m_text;
+}
+
+bool CLectZeiss::AddPosition(std::string_view name, const Values& values, bool keepCode, int number) {
+    if (IsKnown(values.east) != IsKnown(values.north)) {
+        LineMissing(number, IsKnown(values.east) ? shared::kDatumNorth : shared::kDatumEast);
+        return false;
+    }
+    if (keepCode) AddCode(PointCode(), name);
+    if (!AddPoint(std::string(name), values.east, values.north, values.elevation)) {
+        LineError(shared::kRefused, number);
+        return false;
+    }
+    return true;
+}
+
 std::unique_ptr<CFieldBookReader> MakeZeissReader() {
-    return nullptr;
+    return std::make_unique<CLectZeiss>();
 }
 
 } // namespace pyr

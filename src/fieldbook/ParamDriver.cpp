@@ -86,8 +86,16 @@ const std::vector<Key>& SokkiaKeys() {
 const std::vector<Key>& TopconKeys() {
     return WithComputedPoints();
 }
+// Zeiss instruments name their northing X: it comes first unless the field book's header says otherwise.
 const std::vector<Key>& ZeissKeys() {
-    return WithComputedPoints();
+    static const std::vector<Key> keys = [] {
+        std::vector<Key> zeiss = WithComputedPoints();
+        auto order = std::find_if(zeiss.begin(), zeiss.end(),
+                                  [](const Key& key) { return std::string_view(key.name) == kKeyOrdreCoordonnees; });
+        order->defaultValue = kOrderYX;
+        return zeiss;
+    }();
+    return keys;
 }
 
 std::vector<Key> LayoutKeys(bool columnar) {

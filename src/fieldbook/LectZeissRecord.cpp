@@ -1,0 +1,154 @@
+#include "fieldbook/LectZeissRecord.h"
+
+#include "core/Strings.h"
+
+namespace pyr::zeiss {
+
+namespace {
+
+// The columns of an M5 line, counted from 0.
+constexpr std::size_t kM5Kind = 17; // "PI1", "TI ", "TO "
+constexpr std::size_t kM5Info = 21; // the 27-character information block
+constexpr std::size_t kM5InfoWidth = 27;
+constexpr std::size_t kM5FirstBlock = 49; // a block: type 2, blank, value 14, blank, unit 4, separator
+constexpr std::size_t kM5BlockWidth = 23;
+constexpr std::size_t kM5ErrorFlag = 118;
+
+// The columns of a Rec 500 line, counted from 0.
+constexpr std::size_t kRecAddressWidth = 7;
+constexpr std::size_t kRecText = 8;
+constexpr std::size_t kRecPointEnd = 27;
+constexpr std::size_t kRecCodeEnd = 36;
+constexpr std::size_t kRecBlocks[] = {36, 51, 66};
+
+// The part of a line from `first`, `count` characters at most, cut where the line ends.
+std::string_view Columns(std::string_view line, std::size_t first, std::size_t count) {
+    if (first >= line.size()) return {};
+    return line.substr(first, count);
+}
+
+std::string_view Field(std::string_view line, std::size_t first, std::size_t count) {
+    return Trimmed(Columns(line, first, count));
+}
+
+bool IsDigit(char c) {
+    return c >= '0' && c <= '9';
+}
+
+void Keep(Record& record, Value value) {
+    if (value.type.empty() && value.number.empty() && value.unit.empty()) return;
+    record.values[record.valueCount++] = value;
+}
+
+bool StartsWithWord(std::string_view text, std::string_view word) {
+    return text.starts_with(word) && (text.size() == word.size() || text[word.size()] == ' ');
+}
+
+// The point and code of an information block, at their places (counted from 1) and widths.
+std::string_view InfoPart(std::string_view info, int place, std::size_t width) {
+    if (place < 1) return {};
+    return Field(info, static_cast<std::size_t>(place - 1), width);
+}
+
+} // namespace
+
+Layout LayoutOf(std::string_view line) {
+    if (line.size() < 6 || !line.starts_with("For")) return Layout::Unknown;
+    if (line[3] != ' ' && line[3] != '_') return Layout::Unknown;
+    const std::string_view name = line.substr(4, 2);
+    if (name == "M5") return Layout::M5;
+    if (name == "R4") return Layout::R4;
+    if (name == "R5") return Layout::R5;
+    return Layout::Unknown;
+}
+
+bool SplitM5(std::string_view line, const InfoPlaces& places, Record& record) {
+    record = Record{};
+    record.layout = Layout::M5;
+    const std::string_view kind = Columns(line, kM5Kind, 3);
+    const std::string_view info = Columns(line, kM5Info, kM5InfoWidth);
+    if (kind.starts_with("TI") || kind.starts_with("TO")) {
+        record.text = true;
+        record.words = Trimmed(info);
+    } else if (kind.size() == 3 && kind.starts_with("PI") && IsDigit(kind[2])) {
+        record.point = InfoPart(info, places.point, 12);
+        record.code = InfoPart(info, places.code, 5);
+        record.information = InfoPart(info, places.information, 7);
+    } else {
+        return false;
+    }
+    for (std::size_t block = 0; block < 3; ++block) {
+        const std::size_t first = kM5FirstBlock + block * kM5BlockWidth;
+        Keep(record, {Field(line, first, 2), Field(line, first + 3, 14), Field(line, first + 18, 4)});
+    }
+    record.errorFlag = line.size() > kM5ErrorFlag && line[kM5ErrorFlag] != ' ';
+    return true;
+}
+
+bool SplitR4R5(std::string_view line, bool withAddress, Record& record) {
+    record = Record{};
+    record.layout = withAddress ? Layout::R5 : Layout::R4;
+    std::array<std::string_view, 8> fields{};
+    std::size_t count = 0;
+    while (count < fields.size()) {
+        const std::size_t bar = line.find('|');
+        fields[count++] = line.substr(0, bar);
+        if (bar == std::string_view::npos) break;
+        line.remove_prefix(bar + 1);
+    }
+    std::size_t next = withAddress ? 2 : 1;
+    if (count <= next) return false;
+    if (withAddress && !Trimmed(fields[1]).starts_with("Adr")) return false;
+
+    std::string_view ident = Trimmed(fields[next++]);
+    if (StartsWithWord(ident, "TI") || StartsWithWord(ident, "TO")) {
+        record.text = true;
+        record.words = Trimmed(ident.substr(2));
+    } else {
+        if (ident.size() >= 3 && ident.starts_with("PI") && IsDigit(ident[2]))
+            ident = Trimmed(ident.substr(3));
+        const std::size_t blank = ident.find(' ');
+        record.point = ident.substr(0, blank);
+        if (blank != std::string_view::npos) record.code = Trimmed(ident.substr(blank));
+    }
+    for (std::size_t block = 0; block < 3 && next < count; ++block, ++next) {
+        const std::string_view field = Trimmed(fields[next]);
+        const std::string_view rest = Trimmed(Columns(field, 2, field.size()));
+        const std::size_t blank = rest.find(' ');
+        const std::string_view unit =
+            blank == std::string_view::npos ? std::string_view{} : rest.substr(blank);
+        Keep(record, {Field(field, 0, 2), rest.substr(0, blank), Trimmed(unit)});
+    }
+    if (next < count) record.errorFlag = !Trimmed(fields[next]).empty();
+    return true;
+}
+
+bool SplitRec500(std::string_view line, Record& record) {
+    record = Record{};
+    record.layout = Layout::Rec500;
+    const std::string_view address = Columns(line, 0, kRecAddressWidth);
+    bool digits = false;
+    for (char c : address) {
+        if (IsDigit(c))
+            digits = true;
+        else if (c != ' ')
+            return false;
+    }
+    if (!digits) return false;
+    if (Columns(line, kRecText - 1, 2).find_first_not_of(' ') != std::string_view::npos) {
+        record.text = true;
+        record.words = Field(line, kRecText - 1, kRecCodeEnd - kRecText + 1);
+    } else {
+        record.point = Field(line, kRecText, kRecPointEnd - kRecText);
+        record.code = Field(line, kRecPointEnd, kRecCodeEnd - kRecPointEnd);
+    }
+    for (std::size_t block = 0; block < 3; ++block) {
+        const std::size_t first = kRecBlocks[block];
+        const std::size_t end = block + 1 < 3 ? kRecBlocks[block + 1] : line.size();
+        if (first >= end) break;
+        Keep(record, {Field(line, first, 2), Field(line, first + 2, end - first - 2), {}});
+    }
+    return true;
+}
+
+} // namespace pyr::zeiss

@@ -1,0 +1,266 @@
+// Trimble (Zeiss) field books read into GéoBases. The field books tests/data/fieldbook/zeiss-*-mesures.txt
+// were written for these tests in the columns of their layout. Their geometry is constructed: station S1
+// at E 1000, N 2000, Z 100 (the file's X 2000, Y 1000, X being the northing), instrument height 1.550,
+// set up on a known station so that its Hz are bearings. Each expected value is worked out by hand from
+// the value as written and its unit.
+#include "FieldBookTestSupport.h"
+#include "core/Strings.h"
+#include "fieldbook/LectZeiss.h"
+#include "fieldbook/ParamDriver.h"
+
+#include <cmath>
+#include <gtest/gtest.h>
+#include <tuple>
+
+using namespace pyr;
+
+namespace {
+
+constexpr double kTolerance = 1e-4; // 0.1 mm, 0.1 mgon
+
+struct ZeissRun : ReaderRun<CLectZeiss> {
+    CParamDriver driver{"", "", FieldBookFormat::Zeiss};
+
+    ZeissRun() { reader.SetDriver(&driver); }
+    ZeissRun& Set(const char* key, std::string value) {
+        driver.SetText(key, std::move(value));
+        return *this;
+    }
+    CCarnet& ReadFile(const std::string& name) { return Read(ReadBytes(FieldBookData(name))); }
+    std::string Said() const {
+        std::string said;
+        for (const std::string& line : Reports())
+            said += line + "\n";
+        return said;
+    }
+};
+
+// Each element as "kind name", blanks between them; comments by their text.
+std::string Elements(const CCarnet& carnet, int from = 0) {
+    std::string kinds;
+    for (int i = from; i < carnet.GetSize(); ++i) {
+        const int kind = carnet.GetType(i);
+        kinds += std::to_string(kind) + ' ';
+        kinds += kind == kKindComment  ? carnet.As<CComment>(i)->text()
+                 : IsCommandKind(kind) ? carnet.cmdAt(i)
+                                       : carnet.matAt(i);
+        kinds += "; ";
+    }
+    return kinds;
+}
+
+// HP, AH, AV, DI of a sighting or X, Y, Z of a point; kUndefined where there must be none.
+void ExpectNear(const CCarnet& carnet, int i, std::vector<double> expected) {
+    const bool point = expected.size() == 3;
+    const double actual[] = {point ? carnet.xAt(i) : carnet.hpAt(i), point ? carnet.yAt(i) : carnet.ahAt(i),
+                             point ? carnet.zAt(i) : carnet.avAt(i), carnet.diAt(i)};
+    for (std::size_t k = 0; k < expected.size(); ++k) {
+        if (IsUndefined(expected[k]))
+            EXPECT_EQ(actual[k], kUndefined) << "value " << k << " of element " << i;
+        else
+            EXPECT_NEAR(actual[k], expected[k], kTolerance) << "value " << k << " of element " << i;
+    }
+}
+
+// An M5 line in its columns: "For M5|Adr nnnnn|T2a <27>|T3 <14> <4>|T4 ...|T5 ...|" and the error flag.
+struct Block {
+    const char* type;
+    const char* value;
+    const char* unit;
+};
+std::string M5(int address, const char* kind, const std::string& info, std::vector<Block> blocks = {},
+               char flag = ' ') {
+    std::string line = Sprintf("For M5|Adr %05d|%-3s %-27s|", address, kind, info.c_str());
+    for (std::size_t i = 0; i < 3; ++i) {
+        const Block b = i < blocks.size() ? blocks[i] : Block{"", "", ""};
+        line += Sprintf("%-2s %14s %-4s|", b.type, b.value, b.unit);
+    }
+    return line + flag;
+}
+// The information block of a point: its id ending in column 19, its code from column 20.
+std::string Pi(const char* point, const char* code = "") {
+    return Sprintf("%19s%-5s", point, code);
+}
+
+} // namespace
+
+// Every value carries its unit: feet, DMS, decimal degrees, mils, and the vertical systems V1 (zenith),
+// V2 (from the horizon), V3 (from the nadir), V4 (in %). The header says X is the northing.
+TEST(LectZeiss, AnM5FieldBookGivesEveryValueInGradsAndMetres) {
+    ZeissRun run;
+    const CCarnet& read = run.ReadFile("zeiss-m5-mesures.txt");
+    EXPECT_EQ(run.Said(), "");
+    ASSERT_EQ(Elements(read),
+              "1000 Format               = M5; 1000 Appareil             = M3 5\"DR; "
+              "1000 Numéro de série      = 131500; 1000 Version du logiciel  = 1.00; "
+              "1000 Axes des coordonnées = X = nord, Y = est; "
+              "1000 Facteur d'échelle    = 1.000000; 1000 KN STAT; 1001 S1; 1006 S1; 1002 A1; "
+              "1000 POLAR; 1009 MUR; 1003 101; 1003 102; 1003 103; 1003 104; 1003 105; 1003 106; "
+              "1009 BORNE; 1006 200; 1006 201; ");
+    EXPECT_NEAR(read.hiAt(7), 1.55, kTolerance);
+    EXPECT_EQ(read.v0At(7), 0.0); // set up on a known station: its Hz are bearings
+    ExpectNear(read, 8, {1000.0, 2000.0, 100.0});
+    ExpectNear(read, 9, {1.3, 100.0, 100.0, 100.0});
+    const double cases[][5] = {
+        // element, HP, Hz, zenith, slope distance
+        {12, 1.3, 137.50926, 106.11111, 100.0000032}, // 123°45'30", 95.5°, 328.084 ft × 0.3048
+        {13, 1.8, 100.0, 95.0, 50.154610},            // 1600 mil; V2 5 gr; HD 50 / cos 4.5°
+        {14, 1.8, 10.0, 90.0, 20.0},                  // V3 110 gr from the nadir
+        {15, 1.8, 20.0, 93.65490, 30.149627},         // 10 %: 100 - atan 0.1; HD 30 × √1.01
+        {16, 1.8, 30.0, 74.86682, 13.0},              // HD 12, h 5: the 5-12-13 triangle
+        {17, 1.8, 40.0, 250.0, kUndefined},           // face right, no distance
+    };
+    for (const auto& c : cases)
+        ExpectNear(read, static_cast<int>(c[0]), {c[1], c[2], c[3], c[4]});
+    ExpectNear(read, 19, {1005.0, 2010.0, 101.0});
+    ExpectNear(read, 20, {1010.0, 1990.0, kUndefined});
+}
+
+// Rec 500 writes no units: those of the settings hold. S2 at E 3000, N 5000.
+TEST(LectZeiss, ARec500FieldBookTakesItsUnitsFromTheSettings) {
+    const std::tuple<const char*, const char*, double, double, double> cases[] = {
+        // angles, lengths, Hz of 301, its zenith, its slope distance
+        {"grades", "metres", 50.5, 99.5, 25.432},
+        {"degres", "pieds", 56.11111, 110.55556, 7.7516736}, // 50.5°, 99.5°, 25.432 ft
+        {"dms", "metres", 56.48148, 110.92593, 25.432},      // 50°50'00", 99°50'00"
+    };
+    for (const auto& [angles, lengths, hz, zenith, slope] : cases) {
+        ZeissRun run;
+        const CCarnet& read = run.Set(kKeyUniteAngles, angles)
+                                  .Set(kKeyUniteDistances, lengths)
+                                  .ReadFile("zeiss-rec500-mesures.txt");
+        EXPECT_EQ(run.Said(), "") << angles;
+        ASSERT_EQ(Elements(read),
+                  "1000 Format               = Rec 500; 1000 KN STAT; 1001 S2; 1006 S2; 1002 R1; "
+                  "1000 POLAR; 1009 12; 1003 301; 1009 ARB; 1006 302; ")
+            << angles;
+        const double foot = std::string_view(lengths) == "pieds" ? 0.3048 : 1.0;
+        EXPECT_NEAR(read.hiAt(2), 1.6 * foot, kTolerance);
+        ExpectNear(read, 3, {3000.0 * foot, 5000.0 * foot, 50.0 * foot});
+        ExpectNear(read, 7, {2.0 * foot, hz, zenith, slope});
+        ExpectNear(read, 9, {3006.789 * foot, 5012.345 * foot, 51.234 * foot});
+    }
+}
+
+// The settings say which axis X is; the header of the instrument (word 05) wins over them.
+TEST(LectZeiss, TheAxesFollowTheHeaderThenTheSettings) {
+    const std::string point = M5(2, "PI1", Pi("7"), {{"X", "100.000", "m"}, {"Y", "200.000", "m"}}) + "\r\n";
+    const std::string xEast = M5(1, "TI", "", {{"05", "1", ""}}) + "\r\n";
+    const std::string xNorth = M5(1, "TI", "", {{"05", "2", ""}}) + "\r\n";
+    const std::tuple<const char*, std::string, double, double> cases[] = {
+        {"YX", point, 200.0, 100.0},
+        {"XY", point, 100.0, 200.0},
+        {"YX", xEast + point, 100.0, 200.0},
+        {"XY", xNorth + point, 200.0, 100.0},
+    };
+    for (const auto& [order, text, east, north] : cases) {
+        ZeissRun run;
+        const CCarnet& read = run.Set(kKeyOrdreCoordonnees, order).Read(text);
+        ASSERT_EQ(read.GetType(read.GetSize() - 1), kKindPoint) << order;
+        ExpectNear(read, read.GetSize() - 1, {east, north, kUndefined});
+    }
+}
+
+// The sightings of a set-up program are references; elsewhere the settings mark them.
+TEST(LectZeiss, ReferencesComeFromSetUpProgramsOrTheSettings) {
+    const std::string text = M5(1, "TI", "OR.COOR") + "\n" +
+                             M5(2, "PI1", Pi("ST", "S"), {{"X", "10.000", "m"}, {"Y", "20.000", "m"}}) +
+                             "\n" + M5(3, "PI1", Pi("R1"), {{"Hz", "10.0000", "gon"}}) + "\n" +
+                             M5(4, "TI", "POLAR") + "\n" +
+                             M5(5, "PI1", Pi("1", "REF"), {{"Hz", "20.0000", "gon"}}) + "\n" +
+                             M5(6, "PI1", Pi("2", "ARB"), {{"Hz", "30.0000", "gon"}}) + "\n";
+    const std::pair<const char*, const char*> cases[] = {
+        {"aucune", "1002 R1; 1000 POLAR; 1009 REF; 1003 1; 1009 ARB; 1003 2; "},
+        {"codes", "1002 R1; 1000 POLAR; 1009 REF; 1002 1; 1009 ARB; 1003 2; "},
+        {"premiere", "1002 R1; 1000 POLAR; 1009 REF; 1003 1; 1009 ARB; 1003 2; "}, // R1 was the first
+    };
+    for (const auto& [marking, kinds] : cases) {
+        ZeissRun run;
+        const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "ref").Read(text);
+        EXPECT_EQ(run.Said(), "") << marking;
+        EXPECT_TRUE(Elements(read).ends_with(kinds)) << marking << ": " << Elements(read);
+        EXPECT_EQ(read.v0At(2), kUndefined) << "only a known-station set-up is oriented";
+    }
+}
+
+// An instrument height given after the station's program waits for the next station; a reflector height
+// holds until the next one.
+TEST(LectZeiss, HeightsGoToTheStationOfTheirSetUp) {
+    const std::string text = M5(1, "PI1", Pi("A", "S"), {{"Z", "10.000", "m"}}) + "\n" +
+                             M5(2, "TI", "INPUT", {{"ih", "1.400", "m"}, {"th", "1.100", "m"}}) + "\n" +
+                             M5(3, "PI1", Pi("1"), {{"Hz", "1.0000", "gon"}}) + "\n" + M5(4, "TI", "POLAR") +
+                             "\n" + M5(5, "TI", "INPUT", {{"ih", "1.700", "m"}}) + "\n" +
+                             M5(6, "PI1", Pi("B", "S")) + "\n" +
+                             M5(7, "PI1", Pi("2"), {{"Hz", "2.0000", "gon"}}) + "\n";
+    ZeissRun run;
+    const CCarnet& read = run.Read(text);
+    EXPECT_EQ(run.Said(), "");
+    ASSERT_EQ(Elements(read),
+              "1000 Format               = M5; 1001 A; 1006 A; 1003 1; 1000 POLAR; 1001 B; 1003 2; ");
+    EXPECT_NEAR(read.hiAt(1), 1.4, kTolerance);
+    ExpectNear(read, 2, {kUndefined, kUndefined, 10.0});
+    EXPECT_NEAR(read.hiAt(5), 1.7, kTolerance);
+    ExpectNear(read, 6, {1.1, 2.0, kUndefined, kUndefined});
+}
+
+TEST(LectZeiss, EveryLineIsReadOrReportedWithItsNumber) {
+    const std::string lines[] = {
+        M5(1, "PI1", Pi("1"), {{"Hz", "1.0000", "gon"}}),
+        M5(2, "XX", "texte"),
+        M5(3, "PI1", Pi("3"), {{"Hz", "1.2x", "gon"}}),
+        M5(4, "PI1", Pi("")).substr(0, 49),
+        M5(5, "PI1", Pi("5"), {{"Qz", "1.0", ""}, {"Hz", "5.0000", "gon"}}),
+        M5(6, "PI1", Pi("6"), {{"Qz", "1.0", ""}, {"Hz", "6.0000", "m"}}),
+        M5(7, "PI1", Pi("7"), {{"X", "1.000", "m"}}),
+        M5(8, "PI1", Pi("8"), {{"SD", "8.000", "m"}}, 'e'),
+        "bonjour",
+        M5(10, "PI1", Pi("10")),
+    };
+    std::string text;
+    for (const std::string& line : lines)
+        text += line + "\n";
+    ZeissRun run;
+    const CCarnet& read = run.Read(text);
+    EXPECT_EQ(
+        run.Said(),
+        "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"
+        "Erreur ligne 2 : donnée non reconnue !\n"
+        " -> Chaîne lue = <" +
+            lines[1].substr(0, 118) +
+            ">\n"
+            "Erreur ligne 3 : valeur numérique incorrecte <1.2x> !\n"
+            "Attention : ligne 4 de longueur incorrecte (49 / 119) !\n"
+            "Erreur ligne 4 : donnée manquante pour le matricule du point !\n"
+            "Attention : ligne 5 : type de valeur « Qz » inconnu, ignoré dans tout le carnet.\n"
+            "Attention : ligne 6 : unité « m » inconnue ou impossible pour la valeur, unité du fichier de "
+            "paramétrage prise.\n"
+            "Erreur ligne 7 : donnée manquante pour la coordonnée Est !\n"
+            "Attention : ligne 8 : ligne marquée en erreur par l'appareil, lue quand même.\n"
+            "Erreur ligne 9 : donnée non reconnue !\n"
+            " -> Chaîne lue = <bonjour>\n"
+            "Erreur ligne 10 : donnée manquante pour les observations ou les coordonnées du point !\n");
+    ASSERT_EQ(Elements(read, 1), "1001 INCONNUE; 1003 1; 1003 5; 1003 6; 1003 8; ");
+    ExpectNear(read, 4, {kUndefined, 6.0, kUndefined, kUndefined}); // read in the settings' grads
+}
+
+// R4 and R5 lines are found by their separators; line ends, blanks and transmission bytes change nothing.
+TEST(LectZeiss, EveryLayoutAndLineEndGivesTheSameSighting) {
+    const std::string m5 = M5(1, "PI1", Pi("9", "C1"),
+                              {{"SD", "12.345", "m"}, {"Hz", "123.4567", "gon"}, {"V1", "98.7654", "gon"}});
+    const std::string r4 = "For R4|9 C1|SD  12.345 m|Hz  123.4567 gon|V1  98.7654 gon|";
+    const std::string r5 = "For_R5|Adr 0001|PI1 9 C1|SD 12.345 m|Hz 123.4567 gon|V1 98.7654 gon| ";
+    const std::string cases[] = {
+        m5 + "\r\n", m5 + "\r",          m5 + "   \n\n", "\x02" + m5 + "\r\n\x03\r\n\x1a",
+        r4 + "\n",   r5 + "\r\nEND\r\n",
+    };
+    for (const std::string& text : cases) {
+        ZeissRun run;
+        const CCarnet& read = run.Read(text);
+        EXPECT_EQ(run.Said(),
+                  "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à "
+                  "renommer).\n")
+            << text;
+        ASSERT_EQ(Elements(read, 1), "1001 INCONNUE; 1009 C1; 1003 9; ") << text;
+        ExpectNear(read, 3, {kUndefined, 123.4567, 98.7654, 12.345});
+    }
+}
