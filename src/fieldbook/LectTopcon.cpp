@@ -184,74 +184,51 @@ void CLectTopcon::Header(const char* label, const topcon::Record& record, const 
 // UNITS M|F,D|G: the lengths in metres or feet, the angles in ddd.mmss or grads. An empty field keeps
 // the unit in force.
 void CLectTopcon::ReadUnits(int number) {
-    DistanceUnit lengths = m_lengths;
-    AngleUnit angles = m_angles;
-    bool known = true;
-    switch (UpperInitial(m_record.Field(0))) {
-    case '\0':
-        break;
-    case 'M':
-        lengths = DistanceUnit::Metres;
-        break;
-    case 'F':
-        lengths = DistanceUnit::Feet;
-        break;
-    default:
-        known = false;
-    }
-    switch (UpperInitial(m_record.Field(1))) {
-    case '\0':
-        break;
-    case 'D':
-        angles = AngleUnit::Dms;
-        break;
-    case 'G':
-        angles = AngleUnit::Grads;
-        break;
-    default:
-        known = false;
-    }
+    const char lengths = UpperInitial(m_record.Field(0));
+    const char angles = UpperInitial(m_record.Field(1));
+    const bool known = (lengths == '\0' || lengths == 'M' || lengths == 'F') &&
+                       (angles == '\0' || angles == 'D' || angles == 'G');
     if (!known) {
         if (TextWindow()) TextWindow()->Print(text::kBadUnits, number, std::string(m_record.values).c_str());
         return;
     }
-    m_lengths = lengths;
-    m_angles = angles;
+    if (lengths != '\0') m_lengths = lengths == 'F' ? DistanceUnit::Feet : DistanceUnit::Metres;
+    if (angles != '\0') m_angles = angles == 'D' ? AngleUnit::Dms : AngleUnit::Grads;
     AddHeaderComment(text::kLabelUnits,
-                     Sprintf("%s, %s", lengths == DistanceUnit::Feet ? text::kFeet : text::kMetres,
-                             AngleUnitName(angles)));
+                     Sprintf("%s, %s", m_lengths == DistanceUnit::Feet ? text::kFeet : text::kMetres,
+                             AngleUnitName(m_angles)));
 }
 
 // ---- Numbers ---------------------------------------------------------------------------------------------
 
-void CLectTopcon::BadNumber(std::string_view value, int number) const {
-    if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(value).c_str());
-}
-
-// An empty field is a missing value, kept undefined.
-bool CLectTopcon::ReadAngle(std::string_view value, double& grads, int number) const {
-    grads = kUndefined;
+// An empty field is a missing value, kept undefined; ddd.mmss is read digit by digit into degrees, so
+// that no rounding shifts a second.
+bool CLectTopcon::ReadNumber(std::string_view value, double& read, bool dms, int number) const {
+    read = kUndefined;
     if (value.empty()) return true;
-    double read = 0.0;
-    const bool ok = m_angles == AngleUnit::Dms ? DmsTextToDegrees(value, read) : ParseDouble(value, read);
-    if (!ok || !std::isfinite(read) || std::fabs(read) > kLargestValue) {
-        BadNumber(value, number);
+    double parsed = 0.0;
+    const bool ok = dms ? DmsTextToDegrees(value, parsed) : ParseDouble(value, parsed);
+    if (!ok || !std::isfinite(parsed) || std::fabs(parsed) > kLargestValue) {
+        if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(value).c_str());
         return false;
     }
-    // ddd.mmss is read digit by digit into degrees, so that no rounding shifts a second.
-    grads = m_angles == AngleUnit::Dms ? read * kDegreesToGrads : ToGrads(read, m_angles);
+    read = parsed;
+    return true;
+}
+
+bool CLectTopcon::ReadAngle(std::string_view value, double& grads, int number) const {
+    const bool dms = m_angles == AngleUnit::Dms;
+    if (!ReadNumber(value, grads, dms, number)) return false;
+    if (dms && IsKnown(grads))
+        grads *= kDegreesToGrads;
+    else if (!dms)
+        grads = ToGrads(grads, m_angles);
     return true;
 }
 
 bool CLectTopcon::ReadLength(std::string_view value, double& metres, int number) const {
-    metres = kUndefined;
-    if (value.empty()) return true;
-    double read = 0.0;
-    if (!ParseDouble(value, read) || !std::isfinite(read) || std::fabs(read) > kLargestValue) {
-        BadNumber(value, number);
-        return false;
-    }
-    metres = ToMetres(read, m_lengths);
+    if (!ReadNumber(value, metres, false, number)) return false;
+    metres = ToMetres(metres, m_lengths);
     return true;
 }
 

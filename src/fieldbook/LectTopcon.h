@@ -51,8 +51,7 @@ private:
 
     bool ReadAngle(std::string_view text, double& grads, int number) const;
     bool ReadLength(std::string_view text, double& metres, int number) const;
-    bool ReadCoordinate(std::string_view text, double& metres, int number) const;
-    void BadNumber(std::string_view text, int number) const;
+    bool ReadNumber(std::string_view text, double& read, bool dms, int number) const;
 
     // ---- Settings of the format ("Topcon.ini"), and the units the field book declares
     AngleUnit m_angles = AngleUnit::Grads;
