@@ -164,8 +164,6 @@ TEST(LectWild, EveryLineEndBlankAndControlLineGivesTheSameElements) {
     const std::string station = "110001+00000S10 84..10+00010000 85..10+00020000 ";
     const std::string sighting = "110002+00000101 21.102+12345678 22.102+09876543 31..00+00012345 ";
     const std::string cases[] = {
-        station + "\n" + sighting + "\n",
-        station + "\r" + sighting,
         station + "\r\r\r" + sighting + "\r\r\r",
         "!Commentaire du chantier\n" + station + "    \n\n" + sighting + "      \n\x03\n\x04\n\x1a",
         "\x02" + station + "\r\n  " + sighting + "\r\n\x03",
