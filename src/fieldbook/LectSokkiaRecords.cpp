@@ -1,6 +1,7 @@
 #include "fieldbook/LectSokkiaRecords.h"
 
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 
 namespace pyr::sdr {
 
@@ -57,28 +58,43 @@ int RecordLength(const Layout& layout, Variant variant) {
     return length;
 }
 
+namespace {
+
+// The byte offset `count` characters after `from`, bounded by the line's end. Columns count characters:
+// an accented letter of a Latin-1 book, two bytes once read, is one column.
+std::size_t Advance(std::string_view line, std::size_t from, int count) {
+    std::size_t i = from;
+    for (; count > 0 && i < line.size(); --count) {
+        ++i;
+        while (i < line.size() && (static_cast<unsigned char>(line[i]) & 0xC0) == 0x80)
+            ++i;
+    }
+    return i;
+}
+
+} // namespace
+
 std::string_view Column(std::string_view line, int first, int width) {
-    const std::size_t start = static_cast<std::size_t>(first - 1);
-    if (start >= line.size()) return {};
-    return Trimmed(line.substr(start, static_cast<std::size_t>(width)));
+    const std::size_t start = Advance(line, 0, first - 1);
+    return Trimmed(line.substr(start, Advance(line, start, width) - start));
 }
 
 void SplitRecord(std::string_view line, const Layout& layout, Variant variant, Fields& fields) {
-    int column = kFirstField;
+    std::size_t start = Advance(line, 0, kFirstField - 1);
     for (int i = 0; i < layout.count; ++i) {
         const FieldKind kind = layout.kinds[static_cast<std::size_t>(i)];
-        const int width =
-            kind == FieldKind::Text ? static_cast<int>(line.size()) : Width(kind, variant, layout);
-        fields.text[static_cast<std::size_t>(i)] = Column(line, column, width);
-        column += width;
+        const std::size_t end =
+            kind == FieldKind::Text ? line.size() : Advance(line, start, Width(kind, variant, layout));
+        fields.text[static_cast<std::size_t>(i)] = Trimmed(line.substr(start, end - start));
+        start = end;
     }
 }
 
 Variant GuessVariant(std::string_view line, const Layout& layout) {
     if (Column(line, kFirstField, 4).empty()) return Variant::Sdr33;
     const std::string_view content = line.substr(0, line.find_last_not_of(' ') + 1);
-    return static_cast<int>(content.size()) > RecordLength(layout, Variant::Sdr2x) ? Variant::Sdr33
-                                                                                   : Variant::Sdr2x;
+    return static_cast<int>(Utf8Length(content)) > RecordLength(layout, Variant::Sdr2x) ? Variant::Sdr33
+                                                                                        : Variant::Sdr2x;
 }
 
 void Checksum::AddLine(std::string_view line) {

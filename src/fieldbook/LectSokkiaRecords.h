@@ -40,7 +40,8 @@ struct Fields {
 };
 void SplitRecord(std::string_view line, const Layout& layout, Variant variant, Fields& fields);
 
-// The field at columns [first, first + width) counted from 1, trimmed; empty beyond the line.
+// The field at columns [first, first + width) counted from 1 in characters, trimmed; empty beyond the
+// line.
 std::string_view Column(std::string_view line, int first, int width);
 
 // The variant of a record written without a header to say it: SDR2x always fills its 4-character

@@ -188,6 +188,14 @@ TEST(LectSokkia, UnitsAndAxisOrderFromTheHeaderOrTheSettings) {
     run.Set(kKeyOrdreCoordonnees, "XY");
     const CCarnet& carnet = run.Read("08KI" + Id("P") + Re("2000") + Re("1000") + Re("") + "\n");
     EXPECT_NEAR(carnet.xAt(carnet.Find(kKindPoint, "P", 0, 0)), 2000.0, 1e-4);
+
+    // Columns count characters: a Latin-1 identifier, two bytes a letter once read, moves no field.
+    SokkiaRun latin1;
+    const CCarnet& read = latin1.Read("08KI" + Id("\xC9T\xC9") + Re("2000") + Re("1000") + Re("") + "\n");
+    const int ete = read.Find(kKindPoint, "ÉTÉ", 0, 0);
+    ASSERT_GE(ete, 0);
+    EXPECT_NEAR(read.xAt(ete), 1000.0, 1e-4);
+    EXPECT_NEAR(read.yAt(ete), 2000.0, 1e-4);
 }
 
 TEST(LectSokkia, VerticalAnglesFromTheHorizonBecomeZenithAngles) {
