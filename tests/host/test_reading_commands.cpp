@@ -1,7 +1,6 @@
 // The reading commands and the editor's reading, run as a person or a script runs pyralis.
 #include "HostTestSupport.h"
 #include "fieldbook/FieldBookReader.h"
-#include "fieldbook/FieldBookReaders.h"
 
 #include <filesystem>
 #include <gtest/gtest.h>
@@ -71,16 +70,7 @@ TEST_F(ReadingCommands, LQuendaConvertsTheFieldBookNamedIntoANewGeoBase) {
     EXPECT_TRUE(std::filesystem::exists(dir / "autre.geo"));
 }
 
-TEST_F(ReadingCommands, AReaderNotBuiltYetSaysSoAndTheHelpNamesTheFieldBook) {
-    for (const auto& info : pyr::FieldBookFormats()) {
-        if (pyr::MakeFieldBookReader(info.format)) continue;
-        const Outcome missing = Run(std::string(info.command) + " carnet.txt");
-        EXPECT_EQ(missing.status, 1) << info.command;
-        EXPECT_TRUE(Has(missing.err,
-                        std::string("La lecture des carnets ") + info.name + " n'est pas encore disponible"))
-            << missing.err;
-        break;
-    }
+TEST_F(ReadingCommands, TheHelpNamesTheFieldBookAndTheParameterFileWhereThereIsOne) {
     const Outcome help = Run("PyraLQuenda --help");
     EXPECT_EQ(help.status, 0);
     EXPECT_TRUE(Has(help.out, "Usage : pyralis PyraLQuenda [CARNET] [options]")) << help.out;
