@@ -116,6 +116,31 @@ TEST(LectNikon, ADtmFieldBookGivesStationsFromTheirHeightAndUnitsPerRecord) {
     Expect(read, 7, {kUndefined, 200.0, 100.0, 8.0});        // MM: 3200 and 1600 mils; no target height
 }
 
+// The instrument height follows the first hyphen after which a number stands; an identifier may hold
+// hyphens of its own.
+TEST(LectNikon, ADtmIdentifierWithAnInstrumentHeightSetsUpAStation) {
+    const std::tuple<const char*, const char*, double> cases[] = {
+        {"1001--1.455", "1001", -1.455},
+        {"A-1-1.5", "A-1", 1.5},
+        {"B-2", "B", 2.0},
+        {"S1-", "S1-", kUndefined}, // no height: an observation of point S1-
+    };
+    for (const auto& [field, name, hi] : cases) {
+        NikonRun run;
+        const CCarnet& read = run.Read(std::string("1 , 0 , MG , S0-1.5\n1 , 0 , MG , ") + field +
+                                       " , 10.000 , 50.0000 , 100.0000 , 1.300\n");
+        SCOPED_TRACE(field);
+        EXPECT_EQ(run.Lines(), "");
+        ASSERT_EQ(read.matAt(Last(read)), name);
+        if (IsUndefined(hi)) {
+            EXPECT_EQ(read.GetType(Last(read)), kKindMesure);
+        } else {
+            ASSERT_EQ(read.GetType(Last(read)), kKindStation);
+            EXPECT_NEAR(read.hiAt(Last(read)), hi, kTolerance);
+        }
+    }
+}
+
 // One side shot under a declaration of the header and the settings of the parameter file: the file's
 // declaration wins, the settings hold where it says nothing.
 TEST(LectNikon, AnglesAndLengthsComeInGradsAndMetresWhateverTheUnit) {
