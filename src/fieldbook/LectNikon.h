@@ -25,7 +25,7 @@ namespace pyr {
 // Angles are brought to grads, vertical angles to zenith angles, lengths to metres; a unit, a vertical
 // zero or an axis order that the file declares wins over the settings of the parameter file.
 class CLectNikon : public CFieldBookReader {
-public:
+private:
     // The fields of one record, blanks trimmed, as views into the line.
     static constexpr std::size_t kMaxFields = 16;
     struct Fields {
