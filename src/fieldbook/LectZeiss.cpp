@@ -3,6 +3,7 @@
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectWildTexts.h"
 #include "fieldbook/LectZeissTexts.h"
@@ -254,11 +255,11 @@ bool CLectZeiss::Split(std::string_view line, int number) {
                       : layout == Layout::Rec500 ? zeiss::kRec500Width
                                                  : 0;
     const auto Checked = [&](bool cut) {
-        if (!cut) return false;
-        const std::size_t filled = line.find_last_not_of(' ') + 1;
-        if (width > 0 && static_cast<int>(line.size()) != width &&
-            (static_cast<int>(line.size()) < width || static_cast<int>(filled) > width))
-            CheckLength(number, line, width);
+        if (!cut || width == 0) return cut;
+        // Counted in characters: an accented letter of a Windows-1252 field book is one column.
+        const int length = static_cast<int>(Utf8Length(line));
+        const int filled = static_cast<int>(Utf8Length(line.substr(0, line.find_last_not_of(' ') + 1)));
+        if (length != width && (length < width || filled > width)) CheckLength(number, line, width);
         return true;
     };
     bool cut = false;

@@ -1,6 +1,7 @@
 #include "fieldbook/LectZeissRecord.h"
 
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 
 namespace pyr::zeiss {
 
@@ -21,10 +22,43 @@ constexpr std::size_t kRecPointEnd = 27;
 constexpr std::size_t kRecCodeEnd = 36;
 constexpr std::size_t kRecBlocks[] = {36, 51, 66};
 
-// The part of a line from `first`, `count` characters at most, cut where the line ends.
+// A line cut at its columns, counted in characters: a Windows-1252 field book comes here in UTF-8, where
+// an accented letter takes two bytes, and no field may end in the middle of one.
+class Line {
+public:
+    explicit Line(std::string_view text) : m_text(text) {
+        for (char c : text)
+            if (static_cast<unsigned char>(c) >= 0x80) m_ascii = false;
+    }
+    std::size_t Size() const { return m_ascii ? m_text.size() : Utf8Length(m_text); }
+    // The part from column `first` (from 0), `count` characters at most, cut where the line ends.
+    std::string_view Columns(std::size_t first, std::size_t count) const {
+        if (m_ascii) return first >= m_text.size() ? std::string_view{} : m_text.substr(first, count);
+        const std::size_t begin = Offset(0, first);
+        return m_text.substr(begin, Offset(begin, count) - begin);
+    }
+    std::string_view Field(std::size_t first, std::size_t count) const {
+        return Trimmed(Columns(first, count));
+    }
+
+private:
+    // The byte `characters` characters after the byte `from`, or the end of the line.
+    std::size_t Offset(std::size_t from, std::size_t characters) const {
+        std::size_t at = from;
+        while (at < m_text.size() && characters > 0) {
+            ++at;
+            while (at < m_text.size() && (static_cast<unsigned char>(m_text[at]) & 0xC0) == 0x80)
+                ++at;
+            --characters;
+        }
+        return at;
+    }
+    std::string_view m_text;
+    bool m_ascii = true;
+};
+
 std::string_view Columns(std::string_view line, std::size_t first, std::size_t count) {
-    if (first >= line.size()) return {};
-    return line.substr(first, count);
+    return Line(line).Columns(first, count);
 }
 
 std::string_view Field(std::string_view line, std::size_t first, std::size_t count) {
@@ -65,8 +99,9 @@ Layout LayoutOf(std::string_view line) {
 bool SplitM5(std::string_view line, const InfoPlaces& places, Record& record) {
     record = Record{};
     record.layout = Layout::M5;
-    const std::string_view kind = Columns(line, kM5Kind, 3);
-    const std::string_view info = Columns(line, kM5Info, kM5InfoWidth);
+    const Line cut(line);
+    const std::string_view kind = cut.Columns(kM5Kind, 3);
+    const std::string_view info = cut.Columns(kM5Info, kM5InfoWidth);
     if (kind.starts_with("TI") || kind.starts_with("TO")) {
         record.text = true;
         record.words = Trimmed(info);
@@ -79,9 +114,9 @@ bool SplitM5(std::string_view line, const InfoPlaces& places, Record& record) {
     }
     for (std::size_t block = 0; block < 3; ++block) {
         const std::size_t first = kM5FirstBlock + block * kM5BlockWidth;
-        Keep(record, {Field(line, first, 2), Field(line, first + 3, 14), Field(line, first + 18, 4)});
+        Keep(record, {cut.Field(first, 2), cut.Field(first + 3, 14), cut.Field(first + 18, 4)});
     }
-    record.errorFlag = line.size() > kM5ErrorFlag && line[kM5ErrorFlag] != ' ';
+    record.errorFlag = !cut.Field(kM5ErrorFlag, 1).empty();
     return true;
 }
 
@@ -126,7 +161,8 @@ bool SplitR4R5(std::string_view line, bool withAddress, Record& record) {
 bool SplitRec500(std::string_view line, Record& record) {
     record = Record{};
     record.layout = Layout::Rec500;
-    const std::string_view address = Columns(line, 0, kRecAddressWidth);
+    const Line cut(line);
+    const std::string_view address = cut.Columns(0, kRecAddressWidth);
     bool digits = false;
     for (char c : address) {
         if (IsDigit(c))
@@ -135,18 +171,18 @@ bool SplitRec500(std::string_view line, Record& record) {
             return false;
     }
     if (!digits) return false;
-    if (Columns(line, kRecText - 1, 2).find_first_not_of(' ') != std::string_view::npos) {
+    if (!cut.Field(kRecText - 1, 2).empty()) {
         record.text = true;
-        record.words = Field(line, kRecText - 1, kRecCodeEnd - kRecText + 1);
+        record.words = cut.Field(kRecText - 1, kRecCodeEnd - kRecText + 1);
     } else {
-        record.point = Field(line, kRecText, kRecPointEnd - kRecText);
-        record.code = Field(line, kRecPointEnd, kRecCodeEnd - kRecPointEnd);
+        record.point = cut.Field(kRecText, kRecPointEnd - kRecText);
+        record.code = cut.Field(kRecPointEnd, kRecCodeEnd - kRecPointEnd);
     }
     for (std::size_t block = 0; block < 3; ++block) {
         const std::size_t first = kRecBlocks[block];
-        const std::size_t end = block + 1 < 3 ? kRecBlocks[block + 1] : line.size();
+        const std::size_t end = block + 1 < 3 ? kRecBlocks[block + 1] : cut.Size();
         if (first >= end) break;
-        Keep(record, {Field(line, first, 2), Field(line, first + 2, end - first - 2), {}});
+        Keep(record, {cut.Field(first, 2), cut.Field(first + 2, end - first - 2), {}});
     }
     return true;
 }

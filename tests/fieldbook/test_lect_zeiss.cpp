@@ -264,3 +264,15 @@ TEST(LectZeiss, EveryLayoutAndLineEndGivesTheSameSighting) {
         ExpectNear(read, 3, {kUndefined, 123.4567, 98.7654, 12.345});
     }
 }
+
+// A Windows-1252 field book comes to the reader in UTF-8: its columns are still counted in characters.
+TEST(LectZeiss, AnAccentedCodeKeepsTheColumnsOfARec500Line) {
+    const std::string line =
+        "      6                 301  \xC9TE    Hz     50.5000 V1     99.5000 SD    25.432 \r\n";
+    ZeissRun run;
+    const CCarnet& read = run.Read(Sprintf("%-79s\r\n", "      1 POLAR") + line);
+    EXPECT_EQ(run.Said(), "Attention : ligne 2 : visées sans station, rattachées à la station <INCONNUE> (à "
+                          "renommer).\n");
+    ASSERT_EQ(Elements(read, 2), "1001 INCONNUE; 1009 ÉTE; 1003 301; ");
+    ExpectNear(read, 4, {kUndefined, 50.5, 99.5, 25.432});
+}
