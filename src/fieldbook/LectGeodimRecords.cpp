@@ -1,6 +1,7 @@
 #include "fieldbook/LectGeodimRecords.h"
 
 #include <charconv>
+#include <string>
 
 namespace pyr::gdm {
 
@@ -48,12 +49,10 @@ RecordShape SplitRecord(std::string_view line, Record& record) {
 }
 
 void AppendRecordLine(std::string& out, int number, const Record& record) {
-    char digits[24];
-    auto end = std::to_chars(digits, digits + sizeof digits, number).ptr;
-    *end++ = ' ';
-    end = std::to_chars(end, digits + sizeof digits, record.label).ptr;
-    *end++ = '=';
-    out.append(digits, end);
+    out += std::to_string(number); // short enough to stay in the string's own buffer
+    out += ' ';
+    out += std::to_string(record.label);
+    out += '=';
     out += record.value;
     out += '\n';
 }
