@@ -2,10 +2,16 @@
 
 // What every fuzz target of a field-book reader checks besides "no crash": the GéoBase read is a GéoBase
 // like any other, that writes and reads back with as many elements, each of the same kind and name.
+#include "fieldbook/FieldBookFormats.h"
+#include "fieldbook/FieldBookReader.h"
+#include "fieldbook/FieldBookReaders.h"
+#include "fieldbook/ParamDriver.h"
 #include "geobase/Carnet.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
+#include "ui/ScriptedFrontEnd.h"
 
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
 #include <string>
@@ -37,6 +43,40 @@ inline void CheckRoundTrip(const char* target, const CCarnet& read, CPyrTxtWnd& 
     for (int i = 0; i < read.GetSize(); ++i)
         if (back.GetType(i) != read.GetType(i) || back.matAt(i) != read.matAt(i))
             Broken(target, "relu, un élément a changé", read.matAt(i));
+}
+
+// The bytes read from memory by `reader` with `choices`, its messages and lines going to a scripted front
+// end, then the round trip of what it built.
+inline void ReadAndCheckRoundTrip(const char* target, CFieldBookReader& reader, const ReadingChoices& choices,
+                                  std::string_view bytes) {
+    ui::ScriptedFrontEnd frontEnd;
+    ui::ScopedApplicationFrontEnd scope(frontEnd);
+    CPyrTxtWnd txt(frontEnd);
+    reader.SetChoices(choices);
+    reader.SetTextWindow(&txt);
+    reader.SetParent(&frontEnd);
+    CCarnet read;
+    reader.ReadText(bytes, read);
+    CheckRoundTrip(target, read, txt, frontEnd);
+}
+
+// The settings of a format's parameter file that the first byte of an input picks.
+using SettingsChooser = void (*)(CParamDriver& driver, std::uint8_t choice);
+
+// The whole body of a reader's fuzz target: the first byte chooses the settings of `format`, the rest is
+// the field book, read by the format's reader with the default choices (codes kept as they stand).
+inline int FuzzFieldBookReader(const char* target, FieldBookFormat format, SettingsChooser choose,
+                               const std::uint8_t* data, std::size_t size) {
+    if (size == 0) return 0;
+    CParamDriver driver("", "", format);
+    choose(driver, data[0]);
+    const auto reader = MakeFieldBookReader(format);
+    if (!reader) Broken(target, "aucun lecteur pour ce format", {});
+    reader->SetDriver(&driver);
+    const ReadingChoices choices;
+    ReadAndCheckRoundTrip(target, *reader, choices,
+                          std::string_view(reinterpret_cast<const char*>(data) + 1, size - 1));
+    return 0;
 }
 
 } // namespace pyr::fuzz

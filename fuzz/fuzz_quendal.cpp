@@ -4,7 +4,6 @@
 #include "FuzzRoundTrip.h"
 #include "fieldbook/QuendalReader.h"
 #include "fieldbook/TableCode.h"
-#include "ui/ScriptedFrontEnd.h"
 
 #include <cstdint>
 #include <string_view>
@@ -12,10 +11,6 @@
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
     using namespace pyr;
     if (size == 0) return 0;
-    const std::string_view bytes(reinterpret_cast<const char*>(data) + 1, size - 1);
-    ui::ScriptedFrontEnd frontEnd;
-    ui::ScopedApplicationFrontEnd scope(frontEnd);
-    CPyrTxtWnd txt(frontEnd);
     static CTableCode table; // empty: every code is a command word or kept as it stands
     ReadingChoices choices;
     choices.interpret = (data[0] & 1) != 0;
@@ -23,12 +18,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     choices.instruments = {InstrumentOptions{"Appareil Standard"}};
     choices.instrumentName = "Appareil Standard";
     CQuendalReader reader;
-    reader.SetChoices(choices);
     reader.SetCodeTable(&table);
-    reader.SetTextWindow(&txt);
-    reader.SetParent(&frontEnd);
-    CCarnet read;
-    reader.ReadText(bytes, read);
-    fuzz::CheckRoundTrip("fuzz_quendal", read, txt, frontEnd);
+    fuzz::ReadAndCheckRoundTrip("fuzz_quendal", reader, choices,
+                                std::string_view(reinterpret_cast<const char*>(data) + 1, size - 1));
     return 0;
 }

@@ -4,6 +4,7 @@
 //  - written as a Quendal-Pc field book and read back, no line of it is refused as unreadable (the lines of
 //    the surveyor's file are reported by the import with their own numbers, never by the pivot's reading
 //    with the numbers of the temporary file), and the comments and field codes come back word for word.
+#include "FuzzRoundTrip.h"
 #include "core/TextEncoding.h"
 #include "fieldbook/ConfigCol.h"
 #include "fieldbook/ConfigQdl.h"
@@ -15,8 +16,6 @@
 
 #include <cmath>
 #include <cstdint>
-#include <cstdio>
-#include <cstdlib>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -27,9 +26,7 @@ namespace {
 using namespace pyr;
 
 [[noreturn]] void Broken(const char* what, std::string_view detail) {
-    std::fprintf(stderr, "\n*** fuzz_sepcol : %s\n%.*s\n", what, static_cast<int>(detail.size()),
-                 detail.data());
-    std::abort();
+    fuzz::Broken("fuzz_sepcol", what, detail);
 }
 
 struct Layout {

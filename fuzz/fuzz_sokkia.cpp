@@ -2,14 +2,9 @@
 // crash, and what the reader builds is a GéoBase like any other: written and read back, it holds as many
 // elements, each of the same kind.
 #include "FuzzRoundTrip.h"
-#include "fieldbook/LectSokkia.h"
 #include "fieldbook/ParamDriver.h"
-#include "geobase/Carnet.h"
-#include "ui/PyrTxtWnd.h"
-#include "ui/ScriptedFrontEnd.h"
 
 #include <cstdint>
-#include <string_view>
 
 namespace {
 
@@ -30,22 +25,5 @@ void Choose(CParamDriver& driver, std::uint8_t choice) {
 } // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-    if (size == 0) return 0;
-    const std::string_view bytes(reinterpret_cast<const char*>(data) + 1, size - 1);
-
-    ui::ScriptedFrontEnd frontEnd;
-    ui::ScopedApplicationFrontEnd scope(frontEnd);
-    CPyrTxtWnd txt(frontEnd);
-    CParamDriver driver("", "", FieldBookFormat::Sokkia);
-    Choose(driver, data[0]);
-    ReadingChoices choices;
-    CLectSokkia reader;
-    reader.SetChoices(choices);
-    reader.SetDriver(&driver);
-    reader.SetTextWindow(&txt);
-    reader.SetParent(&frontEnd);
-    CCarnet read;
-    reader.ReadText(bytes, read);
-    fuzz::CheckRoundTrip("fuzz_sokkia", read, txt, frontEnd);
-    return 0;
+    return pyr::fuzz::FuzzFieldBookReader("fuzz_sokkia", pyr::FieldBookFormat::Sokkia, Choose, data, size);
 }
