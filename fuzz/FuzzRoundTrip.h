@@ -63,6 +63,21 @@ inline void ReadAndCheckRoundTrip(const char* target, CFieldBookReader& reader, 
 // The settings of a format's parameter file that the first byte of an input picks.
 using SettingsChooser = void (*)(CParamDriver& driver, std::uint8_t choice);
 
+// The settings that change what most instrument readers make of a record, each from its own part of the
+// first byte: how the reference sightings are told (choice % 3, the codes "REF" and "99"), the unit of
+// the angles (choice / 3 % 4), feet (0x40), coordinates in the order Y, X (0x80) and the points computed
+// by the instrument kept (0x20). A format without one of these keys ignores it.
+inline void ChooseReaderSettings(CParamDriver& driver, std::uint8_t choice) {
+    static const char* const references[] = {"aucune", "premiere", "codes"};
+    static const char* const angles[] = {"grades", "degres", "dms", "mils"};
+    driver.SetText(kKeyReferences, references[choice % 3]);
+    driver.SetText(kKeyCodesReference, "REF,99");
+    driver.SetText(kKeyUniteAngles, angles[(choice / 3) % 4]);
+    driver.SetText(kKeyUniteDistances, choice & 0x40 ? "pieds" : "metres");
+    driver.SetText(kKeyOrdreCoordonnees, choice & 0x80 ? "YX" : "XY");
+    driver.SetText(kKeyPointsCalcules, choice & 0x20 ? "1" : "0");
+}
+
 // The whole body of a reader's fuzz target: the first byte chooses the settings of `format`, the rest is
 // the field book, read by the format's reader with the default choices (codes kept as they stand).
 inline int FuzzFieldBookReader(const char* target, FieldBookFormat format, SettingsChooser choose,

@@ -2,7 +2,6 @@
 // crash, and what the reader builds is a GéoBase like any other: written and read back, it holds as many
 // elements, each of the same kind.
 #include "FuzzRoundTrip.h"
-#include "fieldbook/ParamDriver.h"
 
 #include <cstdint>
 
@@ -10,18 +9,12 @@ namespace {
 
 using namespace pyr;
 
-// The settings of "Wild.ini" that change what the reader makes of a block.
+// The settings of "Wild.ini" that change what the reader makes of a block: those of every instrument
+// reader, and how a station block is told.
 void Choose(CParamDriver& driver, std::uint8_t choice) {
     static const char* const conventions[] = {"auto", "84", "41"};
-    static const char* const references[] = {"aucune", "premiere", "codes"};
-    static const char* const angles[] = {"grades", "degres", "dms", "mils"};
-    driver.SetText(kKeyConventionStation, conventions[choice % 3]);
-    driver.SetText(kKeyReferences, references[(choice / 3) % 3]);
-    driver.SetText(kKeyCodesReference, "REF,99");
-    driver.SetText(kKeyUniteAngles, angles[(choice / 9) % 4]);
-    driver.SetText(kKeyUniteDistances, choice & 0x40 ? "pieds" : "metres");
-    driver.SetText(kKeyOrdreCoordonnees, choice & 0x80 ? "YX" : "XY");
-    driver.SetText(kKeyPointsCalcules, choice & 0x20 ? "1" : "0");
+    fuzz::ChooseReaderSettings(driver, choice);
+    driver.SetText(kKeyConventionStation, conventions[(choice / 12) % 3]);
 }
 
 } // namespace
