@@ -4,6 +4,7 @@
 // recording its text-window lines and its message boxes.
 #include "TestSupport.h"
 #include "fieldbook/FieldBookReader.h"
+#include "fieldbook/ParamDriver.h"
 #include "geobase/Carnet.h"
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -65,6 +66,19 @@ struct ReaderRun {
     }
 };
 
+// A run whose reader takes the settings of its parameter file from memory, set key by key.
+template <class Reader, pyr::FieldBookFormat format>
+struct DriverRun : ReaderRun<Reader> {
+    pyr::CParamDriver driver{"", "", format};
+
+    DriverRun() { this->reader.SetDriver(&driver); }
+    DriverRun& Set(const char* key, std::string value) {
+        driver.SetText(key, std::move(value));
+        return *this;
+    }
+    pyr::CCarnet& ReadFile(const std::string& name) { return this->Read(ReadBytes(FieldBookData(name))); }
+};
+
 // The line reports of a run, one a line.
 template <class Run>
 std::string ReportText(const Run& run) {
@@ -72,6 +86,28 @@ std::string ReportText(const Run& run) {
     for (const std::string& line : run.Reports())
         reports += line + "\n";
     return reports;
+}
+
+// Each report cut after its line number ("Erreur ligne 3", "Attention : ligne 4"), one a line: where and
+// how grave, for the reports whose wording is checked elsewhere; a report without a line stays whole.
+template <class Run>
+std::string ReportHeads(const Run& run) {
+    std::string heads;
+    for (const std::string& line : run.Reports()) {
+        const std::size_t at = line.find("ligne ");
+        const std::size_t end =
+            at == std::string::npos ? line.size() : line.find_first_not_of("0123456789", at + 6);
+        heads += line.substr(0, end) + "\n";
+    }
+    return heads;
+}
+
+// The kinds of a GéoBase's sightings, in order, a blank after each: which are references.
+inline std::string SightingKinds(const pyr::CCarnet& carnet) {
+    std::string kinds;
+    for (int kind : Kinds(carnet))
+        if (pyr::IsSightingKind(kind)) kinds += std::to_string(kind) + ' ';
+    return kinds;
 }
 
 // Each element as "kind name; ": the text of a comment, the word and parameters of a command.

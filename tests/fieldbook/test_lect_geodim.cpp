@@ -3,12 +3,9 @@
 // (123°45'30" = 123.758333° = 137.50926 gr; 89°18'05" = 99.22377 gr; a face II circle reading is half a
 // turn from face I and its zenith angle the complement to 400 gr).
 #include "FieldBookTestSupport.h"
-#include "core/Strings.h"
 #include "fieldbook/LectGeodim.h"
-#include "fieldbook/ParamDriver.h"
 
 #include <filesystem>
-#include <fstream>
 #include <gtest/gtest.h>
 #include <tuple>
 
@@ -16,16 +13,7 @@ using namespace pyr;
 
 namespace {
 
-struct GeodimRun : ReaderRun<CLectGeodim> {
-    CParamDriver driver{"", "", FieldBookFormat::Geotronics};
-
-    GeodimRun() { reader.SetDriver(&driver); }
-    GeodimRun& Set(const char* key, std::string value) {
-        driver.SetText(key, std::move(value));
-        return *this;
-    }
-    CCarnet& ReadFile(const std::string& name) { return Read(ReadBytes(FieldBookData(name))); }
-};
+using GeodimRun = DriverRun<CLectGeodim, FieldBookFormat::Geotronics>;
 
 } // namespace
 

@@ -6,63 +6,15 @@
 // gr, 89°52'43" = 99.865123 gr, 10 ft = 3.048 m.
 #include "FieldBookTestSupport.h"
 #include "fieldbook/LectNikon.h"
-#include "fieldbook/ParamDriver.h"
 
 #include <gtest/gtest.h>
-#include <initializer_list>
 #include <tuple>
 
 using namespace pyr;
 
 namespace {
 
-constexpr double kTolerance = 1e-4; // 0.1 mm, 0.1 mgon
-
-struct NikonRun : ReaderRun<CLectNikon> {
-    CParamDriver driver{"", "", FieldBookFormat::NikonAtlas};
-
-    NikonRun() { reader.SetDriver(&driver); }
-    NikonRun& Set(const char* key, std::string value) {
-        driver.SetText(key, std::move(value));
-        return *this;
-    }
-    const CCarnet& ReadFile(const std::string& name) { return Read(ReadBytes(FieldBookData(name))); }
-    std::string Lines() const {
-        std::string lines;
-        for (const std::string& line : Reports())
-            lines += line + "\n";
-        return lines;
-    }
-};
-
-// Each element as "kind name" (a comment's text), "; " after each.
-std::string Summary(const CCarnet& carnet) {
-    std::string summary;
-    for (int i = 0; i < carnet.GetSize(); ++i) {
-        const int kind = carnet.GetType(i);
-        summary += std::to_string(kind) + ' ';
-        summary += kind == kKindComment   ? carnet.As<CComment>(i)->text()
-                   : kind == kKindCommand ? carnet.cmdAt(i)
-                                          : carnet.matAt(i);
-        summary += "; ";
-    }
-    return summary;
-}
-
-// HP, AH, AV, DI of a sighting, or X, Y, Z of a point; kUndefined where there must be none.
-void Expect(const CCarnet& carnet, int i, std::initializer_list<double> expected) {
-    const bool point = expected.size() == 3;
-    const double actual[] = {point ? carnet.xAt(i) : carnet.hpAt(i), point ? carnet.yAt(i) : carnet.ahAt(i),
-                             point ? carnet.zAt(i) : carnet.avAt(i), carnet.diAt(i)};
-    int k = 0;
-    for (double value : expected) {
-        if (IsUndefined(value))
-            EXPECT_EQ(actual[k], kUndefined) << "value " << k << " of element " << i;
-        else
-            EXPECT_NEAR(actual[k], value, kTolerance) << "value " << k << " of element " << i;
-        ++k;
-    }
-}
+using NikonRun = DriverRun<CLectNikon, FieldBookFormat::NikonAtlas>;
 
 int Last(const CCarnet& carnet) {
     return carnet.GetSize() - 1;
@@ -75,8 +27,8 @@ TEST(LectNikon, ARawFieldBookGivesItsPointsStationBacksightsAndShots) {
     const CCarnet& read = run.ReadFile("nikon-raw-gons.raw");
     // The superseded shot (*SS) is skipped without a word; the calculated point CC is not kept without the
     // setting; the Ctrl-Z at the end is no line.
-    EXPECT_EQ(run.Lines(), "Erreur ligne 19 : donnée non reconnue !\n");
-    ASSERT_EQ(Summary(read),
+    EXPECT_EQ(ReportText(run), "Erreur ligne 19 : donnée non reconnue !\n");
+    ASSERT_EQ(ElementsSummary(read),
               "1000 Format               = Nikon RAW data format V2.00; "
               "1000 Unité des distances  = Metres; 1000 Unité des angles     = Gons; "
               "1000 Zéro vertical        = Zenith; 1000 Ordre coordonnées    = NEZ; "
@@ -84,36 +36,37 @@ TEST(LectNikon, ARawFieldBookGivesItsPointsStationBacksightsAndShots) {
               "1000 Transfert            = 02-Mar-2024 10:15:00; 1009 STA; 1006 S1; 1006 A1; "
               "1001 S1; 1000 Station <S1> : référence <A1>, gisement 100.00000 gr, lecture Hz "
               "100.00000 gr; 1002 A1; 1002 A1; 1009 ARB; 1003 104; 1003 105; 1002 A1; 1003 106; ");
-    Expect(read, 8, {1000.0, 2000.0, 100.0}); // N, E, Z in the file: X is the easting
-    Expect(read, 9, {1100.0, 2000.0, 100.0});
-    EXPECT_NEAR(read.hiAt(10), 1.55, kTolerance);
+    ExpectValues(read, 8, {1000.0, 2000.0, 100.0}); // N, E, Z in the file: X is the easting
+    ExpectValues(read, 9, {1100.0, 2000.0, 100.0});
+    EXPECT_NEAR(read.hiAt(10), 1.55, 1e-4);
     EXPECT_EQ(read.v0At(10), kUndefined);
-    Expect(read, 12, {1.3, 100.0, 99.8563, 100.001});  // F1 without a point: the station's backsight
-    Expect(read, 13, {1.3, 300.0, 300.1437, 100.001}); // face II kept as read
-    Expect(read, 15, {1.3, 0.0, 100.0, 10.0});
-    Expect(read, 16, {1.3, 50.0, 100.0, 12.5});          // the point's number, its identifier beside it
-    Expect(read, 17, {1.3, 100.0002, 99.8563, 100.002}); // a check shot on a known point
-    Expect(read, 18, {1.3, 200.0, 100.0, 5.0});
+    ExpectValues(read, 12, {1.3, 100.0, 99.8563, 100.001});  // F1 without a point: the station's backsight
+    ExpectValues(read, 13, {1.3, 300.0, 300.1437, 100.001}); // face II kept as read
+    ExpectValues(read, 15, {1.3, 0.0, 100.0, 10.0});
+    ExpectValues(read, 16, {1.3, 50.0, 100.0, 12.5});          // the point's number, its identifier beside it
+    ExpectValues(read, 17, {1.3, 100.0002, 99.8563, 100.002}); // a check shot on a known point
+    ExpectValues(read, 18, {1.3, 200.0, 100.0, 5.0});
 
     NikonRun computed;
     const CCarnet& withComputed = computed.Set(kKeyPointsCalcules, "1").ReadFile("nikon-raw-gons.raw");
     ASSERT_EQ(read.GetSize() + 1, withComputed.GetSize());
-    Expect(withComputed, Last(withComputed), {1000.0, 2010.0, 100.25});
+    ExpectValues(withComputed, Last(withComputed), {1000.0, 2010.0, 100.25});
 }
 
 TEST(LectNikon, ADtmFieldBookGivesStationsFromTheirHeightAndUnitsPerRecord) {
     NikonRun run;
     const CCarnet& read = run.ReadFile("nikon-dtm.nik");
-    EXPECT_EQ(run.Lines(), "");
-    ASSERT_EQ(Summary(read), "1000 Format               = Nikon DTM (virgules); 1006 S1; 1001 S1; 1006 A1; "
-                             "1002 A1; 1003 104; 1003 105; 1003 106; ");
-    Expect(read, 1, {1000.0, 2000.0, kUndefined});
-    EXPECT_NEAR(read.hiAt(2), 1.55, kTolerance);
-    Expect(read, 3, {1100.0, 2000.0, 100.0});
-    Expect(read, 4, {1.3, 100.0, 99.865123, 100.001});       // MD: 90°00'00", 89°52'43"
-    Expect(read, 5, {1.3, 0.0, 100.0, 10.0});                // MG: grads
-    Expect(read, 6, {1.524, 137.509259, 101.550926, 3.048}); // FD: feet, 123°45'30", 91°23'45"
-    Expect(read, 7, {kUndefined, 200.0, 100.0, 8.0});        // MM: 3200 and 1600 mils; no target height
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read),
+              "1000 Format               = Nikon DTM (virgules); 1006 S1; 1001 S1; 1006 A1; "
+              "1002 A1; 1003 104; 1003 105; 1003 106; ");
+    ExpectValues(read, 1, {1000.0, 2000.0, kUndefined});
+    EXPECT_NEAR(read.hiAt(2), 1.55, 1e-4);
+    ExpectValues(read, 3, {1100.0, 2000.0, 100.0});
+    ExpectValues(read, 4, {1.3, 100.0, 99.865123, 100.001});       // MD: 90°00'00", 89°52'43"
+    ExpectValues(read, 5, {1.3, 0.0, 100.0, 10.0});                // MG: grads
+    ExpectValues(read, 6, {1.524, 137.509259, 101.550926, 3.048}); // FD: feet, 123°45'30", 91°23'45"
+    ExpectValues(read, 7, {kUndefined, 200.0, 100.0, 8.0});        // MM: 3200 and 1600 mils; no target height
 }
 
 // The instrument height follows the first hyphen after which a number stands; an identifier may hold
@@ -130,13 +83,11 @@ TEST(LectNikon, ADtmIdentifierWithAnInstrumentHeightSetsUpAStation) {
         const CCarnet& read = run.Read(std::string("1 , 0 , MG , S0-1.5\n1 , 0 , MG , ") + field +
                                        " , 10.000 , 50.0000 , 100.0000 , 1.300\n");
         SCOPED_TRACE(field);
-        EXPECT_EQ(run.Lines(), "");
+        EXPECT_EQ(ReportText(run), "");
         ASSERT_EQ(read.matAt(Last(read)), name);
-        if (IsUndefined(hi)) {
-            EXPECT_EQ(read.GetType(Last(read)), kKindMesure);
-        } else {
-            ASSERT_EQ(read.GetType(Last(read)), kKindStation);
-            EXPECT_NEAR(read.hiAt(Last(read)), hi, kTolerance);
+        ASSERT_EQ(read.GetType(Last(read)), IsUndefined(hi) ? kKindMesure : kKindStation);
+        if (!IsUndefined(hi)) {
+            EXPECT_NEAR(read.hiAt(Last(read)), hi, 1e-4);
         }
     }
 }
@@ -148,36 +99,36 @@ TEST(LectNikon, AnglesAndLengthsComeInGradsAndMetresWhateverTheUnit) {
         const char* declaration;
         const char* angles;
         const char* distances;
-        const char* shot; // ht, sd, ha, va
-        double hp, di, ah, av;
+        const char* hzV; // of a shot with a target height of 5 and a slope distance of 10
+        double ah, av, metresPerUnit;
     };
     const Case cases[] = {
-        {"Angle Units: DDDMMSS", "grades", "metres", "1.300,10.000,123.4530,91.2345", 1.3, 10.0, 137.509259,
-         101.550926},
-        {"Angle Units: Dec.Degrees", "grades", "metres", "1.300,10.000,45.0,90.0", 1.3, 10.0, 50.0, 100.0},
-        {"Angle Units: Mils", "grades", "metres", "1.300,10.000,1600,1600", 1.3, 10.0, 100.0, 100.0},
-        {"Angle Units: Gons", "dms", "metres", "1.300,10.000,123.4530,91.2345", 1.3, 10.0, 123.453, 91.2345},
-        {"Comments: none", "dms", "metres", "1.300,10.000,123.4530,91.2345", 1.3, 10.0, 137.509259,
-         101.550926},
-        {"Dist Units: Feet", "grades", "metres", "5.000,10.000,100,100", 1.524, 3.048, 100.0, 100.0},
-        {"Dist Units: Metres", "grades", "pieds", "5.000,10.000,100,100", 5.0, 10.0, 100.0, 100.0},
-        {"Comments: none", "grades", "pieds", "5.000,10.000,100,100", 1.524, 3.048, 100.0, 100.0},
-        {"Zero VA: Horizontal", "grades", "metres", "1.300,10.000,100,10.0000", 1.3, 10.0, 100.0, 90.0},
-        {"Zero VA: Horizontal", "grades", "metres", "1.300,10.000,100,-5.0000", 1.3, 10.0, 100.0, 105.0},
-        {"Zero VA: Horizontal", "dms", "metres", "1.300,10.000,100,9.0000", 1.3, 10.0, 111.111111, 90.0},
-        {"Zero VA: Zenith", "grades", "metres", ",,100,", kUndefined, kUndefined, 100.0, kUndefined},
+        {"Angle Units: DDDMMSS", "grades", "metres", "123.4530,91.2345", 137.509259, 101.550926, 1},
+        {"Angle Units: Dec.Degrees", "grades", "metres", "45.0,90.0", 50.0, 100.0, 1},
+        {"Angle Units: Mils", "grades", "metres", "1600,1600", 100.0, 100.0, 1},
+        {"Angle Units: Gons", "dms", "metres", "123.4530,91.2345", 123.453, 91.2345, 1},
+        {"Comments: none", "dms", "metres", "123.4530,91.2345", 137.509259, 101.550926, 1},
+        {"Dist Units: Feet", "grades", "metres", "100,100", 100.0, 100.0, 0.3048},
+        {"Dist Units: Metres", "grades", "pieds", "100,100", 100.0, 100.0, 1},
+        {"Comments: none", "grades", "pieds", "100,100", 100.0, 100.0, 0.3048},
+        {"Zero VA: Horizontal", "grades", "metres", "100,10.0000", 100.0, 90.0, 1},
+        {"Zero VA: Horizontal", "grades", "metres", "100,-5.0000", 100.0, 105.0, 1},
+        {"Zero VA: Horizontal", "dms", "metres", "100,9.0000", 111.111111, 90.0, 1},
     };
     for (const Case& c : cases) {
         NikonRun run;
-        const std::string text =
-            std::string("CO,") + c.declaration + "\nST,S1,,,,1.500,,\nSS,P," + c.shot + ",10:00:00,\n";
+        const std::string text = std::string("CO,") + c.declaration +
+                                 "\nST,S1,,,,1.500,,\nSS,P,5.000,10.000," + c.hzV + ",10:00:00,\n";
         const CCarnet& read =
             run.Set(kKeyUniteAngles, c.angles).Set(kKeyUniteDistances, c.distances).Read(text);
         SCOPED_TRACE(text);
-        EXPECT_EQ(run.Lines(), "");
+        EXPECT_EQ(ReportText(run), "");
         ASSERT_EQ(read.GetType(Last(read)), kKindMesure);
-        Expect(read, Last(read), {c.hp, c.ah, c.av, c.di});
+        ExpectValues(read, Last(read), {5 * c.metresPerUnit, c.ah, c.av, 10 * c.metresPerUnit});
     }
+    NikonRun blanks;
+    const CCarnet& read = blanks.Read("ST,S1,,,,1.500,,\nSS,P,,,100,,10:00:00,\n");
+    ExpectValues(read, Last(read), {kUndefined, 100.0, kUndefined, kUndefined}); // missing, never 0
 }
 
 TEST(LectNikon, TheAxisOrderOfTheFileWinsOverTheSettings) {
@@ -193,7 +144,7 @@ TEST(LectNikon, TheAxisOrderOfTheFileWinsOverTheSettings) {
                                   .Read(std::string("CO,") + declaration + "\nMP,P,,1.000,2.000,,\n");
         SCOPED_TRACE(declaration + std::string(" ") + order);
         ASSERT_EQ(read.GetType(Last(read)), kKindPoint);
-        Expect(read, Last(read), {x, y, kUndefined}); // no elevation: missing, not 0
+        ExpectValues(read, Last(read), {x, y, kUndefined}); // no elevation: missing, not 0
     }
 }
 
@@ -209,11 +160,9 @@ TEST(LectNikon, ReferenceSightingsAreTheBacksightsAndWhatTheSettingsMark) {
     };
     for (const auto& [marking, kinds] : cases) {
         NikonRun run;
-        const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "REF").Read(book);
-        std::string sightings;
-        for (int kind : Kinds(read))
-            if (kind == kKindReference || kind == kKindMesure) sightings += std::to_string(kind) + " ";
-        EXPECT_EQ(sightings, kinds) << marking;
+        EXPECT_EQ(SightingKinds(run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "REF").Read(book)),
+                  kinds)
+            << marking;
     }
 }
 
@@ -231,7 +180,7 @@ TEST(LectNikon, EveryLineIsReadOrReportedWithItsNumber) {
                                    "1 , 0 , XX , 5 , 1 , 2 , 3 , 1.5\n"
                                    "SS,P4,1.3,10,0,450,10:00:00,\n"
                                    "SS,P5,1.3,10,0,100,10:00:00,\n");
-    EXPECT_EQ(run.Lines(),
+    EXPECT_EQ(ReportText(run),
               "Erreur ligne 1 : pas de station pour cette visée !\n"
               "Erreur ligne 3 : valeur numérique incorrecte <1O.5> !\n"
               "Erreur ligne 4 : donnée non reconnue !\n"
@@ -245,9 +194,10 @@ TEST(LectNikon, EveryLineIsReadOrReportedWithItsNumber) {
               "Visée <P4> : angle zénithal incorrect (450 gr, entre 0 et 400) : elle n'est pas ajoutée à la "
               "GéoBase !\n"
               "Erreur ligne 11 : donnée refusée par les contrôles de la GéoBase !\n");
-    EXPECT_TRUE(Summary(read).ends_with("1001 S1; 1000 Unité des angles     = Radians; "
+    EXPECT_TRUE(
+        ElementsSummary(read).ends_with("1001 S1; 1000 Unité des angles     = Radians; "
                                         "1000 Format               = Nikon DTM (virgules); 1003 P5; "))
-        << Summary(read);
+        << ElementsSummary(read);
 }
 
 TEST(LectNikon, LineEndsAndTransmissionBytesGiveTheSameElements) {
@@ -260,11 +210,11 @@ TEST(LectNikon, LineEndsAndTransmissionBytesGiveTheSameElements) {
         cr += line + "\r\r";
     }
     NikonRun reference;
-    const std::string expected = Summary(reference.Read(lf));
+    const std::string expected = ElementsSummary(reference.Read(lf));
     ASSERT_EQ(expected, "1006 A1; 1001 S1; 1000 Station <S1> : référence <A1>; 1002 A1; ");
     for (const std::string& text : {crlf, "\x02" + cr + "\x03\r\n\x04", lf + "\x1a"}) {
         NikonRun run;
-        EXPECT_EQ(Summary(run.Read(text)), expected);
-        EXPECT_EQ(run.Lines(), "");
+        EXPECT_EQ(ElementsSummary(run.Read(text)), expected);
+        EXPECT_EQ(ReportText(run), "");
     }
 }

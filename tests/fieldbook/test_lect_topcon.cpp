@@ -7,7 +7,6 @@
 #include "core/Strings.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectTopcon.h"
-#include "fieldbook/ParamDriver.h"
 
 #include <gtest/gtest.h>
 
@@ -15,63 +14,8 @@ using namespace pyr;
 
 namespace {
 
-constexpr double kTenthMm = 1e-4;   // m
-constexpr double kTenthMgon = 1e-4; // gr
 constexpr double kNone = kUndefined;
-
-struct TopconRun : ReaderRun<CLectTopcon> {
-    CParamDriver driver{"", "", FieldBookFormat::TopconGT7};
-
-    TopconRun() { reader.SetDriver(&driver); }
-    TopconRun& Set(const char* key, std::string value) {
-        driver.SetText(key, std::move(value));
-        return *this;
-    }
-    std::string Lines() const {
-        std::string all;
-        for (const std::string& line : Reports())
-            all += line + "\n";
-        return all;
-    }
-};
-
-// "kind name" of every element, a comment by its text, "; " after each.
-std::string Elements(const CCarnet& carnet) {
-    std::string all;
-    for (int i = 0; i < carnet.GetSize(); ++i) {
-        const int kind = carnet.GetType(i);
-        all += std::to_string(kind) + ' ';
-        all += kind == kKindComment ? carnet.As<CComment>(i)->text()
-                                    : (IsCommandKind(kind) ? carnet.cmdAt(i) : carnet.matAt(i));
-        all += "; ";
-    }
-    return all;
-}
-
-// The sighting at `i` holds HP, AH, AV, DI; undefined where kNone is expected, exactly.
-void ExpectSighting(const CCarnet& carnet, int i, double hp, double ah, double av, double di) {
-    SCOPED_TRACE("élément " + std::to_string(i) + " " + carnet.matAt(i));
-    const double expected[] = {hp, ah, av, di};
-    const double actual[] = {carnet.hpAt(i), carnet.ahAt(i), carnet.avAt(i), carnet.diAt(i)};
-    for (int k = 0; k < 4; ++k) {
-        if (IsUndefined(expected[k]))
-            EXPECT_EQ(actual[k], kUndefined) << "valeur " << k;
-        else
-            EXPECT_NEAR(actual[k], expected[k], k == 1 || k == 2 ? kTenthMgon : kTenthMm) << "valeur " << k;
-    }
-}
-
-void ExpectPoint(const CCarnet& carnet, int i, double x, double y, double z) {
-    SCOPED_TRACE("point " + std::to_string(i) + " " + carnet.matAt(i));
-    const double expected[] = {x, y, z};
-    const double actual[] = {carnet.xAt(i), carnet.yAt(i), carnet.zAt(i)};
-    for (int k = 0; k < 3; ++k) {
-        if (IsUndefined(expected[k]))
-            EXPECT_EQ(actual[k], kUndefined) << "coordonnée " << k;
-        else
-            EXPECT_NEAR(actual[k], expected[k], kTenthMm) << "coordonnée " << k;
-    }
-}
+using TopconRun = DriverRun<CLectTopcon, FieldBookFormat::TopconGT7>;
 
 // A station with its known point, ready for one sighting.
 const std::string kStation = "STN     S1,1.500,\nXYZ     1000.000,2000.000,100.000\n";
@@ -80,9 +24,9 @@ const std::string kStation = "STN     S1,1.500,\nXYZ     1000.000,2000.000,100.0
 
 TEST(LectTopcon, AMetreAndDmsFieldBookGivesItsStationReferenceAndSightings) {
     TopconRun run;
-    const CCarnet& read = run.Read(ReadBytes(FieldBookData("topcon-metres-dms.gts7")));
-    EXPECT_EQ(run.Lines(), "");
-    ASSERT_EQ(Elements(read),
+    const CCarnet& read = run.ReadFile("topcon-metres-dms.gts7");
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read),
               "1000 Logiciel             = GTS-7 export; 1000 Chantier             = ESSAI; "
               "1000 Date                 = 01/02/24 08:30:00; "
               "1000 Appareil             = GTS-701; "
@@ -90,29 +34,28 @@ TEST(LectTopcon, AMetreAndDmsFieldBookGivesItsStationReferenceAndSightings) {
               "1009 BORNE; 1006 S1; 1001 S1; "
               "1000 Orientation sur <A1> : gisement 100.00000 gr, lecture 0.00000 gr; 1006 A1; "
               "1002 A1; 1009 ARB; 1003 101; 1003 102; 1009 MUR; 1003 103; 1000 fin de station; ");
-    ExpectPoint(read, 6, 1000.0, 2000.0, 100.0);
-    EXPECT_NEAR(read.hiAt(7), 1.55, kTenthMm);
+    ExpectValues(read, 6, {1000.0, 2000.0, 100.0});
+    EXPECT_NEAR(read.hiAt(7), 1.55, 1e-4);
     EXPECT_EQ(read.v0At(7), kUndefined); // left to the orientation computation
-    ExpectPoint(read, 9, 1100.0, 2000.0, 100.0);
-    ExpectSighting(read, 10, 1.3, 0.0, 100.0, kNone);            // HV: no distance, not 0
-    ExpectSighting(read, 12, 1.3, 137.50926, 97.22685, 25.1234); // to the 0.1 mm written
-    ExpectSighting(read, 13, 1.3, 50.0, 40.96655, 50.0);         // HD 30, VD 40: the 3-4-5 triangle
-    ExpectSighting(read, 15, 1.3, 399.99997, 300.0, kNone);      // face II kept as read
+    ExpectValues(read, 9, {1100.0, 2000.0, 100.0});
+    ExpectValues(read, 10, {1.3, 0.0, 100.0, kNone});            // HV: no distance, not 0
+    ExpectValues(read, 12, {1.3, 137.50926, 97.22685, 25.1234}); // to the 0.1 mm written
+    ExpectValues(read, 13, {1.3, 50.0, 40.96655, 50.0});         // HD 30, VD 40: the 3-4-5 triangle
+    ExpectValues(read, 15, {1.3, 399.99997, 300.0, kNone});      // face II kept as read
 }
 
 TEST(LectTopcon, AFeetAndGradsFieldBookIsReadInMetres) {
     TopconRun run;
     // The parameter file says degrees: the field book's own UNITS line wins.
-    const CCarnet& read =
-        run.Set(kKeyUniteAngles, "dms").Read(ReadBytes(FieldBookData("topcon-feet-grads.gts7")));
-    EXPECT_EQ(run.Lines(), "");
-    ASSERT_EQ(Elements(read),
+    const CCarnet& read = run.Set(kKeyUniteAngles, "dms").ReadFile("topcon-feet-grads.gts7");
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read),
               "1000 Unités               = pieds, grades; 1006 S2; 1001 S2; 1003 201; 1003 202; ");
-    ExpectPoint(read, 1, 304.8, 609.6, kNone);
-    EXPECT_NEAR(read.hiAt(2), 1.524, kTenthMm);
-    ExpectSighting(read, 3, 1.524, 150.0, 100.0, 30.48);
+    ExpectValues(read, 1, {304.8, 609.6, kNone});
+    EXPECT_NEAR(read.hiAt(2), 1.524, 1e-4);
+    ExpectValues(read, 3, {1.524, 150.0, 100.0, 30.48});
     // No target height, no height difference: the horizontal distance is kept on a level sighting.
-    ExpectSighting(read, 4, kNone, 250.0, 100.0, 3.048);
+    ExpectValues(read, 4, {kNone, 250.0, 100.0, 3.048});
 }
 
 TEST(LectTopcon, UnitsComeFromTheFieldBookElseFromTheParameterFile) {
@@ -137,9 +80,9 @@ TEST(LectTopcon, UnitsComeFromTheFieldBookElseFromTheParameterFile) {
         TopconRun run;
         run.Set(kKeyUniteAngles, c.angles).Set(kKeyUniteDistances, c.lengths);
         const CCarnet& read = run.Read(std::string(c.units) + "STN     S1,,\nSS      1,,\nSD      " + c.sd);
-        EXPECT_EQ(run.Lines(), "");
+        EXPECT_EQ(ReportText(run), "");
         ASSERT_EQ(read.GetType(read.GetSize() - 1), kKindMesure);
-        ExpectSighting(read, read.GetSize() - 1, kNone, c.ah, c.av, c.di);
+        ExpectValues(read, read.GetSize() - 1, {kNone, c.ah, c.av, c.di});
     }
 }
 
@@ -147,12 +90,12 @@ TEST(LectTopcon, MissingValuesStayUndefined) {
     TopconRun run;
     const CCarnet& read = run.Read("STN     S1\nBS      A1\nHV      12.3456,\nSS      2,1.2,\nSD      ,,7.5\n"
                                    "SS      3,0.000\nSD      1.0,100.0,\nXYZ     ,,55.5\n");
-    EXPECT_EQ(run.Lines(), "");
-    ASSERT_EQ(Elements(read), "1001 S1; 1002 A1; 1003 2; 1003 3; ");
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read), "1001 S1; 1002 A1; 1003 2; 1003 3; ");
     EXPECT_EQ(read.hiAt(0), kUndefined);
-    ExpectSighting(read, 1, kNone, 12.3456, kNone, kNone);
-    ExpectSighting(read, 2, 1.2, kNone, kNone, 7.5);
-    ExpectSighting(read, 3, 0.0, 1.0, 100.0, kNone); // a target height of 0 is a value
+    ExpectValues(read, 1, {kNone, 12.3456, kNone, kNone});
+    ExpectValues(read, 2, {1.2, kNone, kNone, 7.5});
+    ExpectValues(read, 3, {0.0, 1.0, 100.0, kNone}); // a target height of 0 is a value
 }
 
 TEST(LectTopcon, TheCoordinateOrderAndTheComputedPointsFollowTheSettings) {
@@ -160,15 +103,15 @@ TEST(LectTopcon, TheCoordinateOrderAndTheComputedPointsFollowTheSettings) {
                              "SS      7,1.3,\nSD      0.0,100.0,10.0\nXYZ     2010.000,1000.000,100.000\n";
     TopconRun run;
     const CCarnet& read = run.Set(kKeyOrdreCoordonnees, "YX").Set(kKeyPointsCalcules, "1").Read(text);
-    EXPECT_EQ(run.Lines(), "");
-    ASSERT_EQ(Elements(read), "1006 S1; 1001 S1; 1003 7; 1006 7; ");
-    ExpectPoint(read, 0, 1000.0, 2000.0, 100.0); // the northing first: X stays the easting
-    ExpectPoint(read, 3, 1000.0, 2010.0, 100.0);
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read), "1006 S1; 1001 S1; 1003 7; 1006 7; ");
+    ExpectValues(read, 0, {1000.0, 2000.0, 100.0}); // the northing first: X stays the easting
+    ExpectValues(read, 3, {1000.0, 2010.0, 100.0});
 
     TopconRun without;
-    EXPECT_EQ(Elements(without.Read(text)), "1006 S1; 1001 S1; 1003 7; ");
-    EXPECT_EQ(without.Lines(), "");
-    ExpectPoint(without.result, 0, 2000.0, 1000.0, 100.0);
+    EXPECT_EQ(ElementsSummary(without.Read(text)), "1006 S1; 1001 S1; 1003 7; ");
+    EXPECT_EQ(ReportText(without), "");
+    ExpectValues(without.result, 0, {2000.0, 1000.0, 100.0});
 }
 
 TEST(LectTopcon, ReferencesAreBacksightsOrMarkedBySettings) {
@@ -185,44 +128,24 @@ TEST(LectTopcon, ReferencesAreBacksightsOrMarkedBySettings) {
         SCOPED_TRACE(marking);
         TopconRun run;
         const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "REF,99").Read(text);
-        std::string sightings;
-        for (int i = 0; i < read.GetSize(); ++i)
-            if (IsSightingKind(read.GetType(i))) sightings += std::to_string(read.GetType(i)) + " ";
-        EXPECT_EQ(sightings, kinds);
-        EXPECT_EQ(run.Lines(), "");
+        EXPECT_EQ(SightingKinds(read), kinds);
+        EXPECT_EQ(ReportText(run), "");
     }
 }
 
+// One case a wording of the reports; the other reports of a wording only by their line and gravity.
 TEST(LectTopcon, EveryLineIsReadOrReportedWithItsNumber) {
-    struct Case {
-        std::string text;
-        const char* reports;
-    };
-    const Case cases[] = {
+    const std::pair<std::string, const char*> worded[] = {
         {"STN     S1,1.5,\nCTLX    1,2\n", "Erreur ligne 2 : donnée non reconnue !\n"},
         {"STN     S1,1.5,\nSS      101,1.3,\nSS      102,1.3,\nHV      1,2\n",
          "Erreur ligne 2 : donnée manquante pour l'observation de la visée <101> !\n"},
-        {"STN     S1,1.5,\nSS      101,1.3,\n",
-         "Erreur ligne 2 : donnée manquante pour l'observation de la visée "
-         "<101> !\n"},
         {"STN     S1,1.5,\nHV      1,2\n", "Erreur ligne 2 : pas de visée pour cette observation !\n"},
-        {"STN     S1,1.5,\nSS      1,1.3,\nHV      1,2\nHV      3,4\n",
-         "Erreur ligne 4 : pas de visée pour cette observation !\n"},
         {"JOB     X\nXYZ     1,2,3\n",
          "Erreur ligne 2 : pas de station ni de visée pour ces coordonnées !\n"},
         {"STN     ,1.5\n", "Erreur ligne 1 : donnée manquante pour le nom de la station !\n"},
-        {"STN     S1\nSS      ,1.3\n", "Erreur ligne 2 : donnée manquante pour le matricule du point !\n"},
-        {"STN     S1\nXYZ     1000.0,,5\n", "Erreur ligne 2 : donnée manquante pour les coordonnées !\n"},
         {"STN     S1\nSS      1,1.3\nSD      1.2.3,100,5\n",
          "Erreur ligne 3 : valeur numérique incorrecte <1.2.3> !\n"
          "Erreur ligne 2 : donnée manquante pour l'observation de la visée <1> !\n"},
-        {"STN     S1\nSS      1,1.3\nSD      nan,100,inf\n",
-         "Erreur ligne 3 : valeur numérique incorrecte <nan> !\n"
-         "Erreur ligne 2 : donnée manquante pour l'observation "
-         "de la visée <1> !\n"},
-        {"STN     S1\nSS      1,1.3\nHV      ,\n", "Erreur ligne 3 : donnée manquante pour les mesures de "
-                                                   "l'observation !\nErreur ligne 2 : donnée manquante pour "
-                                                   "l'observation de la visée <1> !\n"},
         {"UNITS   X,G\n",
          "Erreur ligne 1 : unités « X,G » inconnues (M ou F, puis D ou G), celles du fichier "
          "de paramétrage sont gardées !\n"},
@@ -231,11 +154,23 @@ TEST(LectTopcon, EveryLineIsReadOrReportedWithItsNumber) {
         {"SS      1,1.3\nHV      1,100\n",
          "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"},
     };
-    for (const Case& c : cases) {
-        SCOPED_TRACE(c.text);
+    for (const auto& [text, reports] : worded) {
         TopconRun run;
-        run.Read(c.text);
-        EXPECT_EQ(run.Lines(), c.reports);
+        run.Read(text);
+        EXPECT_EQ(ReportText(run), reports) << text;
+    }
+    const std::pair<std::string, const char*> placed[] = {
+        {"STN     S1,1.5,\nSS      101,1.3,\n", "Erreur ligne 2\n"}, // a sighting without observation, last
+        {"STN     S1,1.5,\nSS      1,1.3,\nHV      1,2\nHV      3,4\n", "Erreur ligne 4\n"},
+        {"STN     S1\nSS      ,1.3\n", "Erreur ligne 2\n"},
+        {"STN     S1\nXYZ     1000.0,,5\n", "Erreur ligne 2\n"},
+        {"STN     S1\nSS      1,1.3\nSD      nan,100,inf\n", "Erreur ligne 3\nErreur ligne 2\n"},
+        {"STN     S1\nSS      1,1.3\nHV      ,\n", "Erreur ligne 3\nErreur ligne 2\n"},
+    };
+    for (const auto& [text, heads] : placed) {
+        TopconRun run;
+        run.Read(text);
+        EXPECT_EQ(ReportHeads(run), heads) << text;
     }
 }
 
@@ -252,9 +187,9 @@ TEST(LectTopcon, EveryLineEndBlankAndControlByteGivesTheSameElements) {
         SCOPED_TRACE(text);
         TopconRun run;
         const CCarnet& read = run.Read(text);
-        EXPECT_EQ(Elements(read), "1001 S1; 1009 ARB; 1003 101; 1000 Départ; ");
-        ExpectSighting(read, 2, 1.3, 100.0, 100.0, 10.0);
-        EXPECT_EQ(run.Lines(), "");
+        EXPECT_EQ(ElementsSummary(read), "1001 S1; 1009 ARB; 1003 101; 1000 Départ; ");
+        ExpectValues(read, 2, {1.3, 100.0, 100.0, 10.0});
+        EXPECT_EQ(ReportText(run), "");
     }
 }
 

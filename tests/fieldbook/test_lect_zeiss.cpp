@@ -6,9 +6,7 @@
 #include "FieldBookTestSupport.h"
 #include "core/Strings.h"
 #include "fieldbook/LectZeiss.h"
-#include "fieldbook/ParamDriver.h"
 
-#include <cmath>
 #include <gtest/gtest.h>
 #include <tuple>
 
@@ -16,51 +14,7 @@ using namespace pyr;
 
 namespace {
 
-constexpr double kTolerance = 1e-4; // 0.1 mm, 0.1 mgon
-
-struct ZeissRun : ReaderRun<CLectZeiss> {
-    CParamDriver driver{"", "", FieldBookFormat::Zeiss};
-
-    ZeissRun() { reader.SetDriver(&driver); }
-    ZeissRun& Set(const char* key, std::string value) {
-        driver.SetText(key, std::move(value));
-        return *this;
-    }
-    CCarnet& ReadFile(const std::string& name) { return Read(ReadBytes(FieldBookData(name))); }
-    std::string Said() const {
-        std::string said;
-        for (const std::string& line : Reports())
-            said += line + "\n";
-        return said;
-    }
-};
-
-// Each element as "kind name", blanks between them; comments by their text.
-std::string Elements(const CCarnet& carnet, int from = 0) {
-    std::string kinds;
-    for (int i = from; i < carnet.GetSize(); ++i) {
-        const int kind = carnet.GetType(i);
-        kinds += std::to_string(kind) + ' ';
-        kinds += kind == kKindComment  ? carnet.As<CComment>(i)->text()
-                 : IsCommandKind(kind) ? carnet.cmdAt(i)
-                                       : carnet.matAt(i);
-        kinds += "; ";
-    }
-    return kinds;
-}
-
-// HP, AH, AV, DI of a sighting or X, Y, Z of a point; kUndefined where there must be none.
-void ExpectNear(const CCarnet& carnet, int i, std::vector<double> expected) {
-    const bool point = expected.size() == 3;
-    const double actual[] = {point ? carnet.xAt(i) : carnet.hpAt(i), point ? carnet.yAt(i) : carnet.ahAt(i),
-                             point ? carnet.zAt(i) : carnet.avAt(i), carnet.diAt(i)};
-    for (std::size_t k = 0; k < expected.size(); ++k) {
-        if (IsUndefined(expected[k]))
-            EXPECT_EQ(actual[k], kUndefined) << "value " << k << " of element " << i;
-        else
-            EXPECT_NEAR(actual[k], expected[k], kTolerance) << "value " << k << " of element " << i;
-    }
-}
+using ZeissRun = DriverRun<CLectZeiss, FieldBookFormat::Zeiss>;
 
 // An M5 line in its columns: "For M5|Adr nnnnn|T2a <27>|T3 <14> <4>|T4 ...|T5 ...|" and the error flag.
 struct Block {
@@ -89,18 +43,18 @@ std::string Pi(const char* point, const char* code = "") {
 TEST(LectZeiss, AnM5FieldBookGivesEveryValueInGradsAndMetres) {
     ZeissRun run;
     const CCarnet& read = run.ReadFile("zeiss-m5-mesures.txt");
-    EXPECT_EQ(run.Said(), "");
-    ASSERT_EQ(Elements(read),
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read),
               "1000 Format               = M5; 1000 Appareil             = M3 5\"DR; "
               "1000 Numéro de série      = 131500; 1000 Version du logiciel  = 1.00; "
               "1000 Axes des coordonnées = X = nord, Y = est; "
               "1000 Facteur d'échelle    = 1.000000; 1000 KN STAT; 1001 S1; 1006 S1; 1002 A1; "
               "1000 POLAR; 1009 MUR; 1003 101; 1003 102; 1003 103; 1003 104; 1003 105; 1003 106; "
               "1009 BORNE; 1006 200; 1006 201; ");
-    EXPECT_NEAR(read.hiAt(7), 1.55, kTolerance);
+    EXPECT_NEAR(read.hiAt(7), 1.55, 1e-4);
     EXPECT_EQ(read.v0At(7), 0.0); // set up on a known station: its Hz are bearings
-    ExpectNear(read, 8, {1000.0, 2000.0, 100.0});
-    ExpectNear(read, 9, {1.3, 100.0, 100.0, 100.0});
+    ExpectValues(read, 8, {1000.0, 2000.0, 100.0});
+    ExpectValues(read, 9, {1.3, 100.0, 100.0, 100.0});
     const double cases[][5] = {
         // element, HP, Hz, zenith, slope distance
         {12, 1.3, 137.50926, 106.11111, 100.0000032}, // 123°45'30", 95.5°, 328.084 ft × 0.3048
@@ -111,9 +65,9 @@ TEST(LectZeiss, AnM5FieldBookGivesEveryValueInGradsAndMetres) {
         {17, 1.8, 40.0, 250.0, kUndefined},           // face right, no distance
     };
     for (const auto& c : cases)
-        ExpectNear(read, static_cast<int>(c[0]), {c[1], c[2], c[3], c[4]});
-    ExpectNear(read, 19, {1005.0, 2010.0, 101.0});
-    ExpectNear(read, 20, {1010.0, 1990.0, kUndefined});
+        ExpectValues(read, static_cast<int>(c[0]), {c[1], c[2], c[3], c[4]});
+    ExpectValues(read, 19, {1005.0, 2010.0, 101.0});
+    ExpectValues(read, 20, {1010.0, 1990.0, kUndefined});
 }
 
 // Rec 500 writes no units: those of the settings hold. S2 at E 3000, N 5000.
@@ -129,16 +83,16 @@ TEST(LectZeiss, ARec500FieldBookTakesItsUnitsFromTheSettings) {
         const CCarnet& read = run.Set(kKeyUniteAngles, angles)
                                   .Set(kKeyUniteDistances, lengths)
                                   .ReadFile("zeiss-rec500-mesures.txt");
-        EXPECT_EQ(run.Said(), "") << angles;
-        ASSERT_EQ(Elements(read),
+        EXPECT_EQ(ReportText(run), "") << angles;
+        ASSERT_EQ(ElementsSummary(read),
                   "1000 Format               = Rec 500; 1000 KN STAT; 1001 S2; 1006 S2; 1002 R1; "
                   "1000 POLAR; 1009 12; 1003 301; 1009 ARB; 1006 302; ")
             << angles;
         const double foot = std::string_view(lengths) == "pieds" ? 0.3048 : 1.0;
-        EXPECT_NEAR(read.hiAt(2), 1.6 * foot, kTolerance);
-        ExpectNear(read, 3, {3000.0 * foot, 5000.0 * foot, 50.0 * foot});
-        ExpectNear(read, 7, {2.0 * foot, hz, zenith, slope});
-        ExpectNear(read, 9, {3006.789 * foot, 5012.345 * foot, 51.234 * foot});
+        EXPECT_NEAR(read.hiAt(2), 1.6 * foot, 1e-4);
+        ExpectValues(read, 3, {3000.0 * foot, 5000.0 * foot, 50.0 * foot});
+        ExpectValues(read, 7, {2.0 * foot, hz, zenith, slope});
+        ExpectValues(read, 9, {3006.789 * foot, 5012.345 * foot, 51.234 * foot});
     }
 }
 
@@ -157,7 +111,7 @@ TEST(LectZeiss, TheAxesFollowTheHeaderThenTheSettings) {
         ZeissRun run;
         const CCarnet& read = run.Set(kKeyOrdreCoordonnees, order).Read(text);
         ASSERT_EQ(read.GetType(read.GetSize() - 1), kKindPoint) << order;
-        ExpectNear(read, read.GetSize() - 1, {east, north, kUndefined});
+        ExpectValues(read, read.GetSize() - 1, {east, north, kUndefined});
     }
 }
 
@@ -177,8 +131,8 @@ TEST(LectZeiss, ReferencesComeFromSetUpProgramsOrTheSettings) {
     for (const auto& [marking, kinds] : cases) {
         ZeissRun run;
         const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "ref").Read(text);
-        EXPECT_EQ(run.Said(), "") << marking;
-        EXPECT_TRUE(Elements(read).ends_with(kinds)) << marking << ": " << Elements(read);
+        EXPECT_EQ(ReportText(run), "") << marking;
+        EXPECT_TRUE(ElementsSummary(read).ends_with(kinds)) << marking << ": " << ElementsSummary(read);
         EXPECT_EQ(read.v0At(2), kUndefined) << "only a known-station set-up is oriented";
     }
 }
@@ -194,13 +148,13 @@ TEST(LectZeiss, HeightsGoToTheStationOfTheirSetUp) {
                              M5(7, "PI1", Pi("2"), {{"Hz", "2.0000", "gon"}}) + "\n";
     ZeissRun run;
     const CCarnet& read = run.Read(text);
-    EXPECT_EQ(run.Said(), "");
-    ASSERT_EQ(Elements(read),
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read),
               "1000 Format               = M5; 1001 A; 1006 A; 1003 1; 1000 POLAR; 1001 B; 1003 2; ");
-    EXPECT_NEAR(read.hiAt(1), 1.4, kTolerance);
-    ExpectNear(read, 2, {kUndefined, kUndefined, 10.0});
-    EXPECT_NEAR(read.hiAt(5), 1.7, kTolerance);
-    ExpectNear(read, 6, {1.1, 2.0, kUndefined, kUndefined});
+    EXPECT_NEAR(read.hiAt(1), 1.4, 1e-4);
+    ExpectValues(read, 2, {kUndefined, kUndefined, 10.0});
+    EXPECT_NEAR(read.hiAt(5), 1.7, 1e-4);
+    ExpectValues(read, 6, {1.1, 2.0, kUndefined, kUndefined});
 }
 
 TEST(LectZeiss, EveryLineIsReadOrReportedWithItsNumber) {
@@ -222,7 +176,7 @@ TEST(LectZeiss, EveryLineIsReadOrReportedWithItsNumber) {
     ZeissRun run;
     const CCarnet& read = run.Read(text);
     EXPECT_EQ(
-        run.Said(),
+        ReportText(run),
         "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"
         "Erreur ligne 2 : donnée non reconnue !\n"
         " -> Chaîne lue = <" +
@@ -239,8 +193,9 @@ TEST(LectZeiss, EveryLineIsReadOrReportedWithItsNumber) {
             "Erreur ligne 9 : donnée non reconnue !\n"
             " -> Chaîne lue = <bonjour>\n"
             "Erreur ligne 10 : donnée manquante pour les observations ou les coordonnées du point !\n");
-    ASSERT_EQ(Elements(read, 1), "1001 INCONNUE; 1003 1; 1003 5; 1003 6; 1003 8; ");
-    ExpectNear(read, 4, {kUndefined, 6.0, kUndefined, kUndefined}); // read in the settings' grads
+    ASSERT_EQ(ElementsSummary(read),
+              "1000 Format               = M5; 1001 INCONNUE; 1003 1; 1003 5; 1003 6; 1003 8; ");
+    ExpectValues(read, 4, {kUndefined, 6.0, kUndefined, kUndefined}); // read in the settings' grads
 }
 
 // R4 and R5 lines are found by their separators; line ends, blanks and transmission bytes change nothing.
@@ -249,19 +204,22 @@ TEST(LectZeiss, EveryLayoutAndLineEndGivesTheSameSighting) {
                               {{"SD", "12.345", "m"}, {"Hz", "123.4567", "gon"}, {"V1", "98.7654", "gon"}});
     const std::string r4 = "For R4|9 C1|SD  12.345 m|Hz  123.4567 gon|V1  98.7654 gon|";
     const std::string r5 = "For_R5|Adr 0001|PI1 9 C1|SD 12.345 m|Hz 123.4567 gon|V1 98.7654 gon| ";
-    const std::string cases[] = {
-        m5 + "\r\n", m5 + "\r",          m5 + "   \n\n", "\x02" + m5 + "\r\n\x03\r\n\x1a",
-        r4 + "\n",   r5 + "\r\nEND\r\n",
+    const std::pair<std::string, const char*> cases[] = {
+        {m5 + "\r\n", "M5"},    {m5 + "\r", "M5"},
+        {m5 + "   \n\n", "M5"}, {"\x02" + m5 + "\r\n\x03\r\n\x1a", "M5"},
+        {r4 + "\n", "R4"},      {r5 + "\r\nEND\r\n", "R5"},
     };
-    for (const std::string& text : cases) {
+    for (const auto& [text, layout] : cases) {
         ZeissRun run;
         const CCarnet& read = run.Read(text);
-        EXPECT_EQ(run.Said(),
+        EXPECT_EQ(ReportText(run),
                   "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à "
                   "renommer).\n")
             << text;
-        ASSERT_EQ(Elements(read, 1), "1001 INCONNUE; 1009 C1; 1003 9; ") << text;
-        ExpectNear(read, 3, {kUndefined, 123.4567, 98.7654, 12.345});
+        ASSERT_EQ(ElementsSummary(read),
+                  "1000 Format               = " + std::string(layout) + "; 1001 INCONNUE; 1009 C1; 1003 9; ")
+            << text;
+        ExpectValues(read, 3, {kUndefined, 123.4567, 98.7654, 12.345});
     }
 }
 
@@ -271,8 +229,10 @@ TEST(LectZeiss, AnAccentedCodeKeepsTheColumnsOfARec500Line) {
         "      6                 301  \xC9TE    Hz     50.5000 V1     99.5000 SD    25.432 \r\n";
     ZeissRun run;
     const CCarnet& read = run.Read(Sprintf("%-79s\r\n", "      1 POLAR") + line);
-    EXPECT_EQ(run.Said(), "Attention : ligne 2 : visées sans station, rattachées à la station <INCONNUE> (à "
-                          "renommer).\n");
-    ASSERT_EQ(Elements(read, 2), "1001 INCONNUE; 1009 ÉTE; 1003 301; ");
-    ExpectNear(read, 4, {kUndefined, 50.5, 99.5, 25.432});
+    EXPECT_EQ(ReportText(run),
+              "Attention : ligne 2 : visées sans station, rattachées à la station <INCONNUE> (à "
+              "renommer).\n");
+    ASSERT_EQ(ElementsSummary(read),
+              "1000 Format               = Rec 500; 1000 POLAR; 1001 INCONNUE; 1009 ÉTE; 1003 301; ");
+    ExpectValues(read, 4, {kUndefined, 50.5, 99.5, 25.432});
 }
