@@ -51,4 +51,21 @@ bool EqualIgnoringCase(std::string_view a, std::string_view b) {
     return true;
 }
 
+namespace {
+template <class Words>
+bool AnyEqualIgnoringCase(std::string_view word, const Words& words) {
+    for (const auto& candidate : words)
+        if (EqualIgnoringCase(candidate, word)) return true;
+    return false;
+}
+} // namespace
+
+bool IsAnyOf(std::string_view word, const std::vector<std::string>& words) {
+    return AnyEqualIgnoringCase(word, words);
+}
+
+bool IsAnyOf(std::string_view word, std::initializer_list<std::string_view> words) {
+    return AnyEqualIgnoringCase(word, words);
+}
+
 } // namespace pyr

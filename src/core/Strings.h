@@ -1,8 +1,10 @@
 #pragma once
 
 #include <cstdarg>
+#include <initializer_list>
 #include <string>
 #include <string_view>
+#include <vector>
 
 namespace pyr {
 
@@ -17,5 +19,9 @@ std::string_view Trimmed(std::string_view text);
 // Names compared as Windows compares file names, keys and command words: ASCII letters without regard
 // to case, every other byte as it is.
 bool EqualIgnoringCase(std::string_view a, std::string_view b);
+
+// Whether `word` is one of `words`, compared as EqualIgnoringCase does.
+bool IsAnyOf(std::string_view word, const std::vector<std::string>& words);
+bool IsAnyOf(std::string_view word, std::initializer_list<std::string_view> words);
 
 } // namespace pyr

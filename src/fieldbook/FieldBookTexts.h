@@ -85,4 +85,44 @@ inline constexpr const char* kNewerQuendal = "Attention : ligne %d : carnet Quen
                                              "récente que celle de ce programme (%d) ; il est lu quand même.";
 inline constexpr const char* kReadAsWindows1252 = "Carnet <%s> : fichier lu en Windows-1252.";
 
+// ---- Texts of every instrument reader
+// Names of the data, for kMissingDatum.
+inline constexpr const char* kDatumPoint = "le matricule du point";
+inline constexpr const char* kDatumStation = "le nom de la station";
+inline constexpr const char* kDatumContent = "les observations ou les coordonnées du point";
+inline constexpr const char* kDatumCoordinates = "les coordonnées du point";
+inline constexpr const char* kDatumEast = "la coordonnée Est";
+inline constexpr const char* kDatumNorth = "la coordonnée Nord";
+
+// Lines skipped.
+inline constexpr const char* kRefused = "Erreur ligne %d : donnée refusée par les contrôles de la GéoBase !";
+inline constexpr const char* kNoStationForSighting = "Erreur ligne %d : pas de station pour cette visée !";
+
+// A field book that starts measuring without saying where the instrument stands (the polar output of
+// many instruments): its first sightings go to a station of this name, which the surveyor renames.
+inline constexpr const char* kUnknownStation = "INCONNUE";
+inline constexpr const char* kUnknownStationOpened =
+    "Attention : ligne %d : visées sans station, rattachées à la station <%s> (à renommer).";
+
+// Labels of the header comments of a GéoBase, and the units they name.
+inline constexpr const char* kLabelFile = "Fichier";
+inline constexpr const char* kLabelFormat = "Format";
+inline constexpr const char* kLabelInstrument = "Appareil";
+inline constexpr const char* kLabelSerial = "Numéro de série";
+inline constexpr const char* kLabelSoftware = "Logiciel";
+inline constexpr const char* kLabelJob = "Chantier";
+inline constexpr const char* kLabelDate = "Date";
+inline constexpr const char* kLabelUnits = "Unités";
+inline constexpr const char* kLabelAngles = "Unité des angles";
+inline constexpr const char* kLabelDistances = "Unité des distances";
+inline constexpr const char* kLabelPpm = "Correction atmosphérique";
+inline constexpr const char* kLabelAtmosphere = "Atmosphère";
+inline constexpr const char* kLabelTemperature = "Température";
+inline constexpr const char* kLabelPrism = "Constante de prisme";
+inline constexpr const char* kLabelScale = "Facteur d'échelle";
+inline constexpr const char* kMetres = "mètres";
+inline constexpr const char* kFeet = "pieds";
+inline constexpr const char* kGrads = "grades";
+inline constexpr const char* kDegrees = "degrés décimaux";
+
 } // namespace pyr::fb

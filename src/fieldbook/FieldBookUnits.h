@@ -30,4 +30,12 @@ bool DmsTextToDegrees(std::string_view text, double& degrees);
 double ToGrads(double angle, AngleUnit unit);
 double ToMetres(double length, DistanceUnit unit);
 
+// A sighting that the field book gives with its horizontal distance (m) rather than its slope distance:
+// when `slope` is unknown, completes it and, where it can, the zenith angle (gr). By the zenith angle
+// (slope = horizontal / sin V); without one, by the height difference from the tilting axis to the
+// target (slope = hypot, V = atan2(horizontal, difference)); with neither, the sighting is taken as
+// horizontal (100 gr) so that its distance is kept. A vertical sighting (sin V = 0) gets no distance, nor
+// a sighting of no length an angle.
+void SlopeFromHorizontal(double horizontal, double heightDifference, double& zenith, double& slope);
+
 } // namespace pyr

@@ -9,7 +9,6 @@
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectGeodimRecords.h"
 #include "fieldbook/LectGeodimTexts.h"
-#include "fieldbook/LectWildTexts.h"
 #include "geobase/Carnet.h"
 #include "geobase/Matricule.h"
 #include "ui/PyrTxtWnd.h"
@@ -21,8 +20,6 @@
 namespace pyr {
 
 namespace {
-
-namespace shared = gsi::msg;
 
 // The labels of a GDM field book that the reader uses.
 enum Label : int {
@@ -59,31 +56,17 @@ enum Label : int {
 // Labels are numbers of at most four digits.
 constexpr std::size_t kLabelCount = 10000;
 
-// A zenith angle this close to 0 or 200 gr gives no horizontal distance to divide by.
-constexpr double kVerticalSine = 1e-9;
-constexpr double kHorizontalSighting = 100.0; // gr
-constexpr double kHalfCircle = 200.0;         // gr
-constexpr double kFullCircle = 400.0;         // gr
+constexpr double kHalfCircle = 200.0; // gr
+constexpr double kFullCircle = 400.0; // gr
 
 const char* HeaderLabel(int label) {
-    static constexpr const char* kJobLabels[] = {gdm::msg::kLabelJob,        gdm::msg::kLabelDate,
-                                                 gdm::msg::kLabelTime,       gdm::msg::kLabelOperator,
-                                                 gdm::msg::kLabelProject,    gdm::msg::kLabelInstrument,
-                                                 gdm::msg::kLabelTemperature};
+    static constexpr const char* kJobLabels[] = {
+        fb::kLabelJob,           fb::kLabelDate,       gdm::msg::kLabelTime, gdm::msg::kLabelOperator,
+        gdm::msg::kLabelProject, fb::kLabelInstrument, fb::kLabelTemperature};
     if (label == kInformation) return gdm::msg::kLabelInformation;
     if (label == kData) return gdm::msg::kLabelData;
     if (label >= kJob && label <= kTemperature) return kJobLabels[label - kJob];
     return nullptr;
-}
-
-bool Contains(const std::vector<std::string>& words, std::string_view word) {
-    for (const std::string& candidate : words)
-        if (EqualIgnoringCase(candidate, word)) return true;
-    return false;
-}
-
-bool IsOn(const std::string& value) {
-    return value == "1" || EqualIgnoringCase(value, "oui");
 }
 
 // The unit digits of label 23: the first the angles, the second the distances (then the temperature and
@@ -136,12 +119,7 @@ bool CLectGeodim::Block::HasObservation() const {
 // ---- Settings and state ----------------------------------------------------------------------------------
 
 void CLectGeodim::ReadSettings() {
-    const CParamDriver* driver = Driver();
-    m_angles = driver ? driver->Angles() : AngleUnit::Grads;
-    m_distances = driver ? driver->Distances() : DistanceUnit::Metres;
-    m_marking = driver ? driver->References() : ReferenceMarking::None;
-    m_referenceCodes = driver ? driver->ReferenceCodes() : std::vector<std::string>{};
-    m_keepComputed = driver && IsOn(driver->Text(kKeyPointsCalcules));
+    m_settings = ReadInstrumentSettings(Driver());
 }
 
 void CLectGeodim::BeginReading() {
@@ -202,8 +180,7 @@ void CLectGeodim::EndReading() {
 // ---- Second pass: the blocks -----------------------------------------------------------------------------
 
 void CLectGeodim::ReadRecords(std::string_view records) {
-    if (!Path().empty())
-        AddHeaderComment(gdm::msg::kLabelFile, std::filesystem::path(Path()).filename().string());
+    if (!Path().empty()) AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
     ForEachLine(records, [&](std::string_view line, int) {
         int number = 0;
         gdm::Record record;
@@ -214,7 +191,8 @@ void CLectGeodim::ReadRecords(std::string_view records) {
 
 bool CLectGeodim::ReadAngle(int number, int label, std::string_view value, double& grads) {
     double angle = 0.0;
-    const bool read = m_angles == AngleUnit::Dms ? DmsTextToDegrees(value, angle) : ParseDouble(value, angle);
+    const bool read =
+        m_settings.angles == AngleUnit::Dms ? DmsTextToDegrees(value, angle) : ParseDouble(value, angle);
     if (!read || !std::isfinite(angle)) {
         if (TextWindow())
             TextWindow()->Print(
@@ -222,7 +200,8 @@ bool CLectGeodim::ReadAngle(int number, int label, std::string_view value, doubl
                 Sprintf("%d=%.*s", label, static_cast<int>(value.size()), value.data()).c_str());
         return false;
     }
-    grads = m_angles == AngleUnit::Dms ? ToGrads(angle, AngleUnit::Degrees) : ToGrads(angle, m_angles);
+    grads = m_settings.angles == AngleUnit::Dms ? ToGrads(angle, AngleUnit::Degrees)
+                                                : ToGrads(angle, m_settings.angles);
     return true;
 }
 
@@ -235,15 +214,15 @@ bool CLectGeodim::ReadLength(int number, int label, std::string_view value, doub
                 Sprintf("%d=%.*s", label, static_cast<int>(value.size()), value.data()).c_str());
         return false;
     }
-    metres = ToMetres(length, m_distances);
+    metres = ToMetres(length, m_settings.distances);
     return true;
 }
 
 void CLectGeodim::ReadUnits(int number, std::string_view value) {
-    if (!UnitsFromDigits(value, m_angles, m_distances)) {
+    if (!UnitsFromDigits(value, m_settings.angles, m_settings.distances)) {
         if (TextWindow()) TextWindow()->Print(gdm::msg::kBadUnits, number, std::string(value).c_str());
     }
-    Header(m_units, gdm::msg::kLabelUnits, value);
+    Header(m_units, fb::kLabelUnits, value);
 }
 
 void CLectGeodim::Header(std::string& last, const char* label, std::string_view value) {
@@ -332,10 +311,10 @@ void CLectGeodim::ReadRecord(int number, int label, std::string_view value) {
         ReadUnits(number, value);
         return;
     case kPpm:
-        Header(m_ppm, gdm::msg::kLabelPpm, std::string(value) + " ppm");
+        Header(m_ppm, fb::kLabelPpm, std::string(value) + " ppm");
         return;
     case kScaleFactor:
-        Header(m_scale, gdm::msg::kLabelScale, value);
+        Header(m_scale, fb::kLabelScale, value);
         return;
     case kReferenceAngle:
     case kCompensator:
@@ -375,13 +354,13 @@ void CLectGeodim::WriteStation() {
     AddCode(b.code, name);
     WritePosition(true);
     CStation* station = AddStation(std::string(name), b.hi);
-    if (!station) return LineError(shared::kRefused, b.number);
+    if (!station) return LineError(fb::kRefused, b.number);
     m_station = station;
     m_orientedOn.assign(FormMatView(b.orientedOn));
     m_firstSighting = true;
     // A backsight measured within the station's own block is a sighting of the point it is oriented on.
     if (!b.HasObservation()) return;
-    if (m_orientedOn.empty()) return LineMissing(b.number, shared::kDatumPoint);
+    if (m_orientedOn.empty()) return LineMissing(b.number, fb::kDatumPoint);
     m_block.name = m_orientedOn;
     m_block.code = {};
     m_block.east = m_block.north = m_block.elevation = kUndefined;
@@ -395,16 +374,15 @@ void CLectGeodim::WritePoint() {
     if (!b.HasObservation()) {
         AddCode(b.code, name);
         const bool located = IsKnown(b.east) || IsKnown(b.north) || IsKnown(b.elevation);
-        if (!located) return LineMissing(b.number, shared::kDatumContent);
+        if (!located) return LineMissing(b.number, fb::kDatumContent);
         WritePosition(true);
         return;
     }
     if (!m_station) {
-        m_station = AddStation(shared::kUnknownStation);
-        if (!m_station) return LineError(shared::kRefused, b.number);
+        m_station = AddStation(fb::kUnknownStation);
+        if (!m_station) return LineError(fb::kRefused, b.number);
         m_firstSighting = true;
-        if (TextWindow())
-            TextWindow()->Print(shared::kUnknownStationOpened, b.number, shared::kUnknownStation);
+        if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, b.number, fb::kUnknownStation);
     }
     AddCode(b.code, name);
 
@@ -423,31 +401,18 @@ void CLectGeodim::WritePoint() {
         WriteSighting(ah, av, !faceI);
     }
     m_firstSighting = false;
-    if (m_keepComputed) WritePosition(false);
+    if (m_settings.keepComputed) WritePosition(false);
 }
 
 void CLectGeodim::WriteSighting(double ah, double av, bool withDistances) {
     const Block& b = m_block;
     double di = withDistances ? b.slope : kUndefined;
-    if (withDistances && IsUndefined(di) && IsKnown(b.horizontal)) {
-        // The slope distance from the horizontal one: by the zenith angle, or with the height difference
-        // from the tilting axis to the target; alone, the sighting is taken as horizontal.
-        const double sine = IsKnown(av) ? std::fabs(SinGrads(av)) : 0.0;
-        if (sine > kVerticalSine) {
-            di = b.horizontal / sine;
-        } else if (IsUndefined(av) && IsKnown(b.heightDifference)) {
-            di = std::hypot(b.horizontal, b.heightDifference);
-            av = RadiansToGrads(std::atan2(b.horizontal, b.heightDifference));
-        } else if (IsUndefined(av)) {
-            av = kHorizontalSighting;
-            di = b.horizontal;
-        }
-    }
+    if (withDistances) SlopeFromHorizontal(b.horizontal, b.heightDifference, av, di);
     const std::string point(FormMatView(b.name));
     const bool reference = IsReference(point);
     const bool kept = reference ? AddReference(point, m_signalHeight, ah, av, di) != nullptr
                                 : AddMesure(point, m_signalHeight, ah, av, di) != nullptr;
-    if (!kept) LineError(shared::kRefused, b.number);
+    if (!kept) LineError(fb::kRefused, b.number);
 }
 
 // The block's coordinates as a point of its name: 38 the easting (X), 37 the northing (Y), whatever the
@@ -456,12 +421,12 @@ bool CLectGeodim::WritePosition(bool known) {
     const Block& b = m_block;
     if (IsUndefined(b.east) && IsUndefined(b.north) && IsUndefined(b.elevation)) return true;
     if (IsKnown(b.east) != IsKnown(b.north)) {
-        LineMissing(b.number, IsKnown(b.east) ? shared::kDatumNorth : shared::kDatumEast);
+        LineMissing(b.number, IsKnown(b.east) ? fb::kDatumNorth : fb::kDatumEast);
         return false;
     }
     CPointGen* point = AddPoint(std::string(FormMatView(b.name)), b.east, b.north, b.elevation);
     if (!point) {
-        LineError(shared::kRefused, b.number);
+        LineError(fb::kRefused, b.number);
         return false;
     }
     if (known && point->hasXY()) m_known.insert(point->mat());
@@ -471,15 +436,7 @@ bool CLectGeodim::WritePosition(bool known) {
 bool CLectGeodim::IsReference(std::string_view point) const {
     if (!m_orientedOn.empty() && point == m_orientedOn) return true;
     if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
-    switch (m_marking) {
-    case ReferenceMarking::First:
-        return m_firstSighting;
-    case ReferenceMarking::Codes:
-        return !m_block.code.empty() && Contains(m_referenceCodes, Trimmed(m_block.code));
-    case ReferenceMarking::None:
-        break;
-    }
-    return false;
+    return m_settings.MarksReference(m_firstSighting, Trimmed(m_block.code));
 }
 
 std::unique_ptr<CFieldBookReader> MakeGeodimReader() {

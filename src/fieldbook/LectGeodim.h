@@ -71,11 +71,7 @@ private:
     bool IsReference(std::string_view point) const;
 
     // ---- Settings of the format ("Geodim.ini"), then what the field book declares
-    AngleUnit m_angles = AngleUnit::Grads;
-    DistanceUnit m_distances = DistanceUnit::Metres;
-    ReferenceMarking m_marking = ReferenceMarking::None;
-    std::vector<std::string> m_referenceCodes;
-    bool m_keepComputed = false;
+    InstrumentSettings m_settings;
 
     // ---- The first pass: the records, one a line
     std::string m_records;

@@ -1,8 +1,8 @@
 #pragma once
 
 // What the reader of Trimble GDM (Geodimeter) label files writes in the text window and in the header
-// comments of a GéoBase, beside the texts it shares with the other readers (FieldBookTexts.h and the
-// names of the data in LectWildTexts.h). Those with %d or %s are printf formats; the line number first.
+// comments of a GéoBase, beside the texts it shares with the other readers (FieldBookTexts.h). Those with
+// %d or %s are printf formats; the line number first.
 namespace pyr::gdm::msg {
 
 inline constexpr const char* kUnknownLabel =
@@ -14,19 +14,11 @@ inline constexpr const char* kBadUnits =
 inline constexpr const char* kTemporaryUnwritable =
     "Attention : fichier temporaire <%s> impossible à écrire, le carnet est lu en mémoire.";
 
-// ---- Labels of the header comments
-inline constexpr const char* kLabelFile = "Fichier";
+// ---- Labels of the header comments (beside those of every reader, FieldBookTexts.h)
 inline constexpr const char* kLabelInformation = "Information";
 inline constexpr const char* kLabelData = "Données";
-inline constexpr const char* kLabelUnits = "Unités";
-inline constexpr const char* kLabelPpm = "Correction atmosphérique";
-inline constexpr const char* kLabelScale = "Facteur d'échelle";
-inline constexpr const char* kLabelJob = "Chantier";
-inline constexpr const char* kLabelDate = "Date";
 inline constexpr const char* kLabelTime = "Heure";
 inline constexpr const char* kLabelOperator = "Opérateur";
 inline constexpr const char* kLabelProject = "Projet";
-inline constexpr const char* kLabelInstrument = "Appareil";
-inline constexpr const char* kLabelTemperature = "Température";
 
 } // namespace pyr::gdm::msg

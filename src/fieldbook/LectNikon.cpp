@@ -35,22 +35,6 @@ bool IsNumber(std::string_view text) {
     return ParseDouble(text, value);
 }
 
-bool IsOn(const std::string& value) {
-    return value == "1" || EqualIgnoringCase(value, "oui");
-}
-
-bool Contains(const std::vector<std::string>& words, std::string_view word) {
-    for (const std::string& candidate : words)
-        if (EqualIgnoringCase(candidate, word)) return true;
-    return false;
-}
-
-bool IsAnyOf(std::string_view text, std::initializer_list<std::string_view> words) {
-    for (std::string_view word : words)
-        if (EqualIgnoringCase(text, word)) return true;
-    return false;
-}
-
 bool ContainsIgnoringCase(std::string_view text, std::string_view part) {
     for (std::size_t i = 0; i + part.size() <= text.size(); ++i)
         if (EqualIgnoringCase(text.substr(i, part.size()), part)) return true;
@@ -110,23 +94,8 @@ void CLectNikon::Split(std::string_view line, Fields& fields) {
 // ---- Settings and state ----------------------------------------------------------------------------------
 
 void CLectNikon::ReadSettings() {
-    const CParamDriver* driver = Driver();
+    m_settings = ReadInstrumentSettings(Driver());
     m_zeroAtZenith = true;
-    if (!driver) {
-        m_angles = AngleUnit::Grads;
-        m_distances = DistanceUnit::Metres;
-        m_order = CoordinateOrder::EastNorth;
-        m_marking = ReferenceMarking::None;
-        m_referenceCodes.clear();
-        m_keepComputed = false;
-        return;
-    }
-    m_angles = driver->Angles();
-    m_distances = driver->Distances();
-    m_order = driver->Order();
-    m_marking = driver->References();
-    m_referenceCodes = driver->ReferenceCodes();
-    m_keepComputed = IsOn(driver->Text(kKeyPointsCalcules));
 }
 
 void CLectNikon::BeginReading() {
@@ -143,9 +112,9 @@ void CLectNikon::Started(const char* format) {
     if (!m_started) {
         m_started = true;
         if (!Path().empty())
-            AddHeaderComment(nik::kLabelFile, std::filesystem::path(Path()).filename().string());
+            AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
     }
-    if (format) AddHeaderComment(nik::kLabelFormat, format);
+    if (format) AddHeaderComment(fb::kLabelFormat, format);
 }
 
 // ---- A line ----------------------------------------------------------------------------------------------
@@ -190,9 +159,9 @@ void CLectNikon::ReadLine(std::string_view line, int number) {
 void CLectNikon::ReadComment(std::string_view text, int number) {
     text = Trimmed(text);
     if (text.empty()) return;
-    if (ContainsIgnoringCase(text, "RAW data format")) return AddHeaderComment(nik::kLabelFormat, text);
+    if (ContainsIgnoringCase(text, "RAW data format")) return AddHeaderComment(fb::kLabelFormat, text);
     if (const std::size_t job = text.find("<JOB>"); job != std::string_view::npos) {
-        AddHeaderComment(nik::kLabelJob, Trimmed(text.substr(0, job)));
+        AddHeaderComment(fb::kLabelJob, Trimmed(text.substr(0, job)));
         std::string_view created = Trimmed(text.substr(job + 5));
         if (created.starts_with("Created")) created = Trimmed(created.substr(7));
         if (!created.empty()) AddHeaderComment(nik::kLabelCreated, created);
@@ -217,23 +186,23 @@ bool CLectNikon::ReadDeclaration(std::string_view key, std::string_view value, i
     };
     const char* label = nullptr;
     if (EqualIgnoringCase(key, "Dist Units")) {
-        label = nik::kLabelDistances;
+        label = fb::kLabelDistances;
         if (ContainsIgnoringCase(value, "feet") || ContainsIgnoringCase(value, "ft"))
-            m_distances = DistanceUnit::Feet;
+            m_settings.distances = DistanceUnit::Feet;
         else if (ContainsIgnoringCase(value, "met"))
-            m_distances = DistanceUnit::Metres;
+            m_settings.distances = DistanceUnit::Metres;
         else
             unknown();
     } else if (EqualIgnoringCase(key, "Angle Units")) {
-        label = nik::kLabelAngles;
+        label = fb::kLabelAngles;
         if (IsAnyOf(value, {"DDDMMSS", "DMS", "DDD.MMSS"}))
-            m_angles = AngleUnit::Dms;
+            m_settings.angles = AngleUnit::Dms;
         else if (IsAnyOf(value, {"Gons", "Gon", "Grads", "Grades"}))
-            m_angles = AngleUnit::Grads;
+            m_settings.angles = AngleUnit::Grads;
         else if (IsAnyOf(value, {"Dec.Degrees", "Dec. Degrees", "Degrees", "Decimal Degrees"}))
-            m_angles = AngleUnit::Degrees;
+            m_settings.angles = AngleUnit::Degrees;
         else if (IsAnyOf(value, {"Mils", "Mil"}))
-            m_angles = AngleUnit::Mils;
+            m_settings.angles = AngleUnit::Mils;
         else
             unknown();
     } else if (EqualIgnoringCase(key, "Zero VA")) {
@@ -247,9 +216,9 @@ bool CLectNikon::ReadDeclaration(std::string_view key, std::string_view value, i
     } else if (EqualIgnoringCase(key, "Coord Order")) {
         label = nik::kLabelOrder;
         if (IsAnyOf(value, {"NEZ", "NE"}))
-            m_order = CoordinateOrder::NorthEast;
+            m_settings.order = CoordinateOrder::NorthEast;
         else if (IsAnyOf(value, {"ENZ", "EN"}))
-            m_order = CoordinateOrder::EastNorth;
+            m_settings.order = CoordinateOrder::EastNorth;
         else
             unknown();
     } else if (EqualIgnoringCase(key, "Zero azimuth")) {
@@ -257,9 +226,9 @@ bool CLectNikon::ReadDeclaration(std::string_view key, std::string_view value, i
     } else if (EqualIgnoringCase(key, "HA Raw data")) {
         label = nik::kLabelRawHA;
     } else if (EqualIgnoringCase(key, "Instrument")) {
-        label = nik::kLabelInstrument;
+        label = fb::kLabelInstrument;
     } else if (EqualIgnoringCase(key, "Software")) {
-        label = nik::kLabelSoftware;
+        label = fb::kLabelSoftware;
     } else if (EqualIgnoringCase(key, "Description")) {
         label = nik::kLabelDescription;
     } else if (EqualIgnoringCase(key, "Client")) {
@@ -284,12 +253,13 @@ void CLectNikon::ReadCoordinates(int number) {
     const bool idPlace = f.count >= 7 || (f.count == 6 && !IsNumber(f[2]));
     const std::size_t first = idPlace ? 3 : 2;
     const std::string_view name = PointOf(f[1], idPlace ? f[2] : std::string_view());
-    if (name.empty()) return LineMissing(number, nik::kDatumPoint);
+    if (name.empty()) return LineMissing(number, fb::kDatumPoint);
     // The coordinates that the instrument computed are kept only when the settings ask for them.
-    if (EqualIgnoringCase(f[0], "CC") && !m_keepComputed) return;
+    if (EqualIgnoringCase(f[0], "CC") && !m_settings.keepComputed) return;
     double a = kUndefined, b = kUndefined, z = kUndefined;
-    if (!Length(f[first], m_distances, a, number) || !Length(f[first + 1], m_distances, b, number) ||
-        !Length(f[first + 2], m_distances, z, number))
+    if (!Length(f[first], m_settings.distances, a, number) ||
+        !Length(f[first + 1], m_settings.distances, b, number) ||
+        !Length(f[first + 2], m_settings.distances, z, number))
         return;
     AddPosition(name, a, b, z, f[first + 3], number);
 }
@@ -303,8 +273,9 @@ void CLectNikon::ReadStation(int number) {
     const std::string_view backsight = idPlaces ? PointOf(f[3], f[4]) : PointOf(f[2], std::string_view());
     const std::size_t hiAt = idPlaces ? 5 : 3;
     double hi = kUndefined, azimuth = kUndefined, reading = kUndefined;
-    if (!Length(f[hiAt], m_distances, hi, number) || !Angle(f[hiAt + 1], m_angles, azimuth, number) ||
-        !Angle(f[hiAt + 2], m_angles, reading, number))
+    if (!Length(f[hiAt], m_settings.distances, hi, number) ||
+        !Angle(f[hiAt + 1], m_settings.angles, azimuth, number) ||
+        !Angle(f[hiAt + 2], m_settings.angles, reading, number))
         return;
     if (!OpenStation(name, hi, number)) return;
     m_backsight.assign(backsight);
@@ -337,12 +308,13 @@ void CLectNikon::ReadShot(int number, bool backsight) {
     const std::size_t first = idPlace ? 3 : 2;
     std::string_view point = PointOf(f[1], idPlace ? f[2] : std::string_view());
     if (point.empty() && backsight) point = m_backsight;
-    if (point.empty()) return LineMissing(number, nik::kDatumPoint);
-    if (!m_hasStation) return LineError(nik::kNoStationForSighting, number);
+    if (point.empty()) return LineMissing(number, fb::kDatumPoint);
+    if (!m_hasStation) return LineError(fb::kNoStationForSighting, number);
     double hp = kUndefined, di = kUndefined, ah = kUndefined, av = kUndefined;
-    if (!Length(f[first], m_distances, hp, number) || !Length(f[first + 1], m_distances, di, number) ||
-        !Angle(f[first + 2], m_angles, ah, number) ||
-        !Zenith(f[first + 3], m_angles, m_zeroAtZenith, av, number))
+    if (!Length(f[first], m_settings.distances, hp, number) ||
+        !Length(f[first + 1], m_settings.distances, di, number) ||
+        !Angle(f[first + 2], m_settings.angles, ah, number) ||
+        !Zenith(f[first + 3], m_settings.angles, m_zeroAtZenith, av, number))
         return;
     if (IsUndefined(di) && IsUndefined(ah) && IsUndefined(av))
         return LineMissing(number, nik::kDatumObservation);
@@ -361,8 +333,8 @@ void CLectNikon::ReadDtm(int number) {
         if (TextWindow()) TextWindow()->Print(nik::kBadType, number, std::string(f[1]).c_str());
         return;
     }
-    AngleUnit angles = m_angles;
-    DistanceUnit distances = m_distances;
+    AngleUnit angles = m_settings.angles;
+    DistanceUnit distances = m_settings.distances;
     const std::string_view units = f[2];
     if (!units.empty()) {
         const char d = units.size() == 2 ? units[0] : '?';
@@ -377,7 +349,7 @@ void CLectNikon::ReadDtm(int number) {
     std::string_view id, heightText;
     const bool station = SplitHeight(f[3], id, heightText);
     const std::string_view name = FormMatView(id);
-    if (name.empty()) return LineMissing(number, station ? nik::kDatumStation : nik::kDatumPoint);
+    if (name.empty()) return LineMissing(number, station ? fb::kDatumStation : fb::kDatumPoint);
     double hi = kUndefined;
     if (station && !Length(heightText, distances, hi, number)) return;
 
@@ -386,7 +358,7 @@ void CLectNikon::ReadDtm(int number) {
             OpenStation(name, hi, number);
             return;
         }
-        if (!m_hasStation) return LineError(nik::kNoStationForSighting, number);
+        if (!m_hasStation) return LineError(fb::kNoStationForSighting, number);
         double di = kUndefined, ah = kUndefined, av = kUndefined, hp = kUndefined;
         if (!Length(f[4], distances, di, number) || !Angle(f[5], angles, ah, number) ||
             !Zenith(f[6], angles, true, av, number) || !Length(f[7], distances, hp, number))
@@ -403,7 +375,7 @@ void CLectNikon::ReadDtm(int number) {
     if (IsKnown(a) || IsKnown(b) || IsKnown(z)) {
         if (!AddPosition(name, a, b, z, {}, number)) return;
     } else if (!station) {
-        return LineMissing(number, nik::kDatumCoordinates);
+        return LineMissing(number, fb::kDatumCoordinates);
     }
     if (station) OpenStation(name, hi, number);
 }
@@ -450,12 +422,12 @@ bool CLectNikon::Zenith(std::string_view text, AngleUnit unit, bool fromZenith, 
 
 bool CLectNikon::OpenStation(std::string_view name, double hi, int number) {
     if (name.empty()) {
-        LineMissing(number, nik::kDatumStation);
+        LineMissing(number, fb::kDatumStation);
         return false;
     }
     CStation* station = AddStation(std::string(name), hi);
     if (!station) {
-        LineError(nik::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
     m_hasStation = true;
@@ -470,19 +442,19 @@ bool CLectNikon::OpenStation(std::string_view name, double hi, int number) {
 bool CLectNikon::AddPosition(std::string_view name, double first, double second, double elevation,
                              std::string_view code, int number) {
     if (IsUndefined(first) && IsUndefined(second) && IsUndefined(elevation)) {
-        LineMissing(number, nik::kDatumCoordinates);
+        LineMissing(number, fb::kDatumCoordinates);
         return false;
     }
     if (IsKnown(first) != IsKnown(second)) {
-        const bool northMissing = IsKnown(first) == (m_order == CoordinateOrder::EastNorth);
-        LineMissing(number, northMissing ? nik::kDatumNorth : nik::kDatumEast);
+        const bool northMissing = IsKnown(first) == (m_settings.order == CoordinateOrder::EastNorth);
+        LineMissing(number, northMissing ? fb::kDatumNorth : fb::kDatumEast);
         return false;
     }
-    const bool swap = m_order == CoordinateOrder::NorthEast;
+    const bool swap = m_settings.order == CoordinateOrder::NorthEast;
     AddCode(code, name);
     CPointGen* point = AddPoint(std::string(name), swap ? second : first, swap ? first : second, elevation);
     if (!point) {
-        LineError(nik::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
     if (point->hasXY()) m_known.insert(point->mat());
@@ -495,7 +467,7 @@ void CLectNikon::AddSighting(std::string_view point, bool reference, double hp, 
     CVisee* sighting = reference ? static_cast<CVisee*>(AddReference(std::string(point), hp, ah, av, di))
                                  : static_cast<CVisee*>(AddMesure(std::string(point), hp, ah, av, di));
     m_firstSighting = false;
-    if (!sighting) LineError(nik::kRefused, number);
+    if (!sighting) LineError(fb::kRefused, number);
 }
 
 // A sighting that the field book does not mark as a backsight is a reference when its point was given
@@ -503,15 +475,7 @@ void CLectNikon::AddSighting(std::string_view point, bool reference, double hp, 
 // "CodesReference").
 bool CLectNikon::IsReference(std::string_view point, std::string_view code) const {
     if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
-    switch (m_marking) {
-    case ReferenceMarking::First:
-        return m_firstSighting;
-    case ReferenceMarking::Codes:
-        return !code.empty() && Contains(m_referenceCodes, code);
-    case ReferenceMarking::None:
-        break;
-    }
-    return false;
+    return m_settings.MarksReference(m_firstSighting, code);
 }
 
 } // namespace pyr

@@ -71,13 +71,8 @@ private:
     bool IsReference(std::string_view point, std::string_view code) const;
 
     // ---- Settings of the parameter file, then what the field book declares
-    AngleUnit m_angles = AngleUnit::Grads;
-    DistanceUnit m_distances = DistanceUnit::Metres;
-    CoordinateOrder m_order = CoordinateOrder::EastNorth;
+    InstrumentSettings m_settings;
     bool m_zeroAtZenith = true; // vertical angles read from the zenith (else from the horizon)
-    ReferenceMarking m_marking = ReferenceMarking::None;
-    std::vector<std::string> m_referenceCodes;
-    bool m_keepComputed = false;
 
     // ---- The line being read
     Fields m_fields;

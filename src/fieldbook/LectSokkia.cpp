@@ -68,12 +68,6 @@ bool IsDate(std::string_view date) {
     return false;
 }
 
-bool Contains(const std::vector<std::string>& words, std::string_view word) {
-    for (const std::string& candidate : words)
-        if (EqualIgnoringCase(candidate, word)) return true;
-    return false;
-}
-
 } // namespace
 
 std::unique_ptr<CFieldBookReader> MakeSokkiaReader() {
@@ -86,24 +80,8 @@ void CLectSokkia::ReadSettings() {
     m_zenith = true;
     m_variant = sdr::Variant::Sdr33;
     m_variantKnown = false;
-    const CParamDriver* driver = Driver();
-    if (!driver) {
-        // What an SDR collector writes when nothing says otherwise.
-        m_angles = AngleUnit::Grads;
-        m_distances = DistanceUnit::Metres;
-        m_order = CoordinateOrder::NorthEast;
-        m_marking = ReferenceMarking::None;
-        m_referenceCodes.clear();
-        m_keepComputed = false;
-        return;
-    }
-    m_angles = driver->Angles();
-    m_distances = driver->Distances();
-    m_order = driver->Order();
-    m_marking = driver->References();
-    m_referenceCodes = driver->ReferenceCodes();
-    const std::string& computed = driver->Text(kKeyPointsCalcules);
-    m_keepComputed = computed == "1" || EqualIgnoringCase(computed, "oui");
+    // Without a parameter set, what an SDR collector writes when nothing says otherwise.
+    m_settings = ReadInstrumentSettings(Driver(), CoordinateOrder::NorthEast);
 }
 
 void CLectSokkia::BeginReading() {
@@ -158,14 +136,13 @@ void CLectSokkia::CheckFrame(std::string_view checksum, int number) {
 void CLectSokkia::HeaderOnce() {
     if (m_started) return;
     m_started = true;
-    if (!Path().empty())
-        AddHeaderComment(text::kLabelFile, std::filesystem::path(Path()).filename().string());
+    if (!Path().empty()) AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
 }
 
 void CLectSokkia::SetVariant(sdr::Variant variant) {
     m_variant = variant;
     m_variantKnown = true;
-    AddHeaderComment(text::kLabelFormat, variant == sdr::Variant::Sdr33 ? text::kSdr33 : text::kSdr2x);
+    AddHeaderComment(fb::kLabelFormat, variant == sdr::Variant::Sdr33 ? text::kSdr33 : text::kSdr2x);
 }
 
 void CLectSokkia::ReadRecord(std::string_view line, int number) {
@@ -200,7 +177,7 @@ void CLectSokkia::ReadRecord(std::string_view line, int number) {
     if (type == "04" || type == "05" || type == "06") return ReadConstants(type, content);
     if (type == "10") {
         const std::string_view job = sdr::Column(content, 5, kJobWidth);
-        if (!job.empty()) AddHeaderComment(text::kLabelJob, job);
+        if (!job.empty()) AddHeaderComment(fb::kLabelJob, job);
         return;
     }
     LineUnrecognised(number);
@@ -216,7 +193,7 @@ void CLectSokkia::ReadHeader(std::string_view line, int number) {
         if (!m_variantKnown && version.starts_with("SDR3")) SetVariant(sdr::Variant::Sdr33);
     }
     const std::string_view date = sdr::Column(line, kDateColumn, kDateWidth);
-    if (IsDate(date)) AddHeaderComment(text::kLabelDate, date);
+    if (IsDate(date)) AddHeaderComment(fb::kLabelDate, date);
 
     const auto unknown = [&](char code, const char* what) {
         if (code != ' ' && TextWindow()) TextWindow()->Print(text::kUnknownUnit, number, code, what);
@@ -224,31 +201,31 @@ void CLectSokkia::ReadHeader(std::string_view line, int number) {
     const char angles = At(line, kAngleUnitIndex);
     switch (angles) {
     case '1':
-        m_angles = AngleUnit::Degrees;
-        AddHeaderComment(text::kLabelAngles, text::kDegrees);
+        m_settings.angles = AngleUnit::Degrees;
+        AddHeaderComment(fb::kLabelAngles, fb::kDegrees);
         break;
     case '2':
-        m_angles = AngleUnit::Grads;
-        AddHeaderComment(text::kLabelAngles, text::kGrads);
+        m_settings.angles = AngleUnit::Grads;
+        AddHeaderComment(fb::kLabelAngles, fb::kGrads);
         break;
     case '3': // mils are 3 on some collectors, 4 on others
     case '4':
-        m_angles = AngleUnit::Mils;
-        AddHeaderComment(text::kLabelAngles, Sprintf(text::kMils, angles));
+        m_settings.angles = AngleUnit::Mils;
+        AddHeaderComment(fb::kLabelAngles, Sprintf(text::kMils, angles));
         break;
     default:
         unknown(angles, text::kWhatAngles);
     }
     const char distances = At(line, kDistanceUnitIndex);
     if (distances == '1' || distances == '2') {
-        m_distances = distances == '1' ? DistanceUnit::Metres : DistanceUnit::Feet;
-        AddHeaderComment(text::kLabelDistances, distances == '1' ? text::kMetres : text::kFeet);
+        m_settings.distances = distances == '1' ? DistanceUnit::Metres : DistanceUnit::Feet;
+        AddHeaderComment(fb::kLabelDistances, distances == '1' ? fb::kMetres : fb::kFeet);
     } else {
         unknown(distances, text::kWhatDistances);
     }
     const char order = At(line, kOrderIndex);
     if (order == '1' || order == '2') {
-        m_order = order == '1' ? CoordinateOrder::NorthEast : CoordinateOrder::EastNorth;
+        m_settings.order = order == '1' ? CoordinateOrder::NorthEast : CoordinateOrder::EastNorth;
         AddHeaderComment(text::kLabelOrder, order == '1' ? text::kNorthEast : text::kEastNorth);
     } else {
         unknown(order, text::kWhatOrder);
@@ -264,8 +241,8 @@ void CLectSokkia::ReadInstrument(std::string_view line) {
     if (!edm.empty() && edm != model) models += (models.empty() ? "" : " / ") + std::string(edm);
     if (!edmSerial.empty() && edmSerial != serial)
         serials += (serials.empty() ? "" : " / ") + std::string(edmSerial);
-    if (!models.empty()) AddHeaderComment(text::kLabelInstrument, models);
-    if (!serials.empty()) AddHeaderComment(text::kLabelSerial, serials);
+    if (!models.empty()) AddHeaderComment(fb::kLabelInstrument, models);
+    if (!serials.empty()) AddHeaderComment(fb::kLabelSerial, serials);
     const char zero = At(line, kZeroVerticalIndex);
     if (zero == '1' || zero == '2') {
         m_zenith = zero == '1';
@@ -274,15 +251,15 @@ void CLectSokkia::ReadInstrument(std::string_view line) {
     // Three constants follow; the prism constant is the last, kept as the instrument wrote it.
     const int width = m_variant == sdr::Variant::Sdr33 ? 16 : 10;
     const std::string_view prism = sdr::Column(line, kConstantsColumn + 2 * width, width);
-    if (!prism.empty()) AddHeaderComment(text::kLabelPrism, prism);
+    if (!prism.empty()) AddHeaderComment(fb::kLabelPrism, prism);
 }
 
 void CLectSokkia::ReadConstants(std::string_view type, std::string_view line) {
     const std::string values = Words(line.substr(std::min<std::size_t>(4, line.size())));
     if (values.empty()) return;
     const char* label = type == "04"   ? text::kLabelCollimation
-                        : type == "05" ? text::kLabelAtmosphere
-                                       : text::kLabelScale;
+                        : type == "05" ? fb::kLabelAtmosphere
+                                       : fb::kLabelScale;
     AddHeaderComment(label, values);
 }
 
@@ -300,13 +277,13 @@ bool CLectSokkia::Real(int field, double& value, int number) {
 
 bool CLectSokkia::Length(int field, double& metres, int number) {
     if (!Real(field, metres, number)) return false;
-    if (IsKnown(metres)) metres = ToMetres(metres, m_distances);
+    if (IsKnown(metres)) metres = ToMetres(metres, m_settings.distances);
     return true;
 }
 
 bool CLectSokkia::Angle(int field, double& grads, int number) {
     if (!Real(field, grads, number)) return false;
-    if (IsKnown(grads)) grads = ToGrads(grads, m_angles);
+    if (IsKnown(grads)) grads = ToGrads(grads, m_settings.angles);
     return true;
 }
 
@@ -316,9 +293,9 @@ bool CLectSokkia::Position(int first, double& x, double& y, double& z, int numbe
     double a = kUndefined, b = kUndefined;
     if (!Length(first, a, number) || !Length(first + 1, b, number) || !Length(first + 2, z, number))
         return false;
-    const bool northFirst = m_order == CoordinateOrder::NorthEast;
+    const bool northFirst = m_settings.order == CoordinateOrder::NorthEast;
     if (IsKnown(a) != IsKnown(b)) {
-        LineMissing(number, IsKnown(a) == northFirst ? text::kDatumEast : text::kDatumNorth);
+        LineMissing(number, IsKnown(a) == northFirst ? fb::kDatumEast : fb::kDatumNorth);
         return false;
     }
     x = northFirst ? b : a;
@@ -335,7 +312,7 @@ bool CLectSokkia::OpenStation(std::string_view name, double hi, int number) {
     m_firstSighting = true;
     m_azimuthWarned = false;
     m_backsight = {};
-    if (!station) LineError(text::kRefused, number);
+    if (!station) LineError(fb::kRefused, number);
     return station != nullptr;
 }
 
@@ -358,7 +335,7 @@ bool CLectSokkia::StationFor(std::string_view from, int number) {
     const std::string_view name = FormMatView(from);
     if (name.empty() || (m_station && name == m_stationName)) {
         if (m_station) return true;
-        LineError(text::kNoStation, number);
+        LineError(fb::kNoStationForSighting, number);
         return false;
     }
     CloseStation();
@@ -368,13 +345,13 @@ bool CLectSokkia::StationFor(std::string_view from, int number) {
 
 void CLectSokkia::ReadStation(int number) {
     const std::string_view name = FormMatView(m_fields[0]);
-    if (name.empty()) return LineMissing(number, text::kDatumStation);
+    if (name.empty()) return LineMissing(number, fb::kDatumStation);
     double x = kUndefined, y = kUndefined, z = kUndefined, hi = kUndefined;
     if (!Position(1, x, y, z, number) || !Length(4, hi, number)) return;
     CloseStation();
     AddCode(m_fields[5], name);
     if ((IsKnown(x) || IsKnown(z)) && !AddPoint(std::string(name), x, y, z))
-        return LineError(text::kRefused, number);
+        return LineError(fb::kRefused, number);
     OpenStation(name, hi, number);
 }
 
@@ -405,27 +382,19 @@ void CLectSokkia::ReadCoordinates(int number) {
     const std::string_view name = FormMatView(m_fields[0]);
     const bool computed = !name.empty() && name == m_lastSighted;
     m_lastSighted.clear();
-    if (name.empty()) return LineMissing(number, text::kDatumPoint);
+    if (name.empty()) return LineMissing(number, fb::kDatumPoint);
     // The coordinates that the collector computed from the observation just before.
-    if (computed && !m_keepComputed) return;
+    if (computed && !m_settings.keepComputed) return;
     double x = kUndefined, y = kUndefined, z = kUndefined;
     if (!Position(1, x, y, z, number)) return;
-    if (IsUndefined(x) && IsUndefined(z)) return LineMissing(number, text::kDatumCoordinates);
+    if (IsUndefined(x) && IsUndefined(z)) return LineMissing(number, fb::kDatumCoordinates);
     AddCode(m_fields[4], name);
-    if (!AddPoint(std::string(name), x, y, z)) LineError(text::kRefused, number);
+    if (!AddPoint(std::string(name), x, y, z)) LineError(fb::kRefused, number);
 }
 
 bool CLectSokkia::IsReference(std::string_view point, std::string_view code) const {
     if (!m_backsight.point.empty() && point == m_backsight.point) return true;
-    switch (m_marking) {
-    case ReferenceMarking::First:
-        return m_firstSighting;
-    case ReferenceMarking::Codes:
-        return !code.empty() && Contains(m_referenceCodes, code);
-    case ReferenceMarking::None:
-        break;
-    }
-    return false;
+    return m_settings.MarksReference(m_firstSighting, code);
 }
 
 void CLectSokkia::ReadObservation(std::string_view derivation, int number) {
@@ -455,7 +424,7 @@ void CLectSokkia::ReadObservation(std::string_view derivation, int number) {
                                  : AddMesure(std::string(point), m_targetHeight, ah, av, di) != nullptr;
     m_firstSighting = false;
     m_lastSighted.assign(point);
-    if (!added) return LineError(text::kRefused, number);
+    if (!added) return LineError(fb::kRefused, number);
     if (reference && point == m_backsight.point) m_backsight.sighted = true;
 }
 

@@ -64,12 +64,7 @@ private:
     bool IsReference(std::string_view point, std::string_view code) const;
 
     // ---- Settings ("Sokkia.ini"), and what the header of the field book says instead
-    AngleUnit m_angles = AngleUnit::Grads;
-    DistanceUnit m_distances = DistanceUnit::Metres;
-    CoordinateOrder m_order = CoordinateOrder::NorthEast;
-    ReferenceMarking m_marking = ReferenceMarking::None;
-    std::vector<std::string> m_referenceCodes;
-    bool m_keepComputed = false;
+    InstrumentSettings m_settings;
     bool m_zenith = true; // vertical angles from the zenith (else from the horizon)
     sdr::Variant m_variant = sdr::Variant::Sdr33;
     bool m_variantKnown = false;

@@ -5,19 +5,10 @@
 namespace pyr::sdr::msg {
 
 // ---- Names of the data, for "Erreur ligne %d : donnée manquante pour %s !"
-inline constexpr const char* kDatumStation = "le nom de la station";
-inline constexpr const char* kDatumPoint = "le matricule du point";
 inline constexpr const char* kDatumTarget = "le matricule du point visé";
 inline constexpr const char* kDatumBacksight = "le point de référence";
 inline constexpr const char* kDatumHeight = "la hauteur de prisme";
 inline constexpr const char* kDatumObservations = "les observations";
-inline constexpr const char* kDatumCoordinates = "les coordonnées du point";
-inline constexpr const char* kDatumEast = "la coordonnée Est";
-inline constexpr const char* kDatumNorth = "la coordonnée Nord";
-
-// ---- Lines skipped
-inline constexpr const char* kRefused = "Erreur ligne %d : donnée refusée par les contrôles de la GéoBase !";
-inline constexpr const char* kNoStation = "Erreur ligne %d : pas de station pour cette visée !";
 
 // ---- Lines read, with something to say
 inline constexpr const char* kStationOpened =
@@ -35,30 +26,15 @@ inline constexpr const char* kBadChecksum =
     "Attention : ligne %d : la somme de contrôle %s ne correspond pas aux données reçues ; vérifiez le "
     "transfert du carnet.";
 
-// ---- Labels and values of the header comments
-inline constexpr const char* kLabelFile = "Fichier";
-inline constexpr const char* kLabelFormat = "Format";
+// ---- Labels and values of the header comments (beside those of every reader, FieldBookTexts.h)
 inline constexpr const char* kLabelVersion = "Version";
-inline constexpr const char* kLabelDate = "Date";
-inline constexpr const char* kLabelJob = "Chantier";
-inline constexpr const char* kLabelAngles = "Unité des angles";
-inline constexpr const char* kLabelDistances = "Unité des distances";
 inline constexpr const char* kLabelOrder = "Ordre des coordonnées";
-inline constexpr const char* kLabelInstrument = "Appareil";
-inline constexpr const char* kLabelSerial = "Numéro de série";
 inline constexpr const char* kLabelVertical = "Angle vertical";
-inline constexpr const char* kLabelPrism = "Constante de prisme";
 inline constexpr const char* kLabelCollimation = "Collimation";
-inline constexpr const char* kLabelAtmosphere = "Atmosphère";
-inline constexpr const char* kLabelScale = "Facteur d'échelle";
 inline constexpr const char* kLabelAzimuth = "Gisement de référence";
 inline constexpr const char* kSdr2x = "SDR2x";
 inline constexpr const char* kSdr33 = "SDR33";
-inline constexpr const char* kDegrees = "degrés décimaux";
-inline constexpr const char* kGrads = "grades";
 inline constexpr const char* kMils = "millièmes (6400 au tour, code %c)";
-inline constexpr const char* kMetres = "mètres";
-inline constexpr const char* kFeet = "pieds";
 inline constexpr const char* kNorthEast = "N-E-Z";
 inline constexpr const char* kEastNorth = "E-N-Z";
 inline constexpr const char* kZenith = "zénithal";

@@ -23,11 +23,6 @@ namespace text = topcon::msg;
 // infinities and NaN that a number reader would otherwise let through.
 constexpr double kLargestValue = 1e9;
 constexpr double kDegreesToGrads = 400.0 / 360.0;
-constexpr double kHorizontalSighting = 100.0; // gr
-
-bool IsOn(const std::string& value) {
-    return value == "1" || EqualIgnoringCase(value, "oui");
-}
 
 char UpperInitial(std::string_view field) {
     const char c = field.empty() ? '\0' : field.front();
@@ -37,21 +32,15 @@ char UpperInitial(std::string_view field) {
 const char* AngleUnitName(AngleUnit unit) {
     switch (unit) {
     case AngleUnit::Grads:
-        return text::kGrads;
+        return fb::kGrads;
     case AngleUnit::Dms:
         return text::kDms;
     case AngleUnit::Degrees:
-        return text::kDegrees;
+        return fb::kDegrees;
     case AngleUnit::Mils:
         return text::kMils;
     }
-    return text::kGrads;
-}
-
-bool Contains(const std::vector<std::string>& words, std::string_view word) {
-    for (const std::string& candidate : words)
-        if (EqualIgnoringCase(candidate, word)) return true;
-    return false;
+    return fb::kGrads;
 }
 
 } // namespace
@@ -67,13 +56,7 @@ std::string CLectTopcon::OpenFailure(const std::string& path) const {
 // ---- Settings and state ----------------------------------------------------------------------------------
 
 void CLectTopcon::ReadSettings() {
-    const CParamDriver* driver = Driver();
-    m_angles = driver ? driver->Angles() : AngleUnit::Grads;
-    m_lengths = driver ? driver->Distances() : DistanceUnit::Metres;
-    m_order = driver ? driver->Order() : CoordinateOrder::EastNorth;
-    m_marking = driver ? driver->References() : ReferenceMarking::None;
-    m_referenceCodes = driver ? driver->ReferenceCodes() : std::vector<std::string>{};
-    m_keepComputed = driver && IsOn(driver->Text(kKeyPointsCalcules));
+    m_settings = ReadInstrumentSettings(Driver());
 }
 
 void CLectTopcon::BeginReading() {
@@ -112,7 +95,7 @@ void CLectTopcon::ReadLine(std::string_view line, int number) {
     if (first) {
         m_started = true;
         if (!Path().empty())
-            AddHeaderComment(text::kLabelFile, std::filesystem::path(Path()).filename().string());
+            AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
     }
     // A station waits only for its coordinates, a sighting only for its observation (a note between
     // them is allowed), an XYZ line belongs only to the line just before it.
@@ -125,17 +108,17 @@ void CLectTopcon::ReadLine(std::string_view line, int number) {
 
     switch (kind) {
     case Keyword::Job:
-        return Header(text::kLabelJob, m_record);
+        return Header(fb::kLabelJob, m_record);
     case Keyword::Date:
-        return Header(text::kLabelDate, m_record, " ");
+        return Header(fb::kLabelDate, m_record, " ");
     case Keyword::Name:
         return Header(text::kLabelName, m_record);
     case Keyword::Instrument:
-        return Header(text::kLabelInstrument, m_record);
+        return Header(fb::kLabelInstrument, m_record);
     case Keyword::Scale:
-        return Header(text::kLabelScale, m_record);
+        return Header(fb::kLabelScale, m_record);
     case Keyword::Atmosphere:
-        return Header(text::kLabelAtmosphere, m_record);
+        return Header(fb::kLabelAtmosphere, m_record);
     case Keyword::Temperature:
         return Header(text::kLabelTemperature, m_record);
     case Keyword::Control:
@@ -167,7 +150,7 @@ void CLectTopcon::ReadLine(std::string_view line, int number) {
         break;
     }
     // The first line of a field book names the program that wrote it ("TopSURV v6.04(OnBoard)").
-    if (first) return AddHeaderComment(text::kLabelSoftware, clean);
+    if (first) return AddHeaderComment(fb::kLabelSoftware, clean);
     LineUnrecognised(number);
 }
 
@@ -192,11 +175,11 @@ void CLectTopcon::ReadUnits(int number) {
         if (TextWindow()) TextWindow()->Print(text::kBadUnits, number, std::string(m_record.values).c_str());
         return;
     }
-    if (lengths != '\0') m_lengths = lengths == 'F' ? DistanceUnit::Feet : DistanceUnit::Metres;
-    if (angles != '\0') m_angles = angles == 'D' ? AngleUnit::Dms : AngleUnit::Grads;
-    AddHeaderComment(text::kLabelUnits,
-                     Sprintf("%s, %s", m_lengths == DistanceUnit::Feet ? text::kFeet : text::kMetres,
-                             AngleUnitName(m_angles)));
+    if (lengths != '\0') m_settings.distances = lengths == 'F' ? DistanceUnit::Feet : DistanceUnit::Metres;
+    if (angles != '\0') m_settings.angles = angles == 'D' ? AngleUnit::Dms : AngleUnit::Grads;
+    AddHeaderComment(fb::kLabelUnits,
+                     Sprintf("%s, %s", m_settings.distances == DistanceUnit::Feet ? fb::kFeet : fb::kMetres,
+                             AngleUnitName(m_settings.angles)));
 }
 
 // ---- Numbers ---------------------------------------------------------------------------------------------
@@ -217,18 +200,18 @@ bool CLectTopcon::ReadNumber(std::string_view value, double& read, bool dms, int
 }
 
 bool CLectTopcon::ReadAngle(std::string_view value, double& grads, int number) const {
-    const bool dms = m_angles == AngleUnit::Dms;
+    const bool dms = m_settings.angles == AngleUnit::Dms;
     if (!ReadNumber(value, grads, dms, number)) return false;
     if (dms && IsKnown(grads))
         grads *= kDegreesToGrads;
     else if (!dms)
-        grads = ToGrads(grads, m_angles);
+        grads = ToGrads(grads, m_settings.angles);
     return true;
 }
 
 bool CLectTopcon::ReadLength(std::string_view value, double& metres, int number) const {
     if (!ReadNumber(value, metres, false, number)) return false;
-    metres = ToMetres(metres, m_lengths);
+    metres = ToMetres(metres, m_settings.distances);
     return true;
 }
 
@@ -237,7 +220,7 @@ bool CLectTopcon::ReadLength(std::string_view value, double& metres, int number)
 // STN id,ih,code: the station is written once the next line says whether its coordinates follow.
 void CLectTopcon::ReadStation(int number) {
     const std::string_view name = FormMatView(m_record.Field(0));
-    if (name.empty()) return LineMissing(number, text::kDatumStation);
+    if (name.empty()) return LineMissing(number, fb::kDatumStation);
     double hi = kUndefined;
     if (!ReadLength(m_record.Field(1), hi, number)) return;
     m_stationPending = true;
@@ -253,18 +236,18 @@ void CLectTopcon::FlushStation() {
     m_stationPending = false;
     AddCode(m_stationCode, m_stationName);
     m_station = AddStation(m_stationName, m_stationHi);
-    if (!m_station) LineError(text::kRefused, m_stationLine);
+    if (!m_station) LineError(fb::kRefused, m_stationLine);
     m_firstSighting = true;
     m_backsight.clear();
 }
 
 bool CLectTopcon::OpenUnknownStation(int number) {
-    m_station = AddStation(text::kUnknownStation, kUndefined);
+    m_station = AddStation(fb::kUnknownStation, kUndefined);
     if (!m_station) {
-        LineError(text::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
-    if (TextWindow()) TextWindow()->Print(text::kUnknownStationOpened, number, text::kUnknownStation);
+    if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
     m_firstSighting = true;
     m_backsight.clear();
     return true;
@@ -283,14 +266,14 @@ void CLectTopcon::ReadPosition(int number) {
     // A point may hold its planimetry, its altimetry or both, never half a planimetry.
     if (IsKnown(first) != IsKnown(second) || (IsUndefined(first) && IsUndefined(elevation)))
         return LineMissing(number, text::kDatumCoordinates);
-    if (owner == PositionOwner::Measured && !m_keepComputed) return;
-    const bool swap = m_order == CoordinateOrder::NorthEast;
+    if (owner == PositionOwner::Measured && !m_settings.keepComputed) return;
+    const bool swap = m_settings.order == CoordinateOrder::NorthEast;
     if (owner == PositionOwner::Station) {
         AddCode(m_stationCode, m_stationName);
         m_stationCode.clear();
     }
     if (!AddPoint(m_ownerName, swap ? second : first, swap ? first : second, elevation))
-        LineError(text::kRefused, number);
+        LineError(fb::kRefused, number);
     if (owner == PositionOwner::Station) FlushStation();
 }
 
@@ -299,7 +282,7 @@ void CLectTopcon::ReadPosition(int number) {
 // instrument was told.
 void CLectTopcon::ReadBacksight(int number) {
     const std::string_view name = FormMatView(m_record.Field(0));
-    if (name.empty()) return LineMissing(number, text::kDatumPoint);
+    if (name.empty()) return LineMissing(number, fb::kDatumPoint);
     double bearing = kUndefined, reading = kUndefined;
     if (!ReadAngle(m_record.Field(1), bearing, number) || !ReadAngle(m_record.Field(2), reading, number))
         return;
@@ -320,7 +303,7 @@ void CLectTopcon::ReadBacksight(int number) {
 // BS id[,th] or FS / SS id,th,code: written when its observation comes.
 void CLectTopcon::ReadSighting(SightingKind kind, int number) {
     const std::string_view name = FormMatView(m_record.Field(0));
-    if (name.empty()) return LineMissing(number, text::kDatumPoint);
+    if (name.empty()) return LineMissing(number, fb::kDatumPoint);
     double height = kUndefined;
     if (!ReadLength(m_record.Field(1), height, number)) return;
     m_sighting = kind;
@@ -338,15 +321,7 @@ void CLectTopcon::ReportPendingSighting() {
 bool CLectTopcon::IsReference() const {
     if (m_sighting == SightingKind::Back) return true;
     if (!m_backsight.empty() && m_target == m_backsight) return true;
-    switch (m_marking) {
-    case ReferenceMarking::First:
-        return m_firstSighting;
-    case ReferenceMarking::Codes:
-        return !m_targetCode.empty() && Contains(m_referenceCodes, m_targetCode);
-    case ReferenceMarking::None:
-        break;
-    }
-    return false;
+    return m_settings.MarksReference(m_firstSighting, m_targetCode);
 }
 
 // HV ha,va; SD ha,va,sd; HD ha,hd,vd. A GéoBase sighting holds a zenith angle and a slope distance: a
@@ -360,13 +335,7 @@ void CLectTopcon::ReadObservation(int number) {
     if (read && m_record.kind == Keyword::Horizontal) {
         double hd = kUndefined, vd = kUndefined;
         read = ReadLength(m_record.Field(1), hd, number) && ReadLength(m_record.Field(2), vd, number);
-        if (IsKnown(hd) && IsKnown(vd)) {
-            di = std::hypot(hd, vd);
-            if (di > 0.0) av = RadiansToGrads(std::atan2(hd, vd));
-        } else if (IsKnown(hd)) {
-            av = kHorizontalSighting;
-            di = hd;
-        }
+        SlopeFromHorizontal(hd, vd, av, di);
     } else if (read) {
         read = ReadAngle(m_record.Field(1), av, number);
         if (read && m_record.kind == Keyword::SlopeDistance) read = ReadLength(m_record.Field(2), di, number);
@@ -386,7 +355,7 @@ void CLectTopcon::ReadObservation(int number) {
     AddCode(m_targetCode, m_target);
     const bool kept = reference ? AddReference(m_target, m_targetHeight, ah, av, di) != nullptr
                                 : AddMesure(m_target, m_targetHeight, ah, av, di) != nullptr;
-    if (!kept) return LineError(text::kRefused, number);
+    if (!kept) return LineError(fb::kRefused, number);
     m_owner = PositionOwner::Measured;
     m_ownerName = m_target;
     m_lastMeasured = m_target;

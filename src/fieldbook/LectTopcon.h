@@ -54,12 +54,7 @@ private:
     bool ReadNumber(std::string_view text, double& read, bool dms, int number) const;
 
     // ---- Settings of the format ("Topcon.ini"), and the units the field book declares
-    AngleUnit m_angles = AngleUnit::Grads;
-    DistanceUnit m_lengths = DistanceUnit::Metres;
-    CoordinateOrder m_order = CoordinateOrder::EastNorth;
-    ReferenceMarking m_marking = ReferenceMarking::None;
-    std::vector<std::string> m_referenceCodes;
-    bool m_keepComputed = false;
+    InstrumentSettings m_settings;
 
     // ---- The line being read
     topcon::Record m_record;

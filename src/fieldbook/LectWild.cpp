@@ -23,20 +23,11 @@ namespace wild = gsi::msg;
 
 // Two instrument heights closer than half a millimetre are the same.
 constexpr double kSameHeight = 0.0005;
-// A zenith angle this close to 0 or 200 gr gives no horizontal distance to divide by.
-constexpr double kVerticalSine = 1e-9;
-constexpr double kHorizontalSighting = 100.0; // gr
 
 // A line holding the end of a transmission (ETX, EOT) or of a file (Ctrl-Z) is skipped; the start of a
 // transmission (STX) in front of a block is dropped.
 constexpr std::string_view kEndControls{"\x03\x04\x1a", 3};
 constexpr char kSTX = '\x02';
-
-bool Contains(const std::vector<std::string>& words, std::string_view word) {
-    for (const std::string& candidate : words)
-        if (EqualIgnoringCase(candidate, word)) return true;
-    return false;
-}
 
 bool IsDigits(std::string_view text) {
     for (char c : text)
@@ -57,33 +48,16 @@ std::string DateText(std::string_view data, bool withTime) {
     return Sprintf("%.2s/%.2s/%.4s", d, d + 2, d + 4);
 }
 
-bool IsOn(const std::string& value) {
-    return value == "1" || EqualIgnoringCase(value, "oui");
-}
-
 } // namespace
 
 // ---- Settings and state ----------------------------------------------------------------------------------
 
 void CLectWild::ReadSettings() {
     const CParamDriver* driver = Driver();
-    if (!driver) {
-        m_units = {};
-        m_order = CoordinateOrder::EastNorth;
-        m_marking = ReferenceMarking::None;
-        m_convention = StationConvention::Auto;
-        m_referenceCodes.clear();
-        m_stationCodes = {"2", "21"};
-        m_keepComputed = false;
-        return;
-    }
-    m_units = {driver->Angles(), driver->Distances()};
-    m_order = driver->Order();
-    m_marking = driver->References();
-    m_convention = driver->Stations();
-    m_referenceCodes = driver->ReferenceCodes();
-    m_stationCodes = driver->StationCodes();
-    m_keepComputed = IsOn(driver->Text(kKeyPointsCalcules));
+    m_settings = ReadInstrumentSettings(driver);
+    m_units = {m_settings.angles, m_settings.distances};
+    m_convention = driver ? driver->Stations() : StationConvention::Auto;
+    m_stationCodes = driver ? driver->StationCodes() : std::vector<std::string>{"2", "21"};
 }
 
 void CLectWild::BeginReading() {
@@ -143,20 +117,20 @@ void CLectWild::HeaderComments() {
     if (!m_started) {
         m_started = true;
         if (!Path().empty())
-            AddHeaderComment(wild::kLabelFile, std::filesystem::path(Path()).filename().string());
+            AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
     }
-    Header(m_format, wild::kLabelFormat, m_block.gsi16 ? wild::kGsi16 : wild::kGsi8);
-    if (!c.serial.empty()) Header(m_serial, wild::kLabelSerial, FormMatView(c.serial));
-    if (!c.type.empty()) Header(m_type, wild::kLabelInstrument, FormMatView(c.type));
-    if (!c.date.empty()) Header(m_date, wild::kLabelDate, DateText(c.date, false));
+    Header(m_format, fb::kLabelFormat, m_block.gsi16 ? wild::kGsi16 : wild::kGsi8);
+    if (!c.serial.empty()) Header(m_serial, fb::kLabelSerial, FormMatView(c.serial));
+    if (!c.type.empty()) Header(m_type, fb::kLabelInstrument, FormMatView(c.type));
+    if (!c.date.empty()) Header(m_date, fb::kLabelDate, DateText(c.date, false));
     // The time of each measurement is no header: only a block without observations gives one.
     if (!c.dateTime.empty() && !c.HasObservation())
         Header(m_dateTime, wild::kLabelDateTime, DateText(c.dateTime, true));
-    if (IsKnown(c.ppm)) Header(m_ppm, wild::kLabelPpm, FormatShortest(c.ppm) + " ppm");
-    if (IsKnown(c.ppmTotal)) Header(m_ppm, wild::kLabelPpm, FormatShortest(c.ppmTotal) + " ppm");
-    if (IsKnown(c.prismMm)) Header(m_prism, wild::kLabelPrism, FormatShortest(c.prismMm) + " mm");
+    if (IsKnown(c.ppm)) Header(m_ppm, fb::kLabelPpm, FormatShortest(c.ppm) + " ppm");
+    if (IsKnown(c.ppmTotal)) Header(m_ppm, fb::kLabelPpm, FormatShortest(c.ppmTotal) + " ppm");
+    if (IsKnown(c.prismMm)) Header(m_prism, fb::kLabelPrism, FormatShortest(c.prismMm) + " mm");
     if (IsKnown(c.prismConstantMm))
-        Header(m_prism, wild::kLabelPrism, FormatShortest(RoundToDecimals(c.prismConstantMm, 1)) + " mm");
+        Header(m_prism, fb::kLabelPrism, FormatShortest(RoundToDecimals(c.prismConstantMm, 1)) + " mm");
 }
 
 void CLectWild::Warnings(int number) {
@@ -179,9 +153,9 @@ void CLectWild::Warnings(int number) {
 void CLectWild::ReadCodeBlock(int number) {
     const gsi::BlockContent& c = m_content;
     const std::string_view code = FormMatView(c.code);
-    if (m_convention != StationConvention::Words84 && Contains(m_stationCodes, code)) {
+    if (m_convention != StationConvention::Words84 && IsAnyOf(code, m_stationCodes)) {
         const gsi::Word* name = c.Info(42);
-        if (!name || WordText(*name).empty()) return LineMissing(number, wild::kDatumStation);
+        if (!name || WordText(*name).empty()) return LineMissing(number, fb::kDatumStation);
         double hi = kUndefined;
         if (const gsi::Word* height = c.Info(43)) {
             if (gsi::ReadLength(*height, m_units.distances, hi) == gsi::Value::Bad) {
@@ -229,14 +203,14 @@ void CLectWild::ReadPointOrStation(int number) {
     const gsi::BlockContent& c = m_content;
     const std::string_view name = FormMatView(c.point.empty() ? c.station : c.point);
     if (m_convention != StationConvention::CodeBlock41 && c.HasStationWords()) {
-        if (name.empty()) return LineMissing(number, wild::kDatumStation);
+        if (name.empty()) return LineMissing(number, fb::kDatumStation);
         AddRemarks();
         OpenStation(name, c.instrument, number);
         return;
     }
     // A known point; under the convention of code blocks, a station's coordinates make one too.
     if (c.HasStationPosition() || c.HasTarget()) {
-        if (name.empty()) return LineMissing(number, wild::kDatumPoint);
+        if (name.empty()) return LineMissing(number, fb::kDatumPoint);
         AddRemarks();
         const bool station = c.HasStationPosition();
         if (AddPosition(name, station ? c.stationEast : c.east, station ? c.stationNorth : c.north,
@@ -251,7 +225,7 @@ void CLectWild::ReadPointOrStation(int number) {
     const bool anything = !c.serial.empty() || !c.type.empty() || !c.date.empty() || !c.dateTime.empty() ||
                           IsKnown(c.ppm) || IsKnown(c.ppmTotal) || IsKnown(c.prismConstantMm) ||
                           IsKnown(c.reflector) || c.HasRemarks();
-    if (!anything && !name.empty()) LineMissing(number, wild::kDatumContent);
+    if (!anything && !name.empty()) LineMissing(number, fb::kDatumContent);
 }
 
 void CLectWild::ReadSighting(int number) {
@@ -263,28 +237,15 @@ void CLectWild::ReadSighting(int number) {
         }
     }
     if (!m_station) {
-        if (!OpenStation(wild::kUnknownStation, c.instrument, number)) return;
-        if (TextWindow()) TextWindow()->Print(wild::kUnknownStationOpened, number, wild::kUnknownStation);
+        if (!OpenStation(fb::kUnknownStation, c.instrument, number)) return;
+        if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
     }
     const std::string_view point = FormMatView(c.point);
-    if (point.empty()) return LineMissing(number, wild::kDatumPoint);
+    if (point.empty()) return LineMissing(number, fb::kDatumPoint);
     CheckInstrumentHeight(c.instrument, number);
 
     double ah = c.hz, av = c.v, di = c.slope;
-    if (IsUndefined(di) && IsKnown(c.horizontal)) {
-        // The slope distance from the horizontal one: by the zenith angle, or with the height difference
-        // from the tilting axis to the target; alone, the sighting is taken as horizontal.
-        const double sine = IsKnown(av) ? std::fabs(SinGrads(av)) : 0.0;
-        if (sine > kVerticalSine) {
-            di = c.horizontal / sine;
-        } else if (IsUndefined(av) && IsKnown(c.heightDifference)) {
-            di = std::hypot(c.horizontal, c.heightDifference);
-            av = RadiansToGrads(std::atan2(c.horizontal, c.heightDifference));
-        } else if (IsUndefined(av)) {
-            av = kHorizontalSighting;
-            di = c.horizontal;
-        }
-    }
+    SlopeFromHorizontal(c.horizontal, c.heightDifference, av, di);
     AddRemarks();
     const bool reference = IsReference(point);
     CVisee* sighting = reference
@@ -292,14 +253,15 @@ void CLectWild::ReadSighting(int number) {
                            : static_cast<CVisee*>(AddMesure(std::string(point), m_reflector, ah, av, di));
     m_firstSighting = false;
     m_pendingCode.clear();
-    if (!sighting) return LineError(wild::kRefused, number);
-    if (m_keepComputed && c.HasTarget()) AddPosition(point, c.east, c.north, c.elevation, false, number);
+    if (!sighting) return LineError(fb::kRefused, number);
+    if (m_settings.keepComputed && c.HasTarget())
+        AddPosition(point, c.east, c.north, c.elevation, false, number);
 }
 
 void CLectWild::ReadStaff(int number) {
     const gsi::BlockContent& c = m_content;
     std::string point(FormMatView(c.point));
-    if (point.empty()) return LineMissing(number, wild::kDatumPoint);
+    if (point.empty()) return LineMissing(number, fb::kDatumPoint);
     AddRemarks();
     for (std::size_t i = 0; i < c.readingCount; ++i) {
         const gsi::StaffReading& reading = c.readings[i];
@@ -315,7 +277,7 @@ void CLectWild::ReadStaff(int number) {
 bool CLectWild::OpenStation(std::string_view name, double hi, int number) {
     const gsi::BlockContent& c = m_content;
     if (name.empty()) {
-        LineMissing(number, wild::kDatumStation);
+        LineMissing(number, fb::kDatumStation);
         return false;
     }
     if (c.HasStationPosition() &&
@@ -323,7 +285,7 @@ bool CLectWild::OpenStation(std::string_view name, double hi, int number) {
         return false;
     CStation* station = AddStation(std::string(name), hi);
     if (!station) {
-        LineError(wild::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
     m_station = station;
@@ -337,14 +299,14 @@ bool CLectWild::OpenStation(std::string_view name, double hi, int number) {
 bool CLectWild::AddPosition(std::string_view name, double first, double second, double elevation, bool known,
                             int number) {
     if (IsKnown(first) != IsKnown(second)) {
-        const bool northMissing = IsKnown(first) == (m_order == CoordinateOrder::EastNorth);
-        LineMissing(number, northMissing ? wild::kDatumNorth : wild::kDatumEast);
+        const bool northMissing = IsKnown(first) == (m_settings.order == CoordinateOrder::EastNorth);
+        LineMissing(number, northMissing ? fb::kDatumNorth : fb::kDatumEast);
         return false;
     }
-    const bool swap = m_order == CoordinateOrder::NorthEast;
+    const bool swap = m_settings.order == CoordinateOrder::NorthEast;
     CPointGen* point = AddPoint(std::string(name), swap ? second : first, swap ? first : second, elevation);
     if (!point) {
-        LineError(wild::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
     if (known && point->hasXY()) m_known.insert(point->mat());
@@ -366,23 +328,12 @@ void CLectWild::CheckInstrumentHeight(double hi, int number) {
 
 // ---- References ------------------------------------------------------------------------------------------
 
-bool CLectWild::IsReferenceCode(std::string_view code) const {
-    return !code.empty() && Contains(m_referenceCodes, code);
-}
-
 bool CLectWild::IsReference(std::string_view point) const {
     if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
-    switch (m_marking) {
-    case ReferenceMarking::First:
-        return m_firstSighting;
-    case ReferenceMarking::Codes:
-        if (IsReferenceCode(m_pendingCode)) return true;
-        for (std::size_t i = 0; i < m_content.remarkCount; ++i)
-            if (IsReferenceCode(WordText(*m_content.remarks[i]))) return true;
-        return false;
-    case ReferenceMarking::None:
-        break;
-    }
+    // The code of a sighting is the code block before it, or one of the remarks of its own block.
+    if (m_settings.MarksReference(m_firstSighting, m_pendingCode)) return true;
+    for (std::size_t i = 0; i < m_content.remarkCount; ++i)
+        if (m_settings.MarksReference(false, WordText(*m_content.remarks[i]))) return true;
     return false;
 }
 

@@ -55,16 +55,12 @@ private:
     void CheckInstrumentHeight(double hi, int number);
     void AddRemarks();
     bool IsReference(std::string_view point) const;
-    bool IsReferenceCode(std::string_view code) const;
 
     // ---- Settings of the format ("Wild.ini")
     gsi::Units m_units;
-    CoordinateOrder m_order = CoordinateOrder::EastNorth;
-    ReferenceMarking m_marking = ReferenceMarking::None;
+    InstrumentSettings m_settings;
     StationConvention m_convention = StationConvention::Auto;
-    std::vector<std::string> m_referenceCodes;
     std::vector<std::string> m_stationCodes;
-    bool m_keepComputed = false;
 
     // ---- The line being read
     gsi::Block m_block;

@@ -5,7 +5,6 @@
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "fieldbook/FieldBookTexts.h"
-#include "fieldbook/LectWildTexts.h"
 #include "fieldbook/LectZeissTexts.h"
 #include "geobase/Carnet.h"
 #include "geobase/Matricule.h"
@@ -21,14 +20,10 @@ namespace pyr {
 namespace {
 
 namespace text = zeiss::msg;
-namespace shared = gsi::msg;
 using zeiss::Layout;
 
-// A zenith angle this close to 0 or 200 gr gives no horizontal distance to divide by.
-constexpr double kVerticalSine = 1e-9;
-constexpr double kHorizontalSighting = 100.0; // gr
-constexpr double kRightAngle = 100.0;         // gr
-constexpr double kNadir = 200.0;              // gr
+constexpr double kRightAngle = 100.0; // gr
+constexpr double kNadir = 200.0;      // gr
 
 // The end of a transmission (ETX, EOT) or of a file (Ctrl-Z) ends the data of its line; the start of a
 // transmission (STX) in front of a line is dropped.
@@ -176,11 +171,6 @@ std::string WithUnit(std::string_view number, std::string_view unit) {
     return shown;
 }
 
-bool Contains(const std::vector<std::string>& words, std::string_view word) {
-    return std::any_of(words.begin(), words.end(),
-                       [&](const std::string& candidate) { return EqualIgnoringCase(candidate, word); });
-}
-
 } // namespace
 
 // The values of one line in grads and metres, kUndefined where the line gives none.
@@ -199,15 +189,9 @@ struct CLectZeiss::Values {
 // ---- Settings and state ----------------------------------------------------------------------------------
 
 void CLectZeiss::ReadSettings() {
-    const CParamDriver* driver = Driver();
-    m_angles = driver ? driver->Angles() : AngleUnit::Grads;
-    m_distances = driver ? driver->Distances() : DistanceUnit::Metres;
+    m_settings = ReadInstrumentSettings(Driver(), CoordinateOrder::NorthEast);
     // The instrument's X is its northing unless the settings say the easting comes first in X.
-    m_xNorth = !driver || driver->Order() == CoordinateOrder::NorthEast;
-    m_marking = driver ? driver->References() : ReferenceMarking::None;
-    m_referenceCodes = driver ? driver->ReferenceCodes() : std::vector<std::string>{};
-    const std::string& computed = driver ? driver->Text(kKeyPointsCalcules) : std::string();
-    m_keepComputed = computed == "1" || EqualIgnoringCase(computed, "oui");
+    m_xNorth = m_settings.order == CoordinateOrder::NorthEast;
 }
 
 void CLectZeiss::BeginReading() {
@@ -282,15 +266,15 @@ bool CLectZeiss::Split(std::string_view line, int number) {
         m_started = true;
         m_layout = layout;
         if (!Path().empty())
-            AddHeaderComment(text::kLabelFile, std::filesystem::path(Path()).filename().string());
-        AddHeaderComment(text::kLabelFormat, LayoutName(layout));
+            AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
+        AddHeaderComment(fb::kLabelFormat, LayoutName(layout));
     }
     return true;
 }
 
 void CLectZeiss::WarnOnce(std::vector<std::string>& said, const char* format, std::string_view what,
                           int number) {
-    if (Contains(said, what)) return;
+    if (IsAnyOf(what, said)) return;
     said.emplace_back(what);
     if (TextWindow()) TextWindow()->Print(format, number, said.back().c_str());
 }
@@ -312,10 +296,10 @@ bool CLectZeiss::ReadValues(int number, Values& values) {
         const std::string shown = WithUnit(value.number, value.unit);
         switch (kind) {
         case Kind::Scale:
-            Header(m_scale, text::kLabelScale, shown);
+            Header(m_scale, fb::kLabelScale, shown);
             continue;
         case Kind::Temperature:
-            Header(m_temperature, text::kLabelTemperature, shown);
+            Header(m_temperature, fb::kLabelTemperature, shown);
             continue;
         case Kind::Pressure:
             Header(m_pressure, text::kLabelPressure, shown);
@@ -336,7 +320,7 @@ bool CLectZeiss::ReadValues(int number, Values& values) {
         bool ok = false;
         if (IsLengthKind(kind)) {
             ok = ParseDouble(value.number, read);
-            const DistanceUnit distances = unit == Unit::None   ? m_distances
+            const DistanceUnit distances = unit == Unit::None   ? m_settings.distances
                                            : unit == Unit::Feet ? DistanceUnit::Feet
                                                                 : DistanceUnit::Metres;
             read = ToMetres(read, distances);
@@ -344,7 +328,7 @@ bool CLectZeiss::ReadValues(int number, Values& values) {
             ok = ParseDouble(value.number, read);
             read = kRightAngle - RadiansToGrads(std::atan(read / 100.0));
         } else {
-            const AngleUnit angles = unit == Unit::None ? m_angles : AngleUnitOf(unit);
+            const AngleUnit angles = unit == Unit::None ? m_settings.angles : AngleUnitOf(unit);
             double degrees = 0.0;
             if (angles == AngleUnit::Dms) {
                 ok = DmsTextToDegrees(value.number, degrees);
@@ -424,8 +408,8 @@ void CLectZeiss::Header(std::string& last, const char* label, std::string_view v
 
 // The words of an instrument's header (between "START" and "END").
 void CLectZeiss::ReadHeaderWord(std::string_view type, std::string_view value) {
-    if (type == "01") return Header(m_instrument, text::kLabelInstrument, value);
-    if (type == "02") return Header(m_serial, text::kLabelSerial, value);
+    if (type == "01") return Header(m_instrument, fb::kLabelInstrument, value);
+    if (type == "02") return Header(m_serial, fb::kLabelSerial, value);
     if (type == "03") return Header(m_version, text::kLabelVersion, value);
     const int number = LenientAtoi(value);
     if (type == "05") {
@@ -467,7 +451,7 @@ void CLectZeiss::ReadPoint(const Values& values, int number) {
         if (m_record.code.empty() && m_record.valueCount > 0 && !values.HasObservation() &&
             !values.HasPosition())
             return ReadTextRecord(values);
-        return LineMissing(number, shared::kDatumPoint);
+        return LineMissing(number, fb::kDatumPoint);
     }
     if (m_record.code == kStationMarker) return ReadStation(values, number);
     if (values.HasObservation()) return ReadSighting(values, number);
@@ -476,7 +460,7 @@ void CLectZeiss::ReadPoint(const Values& values, int number) {
         return;
     }
     if (IsKnown(values.instrument)) return SetInstrumentHeight(values.instrument);
-    if (IsUndefined(values.reflector)) LineMissing(number, text::kDatumContent);
+    if (IsUndefined(values.reflector)) LineMissing(number, fb::kDatumContent);
 }
 
 void CLectZeiss::ReadStation(const Values& values, int number) {
@@ -491,7 +475,7 @@ void CLectZeiss::ReadStation(const Values& values, int number) {
 bool CLectZeiss::OpenStation(std::string_view name, int number) {
     CStation* station = AddStation(std::string(name), m_hi, m_knownStation ? 0.0 : kUndefined);
     if (!station) {
-        LineError(shared::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
     m_station = station;
@@ -509,37 +493,16 @@ void CLectZeiss::SetInstrumentHeight(double hi) {
 
 bool CLectZeiss::IsReference() const {
     if (m_setUp) return true;
-    switch (m_marking) {
-    case ReferenceMarking::First:
-        return !m_sighted;
-    case ReferenceMarking::Codes:
-        return !m_record.code.empty() && Contains(m_referenceCodes, m_record.code);
-    case ReferenceMarking::None:
-        break;
-    }
-    return false;
+    return m_settings.MarksReference(!m_sighted, m_record.code);
 }
 
 void CLectZeiss::ReadSighting(const Values& values, int number) {
     if (!m_station) {
-        if (!OpenStation(shared::kUnknownStation, number)) return;
-        if (TextWindow()) TextWindow()->Print(shared::kUnknownStationOpened, number, shared::kUnknownStation);
+        if (!OpenStation(fb::kUnknownStation, number)) return;
+        if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
     }
     double av = values.zenith, di = values.slope;
-    if (IsUndefined(di) && IsKnown(values.horizontal)) {
-        // The slope distance from the horizontal one: by the zenith angle, or with the height difference
-        // from the tilting axis to the target; alone, the sighting is taken as horizontal.
-        const double sine = IsKnown(av) ? std::fabs(SinGrads(av)) : 0.0;
-        if (sine > kVerticalSine) {
-            di = values.horizontal / sine;
-        } else if (IsUndefined(av) && IsKnown(values.heightDifference)) {
-            di = std::hypot(values.horizontal, values.heightDifference);
-            av = RadiansToGrads(std::atan2(values.horizontal, values.heightDifference));
-        } else if (IsUndefined(av)) {
-            av = kHorizontalSighting;
-            di = values.horizontal;
-        }
-    }
+    SlopeFromHorizontal(values.horizontal, values.heightDifference, av, di);
     const std::string point(m_record.point);
     AddCode(PointCode(), point);
     const bool reference = IsReference();
@@ -547,8 +510,8 @@ void CLectZeiss::ReadSighting(const Values& values, int number) {
                                  : static_cast<CVisee*>(AddMesure(point, m_reflector, values.hz, av, di));
     m_sighted = true;
     m_settingUp = false;
-    if (!sighting) return LineError(shared::kRefused, number);
-    if (m_keepComputed && IsKnown(values.east) && IsKnown(values.north))
+    if (!sighting) return LineError(fb::kRefused, number);
+    if (m_settings.keepComputed && IsKnown(values.east) && IsKnown(values.north))
         AddPosition(point, values, false, number);
 }
 
@@ -561,12 +524,12 @@ const std::string& CLectZeiss::PointCode() {
 
 bool CLectZeiss::AddPosition(std::string_view name, const Values& values, bool keepCode, int number) {
     if (IsKnown(values.east) != IsKnown(values.north)) {
-        LineMissing(number, IsKnown(values.east) ? shared::kDatumNorth : shared::kDatumEast);
+        LineMissing(number, IsKnown(values.east) ? fb::kDatumNorth : fb::kDatumEast);
         return false;
     }
     if (keepCode) AddCode(PointCode(), name);
     if (!AddPoint(std::string(name), values.east, values.north, values.elevation)) {
-        LineError(shared::kRefused, number);
+        LineError(fb::kRefused, number);
         return false;
     }
     return true;

@@ -50,12 +50,8 @@ private:
     void WarnOnce(std::vector<std::string>& said, const char* format, std::string_view what, int number);
 
     // ---- Settings of the format ("Zeiss.ini"), and what the file's header changes of them
-    AngleUnit m_angles = AngleUnit::Grads;
-    DistanceUnit m_distances = DistanceUnit::Metres;
+    InstrumentSettings m_settings;
     bool m_xNorth = true; // the file's X is the northing
-    ReferenceMarking m_marking = ReferenceMarking::None;
-    std::vector<std::string> m_referenceCodes;
-    bool m_keepComputed = false;
 
     // ---- The line being read
     zeiss::Record m_record;

@@ -4,9 +4,6 @@
 // a GéoBase. Those with %d or %s are printf formats; the line number comes first.
 namespace pyr::zeiss::msg {
 
-// ---- Names of the data, for "Erreur ligne %d : donnée manquante pour %s !"
-inline constexpr const char* kDatumContent = "les observations ou les coordonnées du point";
-
 // ---- Lines read, with something to say (each type or unit said once a field book)
 inline constexpr const char* kUnknownType =
     "Attention : ligne %d : type de valeur « %s » inconnu, ignoré dans tout le carnet.";
@@ -16,16 +13,10 @@ inline constexpr const char* kUnknownUnit =
 inline constexpr const char* kFlaggedLine =
     "Attention : ligne %d : ligne marquée en erreur par l'appareil, lue quand même.";
 
-// ---- Labels of the header comments
-inline constexpr const char* kLabelFile = "Fichier";
-inline constexpr const char* kLabelFormat = "Format";
-inline constexpr const char* kLabelInstrument = "Appareil";
-inline constexpr const char* kLabelSerial = "Numéro de série";
+// ---- Labels of the header comments (beside those of every reader, FieldBookTexts.h)
 inline constexpr const char* kLabelVersion = "Version du logiciel";
 inline constexpr const char* kLabelAxes = "Axes des coordonnées";
-inline constexpr const char* kLabelScale = "Facteur d'échelle";
 inline constexpr const char* kLabelOrientation = "Orientation (Om)";
-inline constexpr const char* kLabelTemperature = "Température";
 inline constexpr const char* kLabelPressure = "Pression";
 
 // The axes as the header comment says them.

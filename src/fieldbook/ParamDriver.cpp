@@ -90,8 +90,9 @@ const std::vector<Key>& TopconKeys() {
 const std::vector<Key>& ZeissKeys() {
     static const std::vector<Key> keys = [] {
         std::vector<Key> zeiss = WithComputedPoints();
-        auto order = std::find_if(zeiss.begin(), zeiss.end(),
-                                  [](const Key& key) { return std::string_view(key.name) == kKeyOrdreCoordonnees; });
+        auto order = std::find_if(zeiss.begin(), zeiss.end(), [](const Key& key) {
+            return std::string_view(key.name) == kKeyOrdreCoordonnees;
+        });
         order->defaultValue = kOrderYX;
         return zeiss;
     }();
@@ -398,6 +399,30 @@ StationConvention CParamDriver::Stations() const {
 
 std::vector<std::string> CParamDriver::StationCodes() const {
     return SplitList(Text(kKeyCodesStation));
+}
+
+bool InstrumentSettings::MarksReference(bool firstSighting, std::string_view code) const {
+    switch (marking) {
+    case ReferenceMarking::First:
+        return firstSighting;
+    case ReferenceMarking::Codes:
+        return !code.empty() && IsAnyOf(code, referenceCodes);
+    case ReferenceMarking::None:
+        break;
+    }
+    return false;
+}
+
+InstrumentSettings ReadInstrumentSettings(const CParamDriver* driver, CoordinateOrder order) {
+    if (!driver) {
+        InstrumentSettings defaults;
+        defaults.order = order;
+        return defaults;
+    }
+    const std::string& computed = driver->Text(kKeyPointsCalcules);
+    return {driver->Angles(),         driver->Distances(),
+            driver->Order(),          driver->References(),
+            driver->ReferenceCodes(), computed == "1" || EqualIgnoringCase(computed, "oui")};
 }
 
 RecordLayout CParamDriver::Layout() const {

@@ -142,6 +142,26 @@ private:
     std::map<std::string, std::string, std::less<>> m_values;
 };
 
+// What every instrument reader takes from its parameter set; the defaults are those of a reader without
+// one.
+struct InstrumentSettings {
+    AngleUnit angles = AngleUnit::Grads;
+    DistanceUnit distances = DistanceUnit::Metres;
+    CoordinateOrder order = CoordinateOrder::EastNorth;
+    ReferenceMarking marking = ReferenceMarking::None;
+    std::vector<std::string> referenceCodes;
+    bool keepComputed = false; // "PointsCalcules": the instrument's coordinates of measured points kept
+
+    // Whether the settings make a reference of a sighting that the field book does not mark as one: the
+    // first after its station, or one whose code is a reference code.
+    bool MarksReference(bool firstSighting, std::string_view code) const;
+};
+
+// The settings of `driver`; the defaults, with the coordinates in `order`, when the reader has no
+// parameter set.
+InstrumentSettings ReadInstrumentSettings(const CParamDriver* driver,
+                                          CoordinateOrder order = CoordinateOrder::EastNorth);
+
 // Reads a list of fields, "TYPE,MATRICULE,X,Y,Z,CODE" (delimited) or "TYPE:1-2,MATRICULE:4-15,CODE:17-"
 // (columnar); the French reason in `error` when it is wrong.
 bool ParseFieldList(std::string_view text, bool columnar, std::vector<FieldPlace>& fields,
