@@ -43,6 +43,15 @@ std::string_view Trimmed(std::string_view text) {
     return text;
 }
 
+std::string_view TrimmedOfControls(std::string_view text) {
+    auto control = [](char c) { return static_cast<unsigned char>(c) <= ' ' || c == '\x7f'; };
+    while (!text.empty() && control(text.front()))
+        text.remove_prefix(1);
+    while (!text.empty() && control(text.back()))
+        text.remove_suffix(1);
+    return text;
+}
+
 bool EqualIgnoringCase(std::string_view a, std::string_view b) {
     if (a.size() != b.size()) return false;
     auto lower = [](char c) { return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c; };

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookUnits.h"
 #include "fieldbook/ParamDriver.h"
@@ -35,12 +36,6 @@ protected:
     void EndReading() override;
 
 private:
-    struct TextHash {
-        using is_transparent = void;
-        std::size_t operator()(std::string_view text) const { return std::hash<std::string_view>{}(text); }
-    };
-    using NameSet = std::unordered_set<std::string, TextHash, std::equal_to<>>;
-
     // What a block has gathered; the texts are views into the records being read.
     struct Block {
         int label = -1; // kLabelStation, kLabelPoint, or -1 when no block is open
@@ -82,7 +77,7 @@ private:
     std::string m_orientedOn;      // the point its label 62 names
     bool m_firstSighting = false;
     double m_signalHeight = kUndefined; // label 6 holds until the next one
-    NameSet m_known;                    // points given with their planimetry
+    TextSet m_known;                    // points given with their planimetry
     std::vector<bool> m_labelWarned;
     std::string m_units, m_ppm, m_scale;
 };

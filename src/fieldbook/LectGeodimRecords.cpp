@@ -1,5 +1,7 @@
 #include "fieldbook/LectGeodimRecords.h"
 
+#include "core/Strings.h"
+
 #include <charconv>
 #include <string>
 
@@ -9,19 +11,6 @@ namespace {
 
 // Labels run from 0 to a few hundred; more digits than this is no label.
 constexpr std::size_t kMaxLabelDigits = 4;
-
-// Blanks, tabs and the control characters of a transmission (STX, ETX, EOT, Ctrl-Z) around a record.
-bool IsPadding(char c) {
-    return static_cast<unsigned char>(c) <= ' ';
-}
-
-std::string_view Cleaned(std::string_view text) {
-    while (!text.empty() && IsPadding(text.front()))
-        text.remove_prefix(1);
-    while (!text.empty() && IsPadding(text.back()))
-        text.remove_suffix(1);
-    return text;
-}
 
 bool ReadLabel(std::string_view text, int& label) {
     if (text.empty() || text.size() > kMaxLabelDigits) return false;
@@ -38,11 +27,12 @@ bool IsTextLabel(int label) {
 }
 
 RecordShape SplitRecord(std::string_view line, Record& record) {
-    line = Cleaned(line);
+    line = TrimmedOfControls(line);
     if (line.empty()) return RecordShape::Blank;
     const std::size_t equal = line.find('=');
-    if (!ReadLabel(Cleaned(line.substr(0, equal)), record.label)) return RecordShape::Unrecognised;
-    record.value = equal == std::string_view::npos ? std::string_view() : Cleaned(line.substr(equal + 1));
+    if (!ReadLabel(TrimmedOfControls(line.substr(0, equal)), record.label)) return RecordShape::Unrecognised;
+    record.value =
+        equal == std::string_view::npos ? std::string_view() : TrimmedOfControls(line.substr(equal + 1));
     if (equal == std::string_view::npos) return RecordShape::Incomplete;
     if (record.value.empty() && !IsTextLabel(record.label)) return RecordShape::Incomplete;
     return RecordShape::Whole;

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookUnits.h"
 #include "fieldbook/ParamDriver.h"
@@ -40,12 +41,6 @@ protected:
     void ReadLine(std::string_view line, int number) override;
 
 private:
-    struct TextHash {
-        using is_transparent = void;
-        std::size_t operator()(std::string_view text) const { return std::hash<std::string_view>{}(text); }
-    };
-    using NameSet = std::unordered_set<std::string, TextHash, std::equal_to<>>;
-
     void ReadSettings();
     void Started(const char* format);
 
@@ -82,7 +77,7 @@ private:
     std::string m_station;   // the station in force
     std::string m_backsight; // its backsight point, as the station record names it
     bool m_firstSighting = false;
-    NameSet m_known; // points given with their planimetry
+    TextSet m_known; // points given with their planimetry
     bool m_started = false;
     bool m_rawStarted = false;
     bool m_dtmStarted = false;

@@ -86,7 +86,7 @@ void CLectTopcon::EndReading() {
 // ---- A line ----------------------------------------------------------------------------------------------
 
 void CLectTopcon::ReadLine(std::string_view line, int number) {
-    const std::string_view clean = topcon::CleanLine(line);
+    const std::string_view clean = TrimmedOfControls(line);
     if (clean.empty()) return;
     topcon::SplitRecord(clean, m_record);
     const Keyword kind = m_record.kind;

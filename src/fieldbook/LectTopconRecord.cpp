@@ -22,10 +22,6 @@ constexpr KeywordName kKeywords[] = {
     {"TEMP", Keyword::Temperature}, {"CTL", Keyword::Control},
 };
 
-bool IsBlankOrControl(char c) {
-    return static_cast<unsigned char>(c) <= ' ' || c == '\x7f';
-}
-
 Keyword Recognise(std::string_view keyword) {
     for (const KeywordName& known : kKeywords)
         if (keyword.size() == known.name.size() && EqualIgnoringCase(keyword, known.name)) return known.kind;
@@ -33,14 +29,6 @@ Keyword Recognise(std::string_view keyword) {
 }
 
 } // namespace
-
-std::string_view CleanLine(std::string_view line) {
-    while (!line.empty() && IsBlankOrControl(line.front()))
-        line.remove_prefix(1);
-    while (!line.empty() && IsBlankOrControl(line.back()))
-        line.remove_suffix(1);
-    return line;
-}
 
 void SplitRecord(std::string_view line, Record& record) {
     std::size_t end = 0;

@@ -50,11 +50,8 @@ struct Record {
     }
 };
 
-// The line without the control characters of a transmission (STX, ETX, EOT, Ctrl-Z) or blanks at either
-// end; "" for a line that holds nothing else.
-std::string_view CleanLine(std::string_view line);
-
-// Splits a cleaned line into its keyword and values; the keyword is recognised whatever its case.
+// Splits a line without blanks nor controls at its ends (TrimmedOfControls) into its keyword and values; the
+// keyword is recognised whatever its case.
 void SplitRecord(std::string_view line, Record& record);
 
 } // namespace pyr::topcon

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/LectWildBlock.h"
 #include "fieldbook/ParamDriver.h"
@@ -33,12 +34,6 @@ protected:
     void ReadLine(std::string_view line, int number) override;
 
 private:
-    struct TextHash {
-        using is_transparent = void;
-        std::size_t operator()(std::string_view text) const { return std::hash<std::string_view>{}(text); }
-    };
-    using NameSet = std::unordered_set<std::string, TextHash, std::equal_to<>>;
-
     void ReadSettings();
     void HeaderComments();
     void Header(std::string& last, const char* label, std::string_view value);
@@ -73,7 +68,7 @@ private:
     bool m_heightWarned = false;   // its differing instrument heights were said
     double m_reflector = kUndefined;
     std::string m_pendingCode; // the code of the last code block, for the next sighting
-    NameSet m_known;           // points given with their planimetry
+    TextSet m_known;           // points given with their planimetry
     bool m_started = false;
     std::string m_format, m_serial, m_type, m_date, m_dateTime, m_ppm, m_prism;
     std::bitset<1000> m_wordWarned, m_unitWarned;
