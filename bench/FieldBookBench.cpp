@@ -17,6 +17,12 @@ GeneratedFieldBook::GeneratedFieldBook(const std::string& fileName, const std::s
     if (!out) throw std::runtime_error("impossible d'écrire " + m_file);
 }
 
+bool CheckElementCount(benchmark::State& state, int count, ElementRange expected) {
+    if (count >= expected.least && count <= expected.most) return true;
+    state.SkipWithError(("la GéoBase n'a pas le bon contenu : " + std::to_string(count)).c_str());
+    return false;
+}
+
 void MeasureConversion(benchmark::State& state, const GeneratedFieldBook& book,
                        const ReaderFactory& makeReader, int lines, ElementRange expected) {
     for (auto _ : state) {
@@ -33,11 +39,7 @@ void MeasureConversion(benchmark::State& state, const GeneratedFieldBook& book,
             state.SkipWithError("GéoBase impossible à écrire");
             break;
         }
-        if (carnet.GetSize() < expected.least || carnet.GetSize() > expected.most) {
-            state.SkipWithError(
-                ("la GéoBase n'a pas le bon contenu : " + std::to_string(carnet.GetSize())).c_str());
-            break;
-        }
+        if (!CheckElementCount(state, carnet.GetSize(), expected)) break;
     }
     state.SetItemsProcessed(state.iterations() * lines);
     state.SetBytesProcessed(state.iterations() * static_cast<std::int64_t>(book.Bytes()));

@@ -54,6 +54,9 @@ struct ElementRange {
     int most = std::numeric_limits<int>::max();
 };
 
+// False, the benchmark ended with an error naming the count, when `count` elements is outside `expected`.
+bool CheckElementCount(benchmark::State& state, int count, ElementRange expected);
+
 using ReaderFactory = std::function<std::unique_ptr<CFieldBookReader>()>;
 
 // One measured conversion per iteration: a reader from `makeReader` reads the book's file, the GéoBase
