@@ -124,6 +124,10 @@ void CFieldBookReader::LineError(const char* format, int number) {
     if (m_txt) m_txt->PrintText(Sprintf(format, number));
 }
 
+void CFieldBookReader::LineUnknownStation(int number) {
+    if (m_txt) m_txt->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
+}
+
 void CFieldBookReader::Print(std::string_view text) {
     if (m_txt) m_txt->PrintText(text);
 }

@@ -107,6 +107,9 @@ protected:
     // Any other sentence of a line, a format with one %d for the line number ("Erreur ligne %d : pas de
     // station pour cette hauteur d'instrument !").
     void LineError(const char* format, int number);
+    // The sightings of a field book that does not say where the instrument stands, from this line on, go
+    // to the station fb::kUnknownStation: the surveyor is told to rename it.
+    void LineUnknownStation(int number);
     void Print(std::string_view text);
 
     // ---- Elements. Each normalises the identifier, checks the element through the store (which says

@@ -382,7 +382,7 @@ void CLectGeodim::WritePoint() {
         m_station = AddStation(fb::kUnknownStation);
         if (!m_station) return LineError(fb::kRefused, b.number);
         m_firstSighting = true;
-        if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, b.number, fb::kUnknownStation);
+        LineUnknownStation(b.number);
     }
     AddCode(b.code, name);
 

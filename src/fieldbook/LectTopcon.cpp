@@ -247,7 +247,7 @@ bool CLectTopcon::OpenUnknownStation(int number) {
         LineError(fb::kRefused, number);
         return false;
     }
-    if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
+    LineUnknownStation(number);
     m_firstSighting = true;
     m_backsight.clear();
     return true;

@@ -238,7 +238,7 @@ void CLectWild::ReadSighting(int number) {
     }
     if (!m_station) {
         if (!OpenStation(fb::kUnknownStation, c.instrument, number)) return;
-        if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
+        LineUnknownStation(number);
     }
     const std::string_view point = FormMatView(c.point);
     if (point.empty()) return LineMissing(number, fb::kDatumPoint);

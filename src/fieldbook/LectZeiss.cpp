@@ -499,7 +499,7 @@ bool CLectZeiss::IsReference() const {
 void CLectZeiss::ReadSighting(const Values& values, int number) {
     if (!m_station) {
         if (!OpenStation(fb::kUnknownStation, number)) return;
-        if (TextWindow()) TextWindow()->Print(fb::kUnknownStationOpened, number, fb::kUnknownStation);
+        LineUnknownStation(number);
     }
     double av = values.zenith, di = values.slope;
     SlopeFromHorizontal(values.horizontal, values.heightDifference, av, di);
