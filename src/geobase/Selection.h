@@ -1,11 +1,12 @@
 #pragma once
 
+#include "core/Strings.h"
+
 #include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
-#include <unordered_set>
 #include <vector>
 
 // Selections of points typed by the user: "100-150, A1-A9; P7 P-12". The grammar is written for
@@ -47,16 +48,11 @@ private:
         long long first;
         long long last;
     };
-    struct Hash {
-        using is_transparent = void;
-        std::size_t operator()(std::string_view text) const { return std::hash<std::string_view>{}(text); }
-    };
-
     CSelection() = default;
     bool InRange(std::string_view normalisedId) const;
 
-    std::unordered_set<std::string, Hash, std::equal_to<>> m_ids;
-    std::unordered_map<std::string, std::vector<Interval>, Hash, std::equal_to<>> m_ranges;
+    TextSet m_ids;
+    std::unordered_map<std::string, std::vector<Interval>, TextHash, std::equal_to<>> m_ranges;
     long long m_count = 0;
 };
 
