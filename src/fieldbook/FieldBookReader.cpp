@@ -4,12 +4,15 @@
 #include "core/Lines.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
+#include "core/Undefined.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/TableCode.h"
 #include "geobase/Carnet.h"
 #include "settings/CalcOptions.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
+
+#include <cmath>
 
 namespace pyr {
 
@@ -134,24 +137,47 @@ void CFieldBookReader::Print(std::string_view text) {
 
 // ---- Elements --------------------------------------------------------------------------------------------
 
+namespace {
+
+// What a field book carries, without the binary noise of its conversions (a DMS reading turned into
+// grads, a face-right reading brought back by 200 gr, feet into metres): angles to 0.01 µgr and lengths to
+// the micrometre, finer than any instrument records, so that a value the book wrote comes back as written
+// ("157.4134", not "157.41340000000002"). Dividing the rounded count by a power of ten that a double holds
+// exactly gives the double nearest the decimal value, as reading its text would.
+double Rounded(double value, double perUnit) {
+    if (!IsKnown(value) || !std::isfinite(value) || std::fabs(value) * perUnit > 1e15) return value;
+    return std::round(value * perUnit) / perUnit;
+}
+double Angle(double grads) {
+    return Rounded(grads, 1e8);
+}
+double Length(double metres) {
+    return Rounded(metres, 1e6);
+}
+
+} // namespace
+
 CStation* CFieldBookReader::AddStation(std::string name, double hi, double v0, std::string code) {
-    return Result().validStation(m_txt, std::make_unique<CStation>(std::move(name), hi, v0, std::move(code)));
+    return Result().validStation(
+        m_txt, std::make_unique<CStation>(std::move(name), Length(hi), Angle(v0), std::move(code)));
 }
 
 CReference* CFieldBookReader::AddReference(std::string point, double hp, double ah, double av, double di,
                                            std::string code) {
-    return Result().validReference(
-        m_txt, std::make_unique<CReference>(std::move(point), hp, ah, av, di, std::move(code)));
+    return Result().validReference(m_txt,
+                                   std::make_unique<CReference>(std::move(point), Length(hp), Angle(ah),
+                                                                Angle(av), Length(di), std::move(code)));
 }
 
 CMesure* CFieldBookReader::AddMesure(std::string point, double hp, double ah, double av, double di,
                                      std::string code) {
-    return Result().validMesure(m_txt,
-                                std::make_unique<CMesure>(std::move(point), hp, ah, av, di, std::move(code)));
+    return Result().validMesure(m_txt, std::make_unique<CMesure>(std::move(point), Length(hp), Angle(ah),
+                                                                 Angle(av), Length(di), std::move(code)));
 }
 
 CPointGen* CFieldBookReader::AddPoint(std::string name, double x, double y, double z, std::string code) {
-    return Result().validPoint(m_txt, std::make_unique<CPointGen>(std::move(name), x, y, z, std::move(code)));
+    return Result().validPoint(m_txt, std::make_unique<CPointGen>(std::move(name), Length(x), Length(y),
+                                                                  Length(z), std::move(code)));
 }
 
 void CFieldBookReader::AddHeaderComment(std::string_view label, std::string_view value) {

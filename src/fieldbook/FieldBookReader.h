@@ -112,8 +112,10 @@ protected:
     void LineUnknownStation(int number);
     void Print(std::string_view text);
 
-    // ---- Elements. Each normalises the identifier, checks the element through the store (which says
-    // in the text window why it refuses one) and appends it; the element kept, or null.
+    // ---- Elements. Each normalises the identifier, rounds angles to 0.01 µgr and lengths to the
+    // micrometre (the noise of unit conversions gone, every recorded digit kept), checks the element
+    // through the store (which says in the text window why it refuses one) and appends it; the element
+    // kept, or null.
     CStation* AddStation(std::string name, double hi = 0.0, double v0 = kUndefined, std::string code = {});
     CReference* AddReference(std::string point, double hp, double ah, double av, double di,
                              std::string code = {});

@@ -34,7 +34,7 @@ CCarnet EveryKind() {
     c.Add(std::make_unique<CStation>("S1", 1.562, kUndefined, "ST"), kKindStation);
     c.Add(std::make_unique<CReference>("A1", 1.3, 323.76206, 99.40145, 260.0083), kKindReference);
     c.Add(std::make_unique<CCommande>("ExcentRad", "0.15"), kKindExcentrement);
-    c.Add(std::make_unique<CMesure>("102", 0.0, 388.64623, kUndefined, 0.1 + 0.2, "POTEAU \"bois\""),
+    c.Add(std::make_unique<CMesure>("102", 0.0, 388.64623, kUndefined, 12.345678, "POTEAU \"bois\""),
           kKindMesure);
     c.Add(std::make_unique<CCommande>("ARB 4.5"), kKindCommand);
     auto lamp = std::make_unique<CCommande>("Lampadaire", "12 ; bis", "102");

@@ -5,6 +5,7 @@
 #include "core/Strings.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/TableCode.h"
+#include "geobase/GeoFile.h"
 #include "settings/CalcOptions.h"
 
 #include <gtest/gtest.h>
@@ -163,4 +164,23 @@ TEST(ReaderSkeleton, AWindows1252FieldBookKeepsItsAccents) {
     ASSERT_EQ(run.result.GetSize(), 1);
     EXPECT_EQ(static_cast<const CComment*>(run.result.GetAt(0))->text(), "Opérateur            = J. Bérard");
     EXPECT_EQ(run.frontEnd.lines[0], "Carnet <" + dir / "carnet.txt" + "> : fichier lu en Windows-1252.");
+}
+
+// Unit conversions leave binary noise (a face-right reading turned by 200 gr, feet into metres, 0.1 + 0.2):
+// the elements keep every digit an instrument records and nothing more, so the GéoBase reads as the book.
+TEST(ReaderSkeleton, ValuesKeepTheRecordedDigitsWithoutTheNoiseOfConversions) {
+    class Converting : public CFieldBookReader {
+        void ReadLine(std::string_view, int) override {
+            AddStation("S1", 0.1 + 0.2, 357.4134 - 200.0);
+            AddMesure("P1", 5.0 * 0.3048, 157.41340000000002, 1.0 / 3.0, 12.34567891);
+            AddPoint("P1", 651200.0 + 0.1 + 0.2, 6862300.1234567, kUndefined);
+        }
+    };
+    ReaderRun<Converting> run;
+    const CCarnet& read = run.Read("une ligne\n");
+    ASSERT_EQ(read.GetSize(), 3);
+    EXPECT_EQ(ElementLine(*read.GetAt(0), read.GetType(0)), "1001\tS1\t0.3\t157.4134");
+    EXPECT_EQ(ElementLine(*read.GetAt(1), read.GetType(1)),
+              "1003\tP1\t1.524\t157.4134\t0.33333333\t12.345679");
+    EXPECT_EQ(ElementLine(*read.GetAt(2), read.GetType(2)), "1006\tP1\t651200.3\t6862300.123457\t-999999\t-");
 }
