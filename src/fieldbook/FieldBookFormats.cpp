@@ -87,4 +87,11 @@ std::string BesideCarnet(std::string_view carnet, std::string_view extension) {
     return ReplaceExtension(std::string(carnet), std::string(extension));
 }
 
+std::string TemporaryBesideCarnet(std::string_view carnet) {
+    std::string temporary = BesideCarnet(carnet, "tmp");
+    while (temporary == carnet || FileExists(temporary))
+        temporary += ".tmp";
+    return temporary;
+}
+
 } // namespace pyr

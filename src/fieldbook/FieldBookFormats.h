@@ -74,4 +74,9 @@ std::string InstallationConfigFile(std::string_view installDir, std::string_view
 // "%s%s%s.<extension>": the field book's drive, folder and name with another extension, beside it.
 std::string BesideCarnet(std::string_view carnet, std::string_view extension);
 
+// The temporary file a conversion writes beside the field book and deletes: "%s%s%s.tmp", or, when that
+// name is the field book itself or a file already there (the surveyor's own), the same with ".tmp" added
+// until the name is free, so that no file of the surveyor's is written over or deleted.
+std::string TemporaryBesideCarnet(std::string_view carnet);
+
 } // namespace pyr

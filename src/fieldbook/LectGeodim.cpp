@@ -163,9 +163,8 @@ void CLectGeodim::ReadLine(std::string_view line, int number) {
 void CLectGeodim::EndReading() {
     std::string records = std::move(m_records);
     m_records = {};
-    // A field book already named ".tmp" is read in memory: its copy would overwrite it.
-    const std::string temporary = Path().empty() ? std::string() : BesideCarnet(Path(), "tmp");
-    if (temporary.empty() || temporary == Path()) return ReadRecords(records);
+    if (Path().empty()) return ReadRecords(records);
+    const std::string temporary = TemporaryBesideCarnet(Path());
 
     TemporaryFile copy(temporary);
     std::string back;

@@ -18,8 +18,7 @@ bool CQuendalPivot::Read(const std::string& path, CCarnet& result) {
     if (!m_importer || !Driver() || !m_importer(*Driver(), path, records, TextWindow(), Parent()))
         return false;
 
-    std::string temporary = BesideCarnet(path, "tmp");
-    if (temporary == path) temporary += ".tmp"; // never over the field book itself
+    const std::string temporary = TemporaryBesideCarnet(path);
     if (!CDlgConfigQdl::Export(records, temporary, "w", {}, Parent())) return false;
 
     CQuendalReader quendal;

@@ -37,6 +37,7 @@ TEST(SepColConversion, TheSameSurveyInTheThreeFormatsGivesTheSameGeoBase) {
     const std::string csv = copy("leve-separateur.csv");
     WriteBytes(csv, ReadBytes(csv) + "XX;205\n");
     const std::string delimited = convert(FieldBookFormat::Separateur, csv, copy("leve.sep"));
+    WriteBytes(dir / "leve-colonne.tmp", "à garder\n"); // the surveyor's own file, not ours to touch
     const std::string columnar =
         convert(FieldBookFormat::Colonne, copy("leve-colonne.txt"), copy("leve.col"));
     std::vector<std::string> errors;
@@ -46,9 +47,10 @@ TEST(SepColConversion, TheSameSurveyInTheThreeFormatsGivesTheSameGeoBase) {
     EXPECT_EQ(errors, (std::vector<std::string>{"Erreur ligne 14 : donnée non reconnue !"}));
     EXPECT_EQ(delimited, quendal);
     EXPECT_EQ(columnar, quendal);
-    // The temporary Quendal-Pc files are gone.
+    // The temporary Quendal-Pc files are gone, and the one that was there before is kept.
     EXPECT_FALSE(fs::exists(dir / "leve-separateur.tmp"));
-    EXPECT_FALSE(fs::exists(dir / "leve-colonne.tmp"));
+    EXPECT_EQ(ReadBytes(dir / "leve-colonne.tmp"), "à garder\n");
+    EXPECT_FALSE(fs::exists(dir / "leve-colonne.tmp.tmp"));
 
     // And the GéoBase holds the survey: a comment, three points, two stations and their sightings, a code.
     CCarnet geoBase;

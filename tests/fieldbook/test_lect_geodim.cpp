@@ -121,7 +121,7 @@ TEST(LectGeodim, EveryLineIsReadOrReportedWithItsNumber) {
 }
 
 // The records go through a temporary file beside the field book, deleted at the end; a field book that
-// itself ends in ".tmp" is read where it lies and kept.
+// itself ends in ".tmp" is read where it lies and kept, and so is a ".tmp" already there.
 TEST(LectGeodim, TheTemporaryCopyIsDeletedAndNeverReplacesTheFieldBook) {
     TempDir dir;
     const std::string job = dir / "levé.job", copy = dir / "levé.tmp";
@@ -134,4 +134,9 @@ TEST(LectGeodim, TheTemporaryCopyIsDeletedAndNeverReplacesTheFieldBook) {
                       "; 1001 S; 1003 A; ");
         EXPECT_EQ(std::filesystem::exists(copy), path == copy);
     }
+    // A ".tmp" of the surveyor's beside the field book is neither written over nor deleted.
+    GeodimRun again;
+    ASSERT_TRUE(again.reader.Read(job, again.result));
+    EXPECT_EQ(ReadBytes(copy), "2=S\n5=A\n7=1\n");
+    EXPECT_FALSE(std::filesystem::exists(copy + ".tmp"));
 }
