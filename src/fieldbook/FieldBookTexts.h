@@ -96,7 +96,6 @@ inline constexpr const char* kDatumNorth = "la coordonnée Nord";
 
 // Lines skipped.
 inline constexpr const char* kRefused = "Erreur ligne %d : donnée refusée par les contrôles de la GéoBase !";
-inline constexpr const char* kNoStationForSighting = "Erreur ligne %d : pas de station pour cette visée !";
 
 // A field book that starts measuring without saying where the instrument stands (the polar output of
 // many instruments): its first sightings go to a station of this name, which the surveyor renames.

@@ -309,7 +309,7 @@ void CLectNikon::ReadShot(int number, bool backsight) {
     std::string_view point = PointOf(f[1], idPlace ? f[2] : std::string_view());
     if (point.empty() && backsight) point = m_backsight;
     if (point.empty()) return LineMissing(number, fb::kDatumPoint);
-    if (!m_hasStation) return LineError(fb::kNoStationForSighting, number);
+    if (!StationInForce(number)) return;
     double hp = kUndefined, di = kUndefined, ah = kUndefined, av = kUndefined;
     if (!Length(f[first], m_settings.distances, hp, number) ||
         !Length(f[first + 1], m_settings.distances, di, number) ||
@@ -358,7 +358,7 @@ void CLectNikon::ReadDtm(int number) {
             OpenStation(name, hi, number);
             return;
         }
-        if (!m_hasStation) return LineError(fb::kNoStationForSighting, number);
+        if (!StationInForce(number)) return;
         double di = kUndefined, ah = kUndefined, av = kUndefined, hp = kUndefined;
         if (!Length(f[4], distances, di, number) || !Angle(f[5], angles, ah, number) ||
             !Zenith(f[6], angles, true, av, number) || !Length(f[7], distances, hp, number))
@@ -417,6 +417,15 @@ bool CLectNikon::Zenith(std::string_view text, AngleUnit unit, bool fromZenith, 
                         int number) const {
     if (!Angle(text, unit, grads, number)) return false;
     if (!fromZenith && IsKnown(grads)) grads = WrapGrads(100.0 - grads);
+    return true;
+}
+
+// A sighting before any station goes to a station "INCONNUE" that the surveyor renames: nothing measured
+// is lost.
+bool CLectNikon::StationInForce(int number) {
+    if (m_hasStation) return true;
+    if (!OpenStation(fb::kUnknownStation, kUndefined, number)) return false;
+    LineUnknownStation(number);
     return true;
 }
 

@@ -59,6 +59,7 @@ private:
     bool Angle(std::string_view text, AngleUnit unit, double& grads, int number) const;
     bool Zenith(std::string_view text, AngleUnit unit, bool fromZenith, double& grads, int number) const;
     bool OpenStation(std::string_view name, double hi, int number);
+    bool StationInForce(int number);
     bool AddPosition(std::string_view name, double first, double second, double elevation,
                      std::string_view code, int number);
     void AddSighting(std::string_view point, bool reference, double hp, double ah, double av, double di,

@@ -335,8 +335,10 @@ bool CLectSokkia::StationFor(std::string_view from, int number) {
     const std::string_view name = FormMatView(from);
     if (name.empty() || (m_station && name == m_stationName)) {
         if (m_station) return true;
-        LineError(fb::kNoStationForSighting, number);
-        return false;
+        // Nothing measured is lost: the sightings go to a station the surveyor renames.
+        if (!OpenStation(fb::kUnknownStation, kUndefined, number)) return false;
+        LineUnknownStation(number);
+        return true;
     }
     CloseStation();
     if (TextWindow()) TextWindow()->Print(text::kStationOpened, number, std::string(name).c_str());

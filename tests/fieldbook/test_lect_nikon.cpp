@@ -181,7 +181,7 @@ TEST(LectNikon, EveryLineIsReadOrReportedWithItsNumber) {
                                    "SS,P4,1.3,10,0,450,10:00:00,\n"
                                    "SS,P5,1.3,10,0,100,10:00:00,\n");
     EXPECT_EQ(ReportText(run),
-              "Erreur ligne 1 : pas de station pour cette visée !\n"
+              "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"
               "Erreur ligne 3 : valeur numérique incorrecte <1O.5> !\n"
               "Erreur ligne 4 : donnée non reconnue !\n"
               "Erreur ligne 5 : donnée manquante pour la coordonnée Nord !\n"
@@ -194,6 +194,9 @@ TEST(LectNikon, EveryLineIsReadOrReportedWithItsNumber) {
               "Visée <P4> : angle zénithal incorrect (450 gr, entre 0 et 400) : elle n'est pas ajoutée à la "
               "GéoBase !\n"
               "Erreur ligne 11 : donnée refusée par les contrôles de la GéoBase !\n");
+    // The sighting before any station is kept, under a station to rename.
+    EXPECT_TRUE(ElementsSummary(read).starts_with("1001 INCONNUE; 1003 P0; 1001 S1;"))
+        << ElementsSummary(read);
     EXPECT_TRUE(
         ElementsSummary(read).ends_with("1001 S1; 1000 Unité des angles     = Radians; "
                                         "1000 Format               = Nikon DTM (virgules); 1003 P5; "))

@@ -182,7 +182,7 @@ TEST(LectSokkia, LinesReportedWithTheirNumbers) {
         {Station("S1", "2000", ""), "Erreur ligne 1 : donnée manquante pour la coordonnée Est !\n"},
         {"03NM" + Re("1.5") + "1234567890\n", "Attention : ligne 1 de longueur incorrecte (30 / 20) !\n"},
         {Observation("P", "10", "100", "0", "", "F1", ""),
-         "Erreur ligne 1 : pas de station pour cette visée !\n"},
+         "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"},
         {Observation("P", "10", "100", "0", "", "F1", "S9"),
          "Attention : ligne 1 : visées depuis <S9> sans enregistrement de station, station ouverte sans "
          "hauteur "
