@@ -419,10 +419,8 @@ InstrumentSettings ReadInstrumentSettings(const CParamDriver* driver, Coordinate
         defaults.order = order;
         return defaults;
     }
-    const std::string& computed = driver->Text(kKeyPointsCalcules);
-    return {driver->Angles(),         driver->Distances(),
-            driver->Order(),          driver->References(),
-            driver->ReferenceCodes(), computed == "1" || EqualIgnoringCase(computed, "oui")};
+    return {driver->Angles(),     driver->Distances(),      driver->Order(),
+            driver->References(), driver->ReferenceCodes(), driver->Text(kKeyPointsCalcules) == "1"};
 }
 
 RecordLayout CParamDriver::Layout() const {
