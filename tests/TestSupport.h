@@ -8,6 +8,14 @@
 #include <sstream>
 #include <string>
 #include <string_view>
+#include <unistd.h>
+
+// Tests of access rights live in suites named "...AsUser": root, who may write everywhere, skips them,
+// and CTest runs them again as an unprivileged person (tests/as-user).
+#define SKIP_WHEN_ROOT()                                                                                     \
+    do {                                                                                                     \
+        if (geteuid() == 0) GTEST_SKIP() << "root may write everywhere: run again as a user by CTest";       \
+    } while (false)
 
 // A real temporary folder for a test, removed with everything in it at the end.
 class TempDir {

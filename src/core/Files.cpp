@@ -109,8 +109,28 @@ std::string SystemErrorText(int errnum) {
         return "trop de fichiers ouverts";
     case EIO:
         return "erreur d'entrée-sortie";
+    case EFBIG:
+        return "fichier trop grand pour la limite de taille permise";
+    case EDQUOT:
+        return "quota du disque dépassé";
+    case EEXIST:
+        return "un fichier de ce nom existe déjà";
+    case ELOOP:
+        return "trop de liens symboliques";
+    case EBUSY:
+    case ETXTBSY:
+        return "fichier en cours d'utilisation";
+    case EXDEV:
+        return "déplacement impossible d'un disque à un autre";
+    case EINVAL:
+        return "ce n'est pas un fichier ordinaire";
+    case ENOTEMPTY:
+        return "dossier non vide";
+    case ENXIO:
+    case ENODEV:
+        return "périphérique absent";
     default:
-        return "erreur système " + std::to_string(errnum);
+        return "erreur du système (code " + std::to_string(errnum) + ")";
     }
 }
 

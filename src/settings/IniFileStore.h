@@ -1,5 +1,7 @@
 #pragma once
 
+#include "core/SafeFile.h"
+
 #include <memory>
 #include <string>
 #include <string_view>
@@ -48,11 +50,5 @@ private:
     struct Impl;
     std::unique_ptr<Impl> impl_;
 };
-
-// Replaces the file's contents with `bytes`, atomically: a temporary file in the same folder, given the
-// file's permissions, then renamed over it. A symbolic link is followed, so the link stays a link. A file
-// that exists but may not be written is refused with EACCES, as writing it in place would be. Returns 0 or
-// the errno of the failure.
-int ReplaceFileContents(const std::string& path, std::string_view bytes);
 
 } // namespace pyr

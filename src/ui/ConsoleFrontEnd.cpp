@@ -188,6 +188,7 @@ void ConsoleFrontEnd::SetCommand(std::string name, std::vector<std::string> argu
     m_command = std::move(name);
     m_arguments = std::move(arguments);
     m_status = 0;
+    ResetFailures();
 }
 
 DialogResult ConsoleFrontEnd::DoModal(DialogModel& dialog) {

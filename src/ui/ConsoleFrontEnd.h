@@ -24,9 +24,9 @@ public:
     // The command being run and the words after its name: DoModal applies them to the dialog.
     void SetCommand(std::string name, std::vector<std::string> arguments);
     // What the last command came to: 0 it ran (closed with OK or cancelled), 1 refused or failed (a
-    // message said why), 2 bad usage; the worst of its dialogs when it runs several. SetCommand resets it
-    // to 0.
-    int Status() const { return m_status; }
+    // message said why, a failure was reported), 2 bad usage; the worst of its dialogs when it runs
+    // several. SetCommand resets it to 0.
+    int Status() const { return m_status == 0 && Failures() > 0 ? 1 : m_status; }
     // Shows the prompt on the error stream and reads the line typed; nothing at the end of the input.
     std::optional<std::string> Prompt(std::string_view prompt);
 

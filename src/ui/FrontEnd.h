@@ -50,6 +50,20 @@ public:
     // Shows a file to the person (a listing once written, a file they asked to see) in the platform's
     // viewer.
     virtual void ShowFile(const std::string& path) = 0;
+
+    // A message that says something asked for could not be done (a GéoBase, a listing, a journal or the
+    // settings not written; a field book without data): shown as a message box captioned "PYRALIS", and
+    // the command running then ends on a failure status whatever its dialog comes to.
+    void ReportFailure(std::string_view text, int icon = kIconWarning) {
+        ++m_failures;
+        MessageBox(text, kCaption, icon);
+    }
+    // The failures reported since the last ResetFailures (a host resets them before each command).
+    int Failures() const { return m_failures; }
+    void ResetFailures() { m_failures = 0; }
+
+private:
+    int m_failures = 0;
 };
 
 // The application's own front end: what a message without a parent window goes to. The console until a

@@ -105,8 +105,10 @@ TEST_F(ParamStore, NullAndEmptyNames) {
                                         "Pointeur nul pour le fichier de paramètres !\n(Code d'erreur 22)"}));
 }
 
-TEST_F(ParamStore, AFileThatCannotBeReadIsNotWrittenOverAndIsNamedWithTheSystemCode) {
-    if (geteuid() == 0) GTEST_SKIP() << "root reads every file";
+class ParamStoreAsUser : public ParamStore {};
+
+TEST_F(ParamStoreAsUser, AFileThatCannotBeReadIsNotWrittenOverAndIsNamedWithTheSystemCode) {
+    SKIP_WHEN_ROOT();
     WriteBytes(path, "[A]\nx=0\n");
     ASSERT_EQ(chmod(path.c_str(), 0200), 0);
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 1));
