@@ -6,6 +6,7 @@
 #include "hostrt/HostRuntime.h"
 #include "ui/ConsoleFrontEnd.h"
 
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
@@ -88,6 +89,9 @@ void Prompt(pyr::ui::ConsoleFrontEnd& console) {
 } // namespace
 
 int main(int argc, char** argv) {
+    // A file grown past the size limit of the session (ulimit -f) must fail its write, as a full disk
+    // does, rather than end the program: the safe writers then leave every file as it was.
+    std::signal(SIGXFSZ, SIG_IGN);
     const HostOptions options = ParseHostOptions(std::vector<std::string>(argv + 1, argv + argc));
     if (!options.error.empty()) {
         std::fprintf(stderr, "pyralis : %s\n\n%s", options.error.c_str(), kUsage);
