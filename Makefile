@@ -3,6 +3,7 @@
 #   make check   install what is missing, build with AddressSanitizer and UBSan, run every test
 #   make bench   build in Release and run the benchmarks
 #   make fuzz    build the fuzz targets with clang and run each for FUZZ_SECONDS (60) seconds
+#   make fiabilite  build in Release and kill pyralis 1 000 times while it saves a 100 000-element GéoBase
 #   make format  apply .clang-format to every source file
 
 JOBS ?= $(shell nproc)
@@ -11,10 +12,11 @@ CHECK_DIR := build/check
 FUZZ_DIR := build/fuzz
 FUZZ_SECONDS ?= 60
 FUZZ_TARGETS := fuzz_geo_load fuzz_sepcol fuzz_gsi fuzz_quendal fuzz_geodim fuzz_nikon fuzz_sokkia \
-	fuzz_topcon fuzz_zeiss
+	fuzz_topcon fuzz_zeiss fuzz_param_file fuzz_code_table
+KILLS ?= 1000
 DEMO_DIR := build/demo-out
 
-.PHONY: all deps release demo check bench fuzz format clean
+.PHONY: all deps release demo check bench fuzz fiabilite format clean
 
 all: release
 
@@ -58,6 +60,9 @@ fuzz: deps
 		-DPYR_TESTS=OFF -DPYR_FUZZ=ON
 	cmake --build $(FUZZ_DIR) -j $(JOBS) --target $(FUZZ_TARGETS)
 	bash fuzz/run $(FUZZ_DIR) $(FUZZ_SECONDS) $(FUZZ_TARGETS)
+
+fiabilite: release
+	bash tests/kill-save $(RELEASE_DIR)/bin/pyralis $(KILLS)
 
 format:
 	git ls-files '*.cpp' '*.h' | xargs clang-format -i
