@@ -370,7 +370,10 @@ bool CCalculV0Sta::Enregistrer() {
 std::string CCalculV0Sta::Close(bool saved) {
     if (saved) WriteSettings();
     std::string listing = WriteListing();
-    if (m_written && m_journal && JournalWanted(Inputs().paramPath)) m_journal->Append();
+    // A journal that cannot be completed is told to the front end as a failure of the command; the
+    // GéoBase, already saved, stands.
+    if (m_written && m_journal && m_frontEnd && JournalWanted(Inputs().paramPath))
+        m_journal->Append(*m_frontEnd);
     return listing;
 }
 

@@ -51,7 +51,9 @@ public:
     bool Open(ui::FrontEnd& frontEnd);
     // Closes the dialog, after "&Enregistrer" (`saved`) or "Annuler": with results, the listing is
     // offered (or written at once when it was asked for); after "&Enregistrer", the settings of the
-    // dialog are kept and the journal receives the stations written. Returns the listing's path, or "".
+    // dialog are kept and the journal receives the stations written. A listing, a journal or settings
+    // that cannot be written are told to the front end (the file and why) as failures of the command;
+    // the GéoBase saved stands. Returns the listing's path, or "".
     std::string Close(bool saved);
 
     // ---- Settings of the dialog ("Calcul_V0"), read when it opens

@@ -1,18 +1,24 @@
 #include "IniFileStore.h"
 
+#include "ParamStore.h"
+#include "SettingsMessages.h"
 #include "SettingsText.h"
 #include "core/Files.h"
 #include "core/Lines.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <climits>
 #include <cstdint>
+#include <cstdio>
 #include <cstdlib>
 #include <cstring>
 #include <fcntl.h>
 #include <filesystem>
+#include <optional>
+#include <set>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -35,7 +41,13 @@ constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
 // A stray line (neither section, key, comment nor blank) would be dropped by the library's reader. It
 // is handed over as a comment carrying this mark, and the mark taken off again when the file is written.
+// A comment of the file that starts with the mark itself gets a second one, so that it keeps the first.
 constexpr std::string_view kStrayMark = ";\x01";
+
+bool StartsWithStrayMark(std::string_view line) {
+    const std::size_t first = line.find_first_not_of(" \t");
+    return first != std::string_view::npos && line.substr(first).starts_with(kStrayMark);
+}
 
 enum class LineKind { Blank, Comment, Section, Entry, Stray };
 
@@ -52,10 +64,88 @@ LineKind Classify(std::string_view line) {
     return equals != std::string_view::npos && equals != first ? LineKind::Entry : LineKind::Stray;
 }
 
-// UTF-8 back to Windows-1252, for a file that was read in that code page. The five holes of the code
-// page come back from the C1 controls they were read as; what the code page cannot hold becomes '?'.
-// A byte that does not start a valid UTF-8 sequence is kept as it is.
-std::string Utf8ToWindows1252(std::string_view text) {
+// The length of the well-formed UTF-8 character at `p` (overlong forms, surrogates and code points past
+// U+10FFFF are not), its code point in `cp`; 0 when there is none.
+std::size_t Utf8Sequence(const std::uint8_t* p, const std::uint8_t* end, char32_t& cp) {
+    const std::uint8_t c = *p;
+    const int extra = c >= 0xF0 && c <= 0xF4   ? 3
+                      : c >= 0xE0 && c <= 0xEF ? 2
+                      : c >= 0xC2 && c <= 0xDF ? 1
+                                               : 0;
+    if (c < 0x80) {
+        cp = c;
+        return 1;
+    }
+    if (extra == 0 || end - p <= extra) return 0;
+    cp = c & (0x3F >> extra);
+    for (int i = 1; i <= extra; ++i) {
+        if ((p[i] & 0xC0) != 0x80) return 0;
+        cp = (cp << 6) | (p[i] & 0x3F);
+    }
+    if ((extra == 2 && cp < 0x800) || (extra == 3 && (cp < 0x10000 || cp > 0x10FFFF)) ||
+        (cp >= 0xD800 && cp <= 0xDFFF))
+        return 0;
+    return static_cast<std::size_t>(extra) + 1;
+}
+
+// Bytes that a line of the file cannot carry are kept as U+EF00 + byte, three bytes of UTF-8: EE, then
+// BC to BF for the byte's two high bits, then 80 to BF for its six low ones.
+constexpr char32_t kEscapeFirst = 0xEF00;
+constexpr char32_t kEscapeLast = 0xEFFF;
+
+void AppendEscapedByte(std::string& out, std::uint8_t byte) {
+    out += static_cast<char>(0xEE);
+    out += static_cast<char>(0xBC | (byte >> 6));
+    out += static_cast<char>(0x80 | (byte & 0x3F));
+}
+
+// The text as the file keeps it: valid UTF-8 without NUL, CR or LF, each byte that is not so escaped.
+std::string EscapeForFile(std::string_view text) {
+    std::string out;
+    out.reserve(text.size());
+    const auto* p = reinterpret_cast<const std::uint8_t*>(text.data());
+    const auto* end = p + text.size();
+    while (p < end) {
+        char32_t cp = 0;
+        const std::size_t length = Utf8Sequence(p, end, cp);
+        const bool escaped =
+            length == 0 || cp == 0 || cp == '\n' || cp == '\r' || (cp >= kEscapeFirst && cp <= kEscapeLast);
+        if (!escaped) {
+            out.append(reinterpret_cast<const char*>(p), length);
+            p += length;
+            continue;
+        }
+        for (const auto* last = p + std::max<std::size_t>(length, 1); p < last; ++p)
+            AppendEscapedByte(out, *p);
+    }
+    return out;
+}
+
+// The bytes that the file's text stands for.
+std::string UnescapeFromFile(std::string_view text) {
+    if (text.find('\xEE') == std::string_view::npos) return std::string(text);
+    std::string out;
+    out.reserve(text.size());
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        const auto c = static_cast<std::uint8_t>(text[i]);
+        if (c == 0xEE && i + 2 < text.size()) {
+            const auto second = static_cast<std::uint8_t>(text[i + 1]);
+            const auto third = static_cast<std::uint8_t>(text[i + 2]);
+            if (second >= 0xBC && second <= 0xBF && (third & 0xC0) == 0x80) {
+                out += static_cast<char>(((second & 0x03) << 6) | (third & 0x3F));
+                i += 2;
+                continue;
+            }
+        }
+        out += static_cast<char>(c);
+    }
+    return out;
+}
+
+// UTF-8 back to Windows-1252, for a file that was read in that code page; nothing when the text holds a
+// character the code page lacks. The five holes of the code page come back from the C1 controls they
+// were read as.
+std::optional<std::string> Utf8ToWindows1252(std::string_view text) {
     static constexpr char16_t kHighHalf[32] = {
         0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
         0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
@@ -66,39 +156,42 @@ std::string Utf8ToWindows1252(std::string_view text) {
     const auto* p = reinterpret_cast<const std::uint8_t*>(text.data());
     const auto* end = p + text.size();
     while (p < end) {
-        const std::uint8_t c = *p;
-        int extra = c >= 0xF0 && c <= 0xF4 ? 3 : c >= 0xE0 && c <= 0xEF ? 2 : c >= 0xC2 && c <= 0xDF ? 1 : 0;
-        if (c < 0x80 || extra == 0 || end - p <= extra) {
-            out += static_cast<char>(c);
-            ++p;
+        if (*p < 0x80) {
+            out += static_cast<char>(*p++);
             continue;
         }
-        char32_t cp = c & (0x3F >> extra);
-        bool valid = true;
-        for (int i = 1; i <= extra && valid; ++i) {
-            valid = (p[i] & 0xC0) == 0x80;
-            cp = (cp << 6) | (p[i] & 0x3F);
-        }
-        if (!valid) {
-            out += static_cast<char>(c);
-            ++p;
-            continue;
-        }
-        p += extra + 1;
+        char32_t cp = 0;
+        const std::size_t length = Utf8Sequence(p, end, cp);
+        if (length == 0) return std::nullopt;
+        p += length;
         if (cp >= 0xA0 && cp <= 0xFF) {
             out += static_cast<char>(cp);
             continue;
         }
-        char replacement = '?';
-        for (int i = 0; i < 32; ++i) {
-            if (kHighHalf[i] == cp) {
-                replacement = static_cast<char>(0x80 + i);
-                break;
-            }
-        }
-        out += replacement;
+        const auto* found = std::find(std::begin(kHighHalf), std::end(kHighHalf), cp);
+        if (found == std::end(kHighHalf)) return std::nullopt;
+        out += static_cast<char>(0x80 + (found - std::begin(kHighHalf)));
     }
     return out;
+}
+
+// A value quoted twice ("\"C:\\a.geo\"" between quotes) loses one pair when read, and would lose the
+// second when written back and read again: its first inner quote is escaped, so that it reads the same
+// every time.
+std::string KeepInnerQuotes(std::string_view line) {
+    const std::size_t equals = line.find('=');
+    std::string_view value = line.substr(equals + 1);
+    const std::size_t first = value.find_first_not_of(" \t");
+    if (first == std::string_view::npos) return std::string(line);
+    value = value.substr(first, value.find_last_not_of(" \t") - first + 1);
+    auto quoted = [](std::string_view text) {
+        return text.size() >= 2 && text.front() == '"' && text.back() == '"';
+    };
+    if (!quoted(value) || !quoted(value.substr(1, value.size() - 2))) return std::string(line);
+    std::string kept(line.substr(0, equals + 1));
+    AppendEscapedByte(kept, '"');
+    kept.append(value.substr(2, value.size() - 3));
+    return kept;
 }
 
 // Appends the lines of the library's output: stray lines get their text back, runs of blank lines
@@ -139,12 +232,29 @@ IniFile::~IniFile() = default;
 IniFile::IniFile(IniFile&&) noexcept = default;
 IniFile& IniFile::operator=(IniFile&&) noexcept = default;
 
+bool IsParamFileText(std::string_view bytes) {
+    if (bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF")) return false;
+    std::size_t controls = 0;
+    for (const char c : bytes) {
+        const auto byte = static_cast<unsigned char>(c);
+        if (byte == 0) return false;
+        const bool textControl =
+            byte == '\t' || byte == '\n' || byte == '\v' || byte == '\f' || byte == '\r' || byte == 0x1A;
+        if ((byte < 0x20 && !textControl) || byte == 0x7F) ++controls;
+    }
+    return controls * 32 <= bytes.size();
+}
+
 int IniFile::Load(const std::string& path) {
     std::string bytes;
     if (!ReadWholeFile(path, bytes)) {
         const int code = errno != 0 ? errno : EIO;
         Parse({});
         return code;
+    }
+    if (!IsParamFileText(bytes)) {
+        Parse({});
+        return kNotParamText;
     }
     Parse(bytes);
     return 0;
@@ -166,14 +276,17 @@ void IniFile::Parse(std::string_view bytes) {
         const LineKind kind = Classify(line);
         if (kind == LineKind::Section || kind == LineKind::Entry) {
             head += pendingMarked;
-            head.append(line);
+            if (kind == LineKind::Entry)
+                head += KeepInnerQuotes(line);
+            else
+                head.append(line);
             head += '\n';
             pendingMarked.clear();
             pendingRaw.clear();
             anyEntry = true;
             return;
         }
-        if (kind == LineKind::Stray) pendingMarked += kStrayMark;
+        if (kind == LineKind::Stray || StartsWithStrayMark(line)) pendingMarked += kStrayMark;
         pendingMarked.append(line);
         pendingMarked += '\n';
         pendingRaw.append(line);
@@ -187,22 +300,20 @@ void IniFile::Parse(std::string_view bytes) {
 }
 
 bool IniFile::HasSection(std::string_view section) const {
-    return impl_->ini.GetSection(std::string(section).c_str()) != nullptr;
+    return impl_->ini.GetSection(EscapeForFile(section).c_str()) != nullptr;
 }
 
 bool IniFile::Get(std::string_view section, std::string_view key, std::string& value) const {
-    const char* found = impl_->ini.GetValue(std::string(section).c_str(), std::string(key).c_str(), nullptr);
+    const char* found =
+        impl_->ini.GetValue(EscapeForFile(section).c_str(), EscapeForFile(key).c_str(), nullptr);
     if (!found) return false;
-    value = found;
+    value = UnescapeFromFile(found);
     return true;
 }
 
 void IniFile::Set(std::string_view section, std::string_view key, std::string_view value) {
-    auto utf8 = [](std::string_view text) {
-        return IsValidUtf8(text) ? std::string(text) : Windows1252ToUtf8(text);
-    };
-    const std::string sectionText = utf8(section);
-    std::string keyText = utf8(key);
+    const std::string sectionText = EscapeForFile(section);
+    std::string keyText = EscapeForFile(key);
     // A key already there keeps its spelling; the library would give it the caller's.
     CSimpleIniA::TNamesDepend keys;
     if (impl_->ini.GetAllKeys(sectionText.c_str(), keys)) {
@@ -213,8 +324,37 @@ void IniFile::Set(std::string_view section, std::string_view key, std::string_vi
             }
         }
     }
-    impl_->ini.SetValue(sectionText.c_str(), keyText.c_str(), utf8(value).c_str(), nullptr,
+    // The library quotes a value with blanks around it, and takes a pair of quotes off any value it
+    // reads: the first quote of a value that is itself quoted is escaped, so that it keeps both.
+    std::string valueText = EscapeForFile(value);
+    if (valueText.size() >= 2 && valueText.front() == '"' && valueText.back() == '"') {
+        std::string escapedQuote;
+        AppendEscapedByte(escapedQuote, '"');
+        valueText.replace(0, 1, escapedQuote);
+    }
+    impl_->ini.SetValue(sectionText.c_str(), keyText.c_str(), valueText.c_str(), nullptr,
                         /*forceReplace*/ true);
+}
+
+std::vector<IniFile::Entry> IniFile::Entries() const {
+    std::vector<Entry> entries;
+    CSimpleIniA::TNamesDepend sections;
+    impl_->ini.GetAllSections(sections);
+    sections.sort(CSimpleIniA::Entry::LoadOrder());
+    for (const auto& section : sections) {
+        CSimpleIniA::TNamesDepend keys;
+        impl_->ini.GetAllKeys(section.pItem, keys);
+        keys.sort(CSimpleIniA::Entry::LoadOrder());
+        for (const auto& key : keys) {
+            CSimpleIniA::TNamesDepend values;
+            impl_->ini.GetAllValues(section.pItem, key.pItem, values);
+            values.sort(CSimpleIniA::Entry::LoadOrder());
+            for (const auto& value : values)
+                entries.push_back({UnescapeFromFile(section.pItem), UnescapeFromFile(key.pItem),
+                                   UnescapeFromFile(value.pItem)});
+        }
+    }
+    return entries;
 }
 
 std::string IniFile::Bytes() const {
@@ -236,13 +376,76 @@ std::string IniFile::Bytes() const {
         }
         text = std::move(withCr);
     }
-    if (d.windows1252) text = Utf8ToWindows1252(text);
+    if (d.windows1252) {
+        if (auto inCodePage = Utf8ToWindows1252(text)) text = std::move(*inCodePage);
+    }
     if (d.byteOrderMark) text.insert(0, kByteOrderMark);
     return text;
 }
 
 int IniFile::Save(const std::string& path) const {
     return ReplaceFileContents(path, Bytes());
+}
+
+// --- Parameter files that are not text ---------------------------------------------------------------
+
+namespace {
+
+// The files already said not to be text, for the life of the program: every command reads many values,
+// and the person is told once. The host's one thread makes every call, so no lock.
+std::set<std::string>& ToldUnreadable() {
+    static std::set<std::string> told;
+    return told;
+}
+
+// Renames `from` to `to` unless a file already holds that name (EEXIST then), in one step where the file
+// system can.
+int RenameWithoutReplacing(const std::string& from, const std::string& to) {
+#ifdef RENAME_NOREPLACE
+    if (renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str(), RENAME_NOREPLACE) == 0) return 0;
+    if (errno != EINVAL && errno != ENOSYS && errno != ENOTSUP) return errno;
+#endif
+    struct stat info {};
+    if (lstat(to.c_str(), &info) == 0) return EEXIST;
+    return std::rename(from.c_str(), to.c_str()) == 0 ? 0 : errno;
+}
+
+} // namespace
+
+std::string FreeAsideName(const std::string& path) {
+    for (int number = 1;; ++number) {
+        std::string name = path + ".illisible";
+        if (number > 1) name += "." + std::to_string(number);
+        struct stat info {};
+        if (lstat(name.c_str(), &info) != 0) return name;
+    }
+}
+
+int LoadParamFileToRead(IniFile& file, const std::string& path) {
+    const int code = file.Load(path);
+    if (code == kNotParamText && ToldUnreadable().insert(path).second)
+        ShowParamMessage(nullptr, Sprintf(kMsgParamFileNotText, path.c_str()));
+    return code;
+}
+
+int LoadParamFileToWrite(IniFile& file, const std::string& path) {
+    const int code = file.Load(path);
+    if (code != kNotParamText) return code;
+    // Another program may take the free name between the look and the move: the next one is tried.
+    for (int attempt = 0; attempt < 100; ++attempt) {
+        const std::string aside = FreeAsideName(path);
+        const int moved = RenameWithoutReplacing(path, aside);
+        if (moved == EEXIST) continue;
+        if (moved != 0) return moved;
+        ToldUnreadable().erase(path);
+        ShowParamMessage(nullptr, Sprintf(kMsgParamFileSetAside, path.c_str(), aside.c_str()));
+        return ENOENT;
+    }
+    return EEXIST;
+}
+
+void ForgetUnreadableParamFiles() {
+    ToldUnreadable().clear();
 }
 
 } // namespace pyr

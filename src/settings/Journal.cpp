@@ -1,11 +1,11 @@
 #include "settings/Journal.h"
 
 #include "core/FrenchDate.h"
+#include "core/SafeFile.h"
 #include "core/Strings.h"
 #include "core/Undefined.h"
 #include "settings/CalcOptions.h"
 
-#include <cstdio>
 #include <filesystem>
 #include <string>
 
@@ -47,21 +47,22 @@ bool JournalWanted(std::string_view paramPath) {
     return ReadOptionSwitch(paramPath, kSectionListings, "ProduireJournal");
 }
 
-bool CJournal::Append(const std::tm& when) {
+bool CJournal::Append(ui::FrontEnd& frontEnd, const std::tm& when) {
     if (m_lines.empty()) return true;
     std::string text = JournalHeader(m_computation, when);
     for (const std::string& line : m_lines)
         text += line;
-    std::FILE* file = std::fopen(JournalPath(m_geoBasePath).c_str(), "ab");
-    if (!file) return false;
-    const bool written = std::fwrite(text.data(), 1, text.size(), file) == text.size();
-    const bool closed = std::fclose(file) == 0;
-    if (written && closed) m_lines.clear();
-    return written && closed;
+    const std::string path = JournalPath(m_geoBasePath);
+    if (const int code = AppendToFile(path, text); code != 0) {
+        frontEnd.ReportFailure(FileWriteFailure(path, code));
+        return false;
+    }
+    m_lines.clear();
+    return true;
 }
 
-bool CJournal::Append() {
-    return Append(LocalTimeNow());
+bool CJournal::Append(ui::FrontEnd& frontEnd) {
+    return Append(frontEnd, LocalTimeNow());
 }
 
 } // namespace pyr

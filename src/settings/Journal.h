@@ -1,5 +1,7 @@
 #pragma once
 
+#include "ui/FrontEnd.h"
+
 #include <ctime>
 #include <string>
 #include <string_view>
@@ -47,10 +49,12 @@ public:
     bool IsEmpty() const { return m_lines.empty(); }
 
     // Appends the header and the lines to the journal, then forgets them. Nothing is written when no
-    // line was gathered. False when the file cannot be opened or written (the lines are kept, so that
-    // a later call may still write them).
-    bool Append(const std::tm& when);
-    bool Append();
+    // line was gathered. The journal is completed through a copy of it renamed over it, so that an
+    // append cut short (a full disk) leaves it whole. When it cannot be written, the front end is told
+    // which file and why, as a failure of the command, and the lines are kept, so that a later call may
+    // still write them. Returns whether the lines were written.
+    bool Append(ui::FrontEnd& frontEnd, const std::tm& when);
+    bool Append(ui::FrontEnd& frontEnd);
 
 private:
     std::string m_geoBasePath;

@@ -4,7 +4,6 @@
 #include "core/Strings.h"
 #include "settings/CalcOptions.h"
 
-#include <cstdio>
 #include <filesystem>
 
 namespace pyr {
@@ -62,13 +61,16 @@ std::string WriteComputationListing(ui::FrontEnd& frontEnd, const ListingRequest
     }
 
     // A plain-text listing may gather the runs of several days; the person says whether this one
-    // continues it. A rich-text document cannot be continued: it is replaced without a word.
-    if (!richText && FileExists(path) &&
-        frontEnd.Ask(Sprintf(kMsgListingExists, path.c_str()), ui::kCaption, ui::Buttons::YesNo,
-                     ui::Answer::Yes) == ui::Answer::No)
-        std::remove(path.c_str());
+    // continues it. A rich-text document cannot be continued: it is replaced without a word. Replacing
+    // never removes the old listing first: the new one takes its place once written whole.
+    const bool complete = !richText && FileExists(path) &&
+                          frontEnd.Ask(Sprintf(kMsgListingExists, path.c_str()), ui::kCaption,
+                                       ui::Buttons::YesNo, ui::Answer::Yes) == ui::Answer::Yes;
 
-    if (!listing.OpenListing(path, richText ? "w" : "a")) return {};
+    if (!listing.OpenListing(path, complete ? "a" : "w")) {
+        frontEnd.ReportFailure(listing.FailureText());
+        return {};
+    }
     if (listing.GetFormat() != kListingTextNoPageCount) listing.SetPageCount(true);
     listing.SetEcho(false);
 
@@ -79,7 +81,10 @@ std::string WriteComputationListing(ui::FrontEnd& frontEnd, const ListingRequest
         if (request.writeResult) request.writeResult(listing, i);
         listing.WriteFooter();
     }
-    listing.CloseListing(path, ReadOptionSwitch(request.paramPath, kSectionListings, kKeyShowListing));
+    if (!listing.CloseListing(path, ReadOptionSwitch(request.paramPath, kSectionListings, kKeyShowListing))) {
+        frontEnd.ReportFailure(listing.FailureText());
+        return {};
+    }
     return path;
 }
 

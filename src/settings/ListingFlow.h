@@ -30,8 +30,10 @@ struct ListingRequest {
     std::string path;
 };
 
-// Writes the listing and returns its path, or "" when nothing was written (no result, No to the
-// question, a file that cannot be opened: a listing is never worth stopping a computation for).
+// Writes the listing and returns its path, or "" when nothing was written: no result, No to the
+// question, or a listing that could not be written (a folder that does not exist, a full disk). That
+// last one is told to the front end, naming the file and the reason, as a failure of the command; the
+// file stays as it was, and the computation's results (in the GéoBase) stand.
 std::string WriteComputationListing(ui::FrontEnd& frontEnd, const ListingRequest& request);
 
 // The heading of one result: the title, the GéoBase, the date, the tolerances when asked for, an empty

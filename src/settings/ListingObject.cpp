@@ -21,9 +21,7 @@ constexpr std::string_view kHeaderName = "PYRALIS Calculs Topo";
 
 CDlgCfgListing::CDlgCfgListing(ui::FrontEnd& parent) : m_frontEnd(parent) {}
 
-CDlgCfgListing::~CDlgCfgListing() {
-    if (m_file) CloseListing(m_fileName, false);
-}
+CDlgCfgListing::~CDlgCfgListing() = default;
 
 void CDlgCfgListing::SetFormat(int format) {
     m_format = std::clamp(format, 0, 2);
@@ -50,12 +48,17 @@ std::string CDlgCfgListing::GetListingName(const std::string& geobasePath, const
 }
 
 bool CDlgCfgListing::OpenListing(const std::string& path, std::string_view mode) {
-    if (m_file) CloseListing(m_fileName, false);
+    if (m_writer) CloseListing(m_fileName, false);
     const bool append = !IsRichText() && !mode.empty() && mode[0] == 'a';
-    m_file = std::fopen(path.c_str(), append ? "ab" : "wb");
-    if (!m_file) return false;
     m_fileName = path;
-    m_writeFailed = false;
+    m_error = 0;
+    auto writer = std::make_unique<SafeFileWriter>(path, append ? SafeFileWriter::Start::CopyOfFile
+                                                                : SafeFileWriter::Start::Empty);
+    if (writer->Error() != 0) {
+        m_error = writer->Error();
+        return false;
+    }
+    m_writer = std::move(writer);
     m_documentStarted = false;
     m_output = ListingOutput::File;
     m_inPage = false;
@@ -74,13 +77,18 @@ void CDlgCfgListing::InitOutput(ListingOutput target) {
 }
 
 bool CDlgCfgListing::CloseListing(const std::string& path, bool view) {
-    if (!m_file) return false;
+    if (!m_writer) return false;
     if (m_lineOpen) EndLine();
     if (IsRichText() && m_documentStarted) Raw("}\n");
-    if (std::fclose(m_file) != 0) m_writeFailed = true;
-    m_file = nullptr;
-    if (view) ViewListing(path);
-    return !m_writeFailed;
+    const bool written = m_writer->Commit();
+    if (!written) m_error = m_writer->Error();
+    m_writer.reset();
+    if (view && written) ViewListing(path);
+    return written;
+}
+
+std::string CDlgCfgListing::FailureText() const {
+    return FileWriteFailure(m_fileName, m_error);
 }
 
 void CDlgCfgListing::ViewListing(const std::string& path) {
@@ -88,9 +96,9 @@ void CDlgCfgListing::ViewListing(const std::string& path) {
 }
 
 void CDlgCfgListing::Raw(std::string_view bytes) {
-    if (m_output != ListingOutput::File || !m_file) return;
+    if (m_output != ListingOutput::File || !m_writer) return;
     if (IsRichText() && !m_documentStarted) rtfInit();
-    if (std::fwrite(bytes.data(), 1, bytes.size(), m_file) != bytes.size()) m_writeFailed = true;
+    m_writer->Write(bytes);
 }
 
 // --- Lines and pages -----------------------------------------------------------------------------------

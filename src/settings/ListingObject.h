@@ -1,8 +1,9 @@
 #pragma once
 
+#include "core/SafeFile.h"
 #include "ui/FrontEnd.h"
 
-#include <cstdio>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -68,7 +69,8 @@ class CDlgCfgListing {
 public:
     // The front end shows the listing once written and receives the echo of the lines.
     explicit CDlgCfgListing(ui::FrontEnd& parent);
-    ~CDlgCfgListing(); // an open listing is closed, without being shown
+    // A listing still open is given up: its file stays as it was before OpenListing.
+    ~CDlgCfgListing();
     CDlgCfgListing(const CDlgCfgListing&) = delete;
     CDlgCfgListing& operator=(const CDlgCfgListing&) = delete;
 
@@ -89,12 +91,21 @@ public:
     static std::string GetListingName(const std::string& geobasePath, const std::string& extension);
     // "w" replaces the file, "a" completes it. A rich-text document is always replaced: a second
     // document appended to the first would be unreadable. Output goes to the file from the first page.
+    // The listing is written beside the file, into a copy of it for "a", and takes its place only when
+    // CloseListing ends it whole: until then, and whatever fails, the file stays as it was. False when
+    // the listing cannot be started (Error() tells why).
     bool OpenListing(const std::string& path, std::string_view mode);
     void InitOutput(ListingOutput target);
-    // Closes the file; shows it when `view` is set. False when something could not be written.
+    // Ends the listing and puts it in place of the file; shows it when `view` is set and it was written.
+    // False when something could not be written (a full disk, a size limit): the file stays as it was and
+    // Error() tells why.
     bool CloseListing(const std::string& path, bool view);
     void ViewListing(const std::string& path);
-    bool IsOpen() const { return m_file != nullptr; }
+    bool IsOpen() const { return m_writer != nullptr; }
+    // The errno of the last listing's failure, 0 when none; the French text naming its file and the
+    // reason in words.
+    int Error() const { return m_error; }
+    std::string FailureText() const;
 
     // --- Pages ---------------------------------------------------------------------------------------
     // With the page count, plain-text pages hold exactly the page length: a line that would not fit
@@ -192,9 +203,9 @@ private:
     int m_pageWidth = kDefaultPageWidth;
     int m_deci[5] = {-1, -1, -1, -1, -1};
 
-    std::FILE* m_file = nullptr;
-    std::string m_fileName; // shown in the plain-text header
-    bool m_writeFailed = false;
+    std::unique_ptr<SafeFileWriter> m_writer; // the listing being written, null when none is open
+    std::string m_fileName;                   // shown in the plain-text header
+    int m_error = 0;
     bool m_documentStarted = false; // the RTF prologue is written
     ListingOutput m_output = ListingOutput::File;
     bool m_echo = true;

@@ -100,7 +100,7 @@ std::string RtfEscape(std::string_view text) {
 }
 
 void CDlgCfgListing::rtfInit() {
-    if (m_documentStarted || !IsRichText() || !m_file || m_output != ListingOutput::File) return;
+    if (m_documentStarted || !IsRichText() || !m_writer || m_output != ListingOutput::File) return;
     m_documentStarted = true; // before Raw, which would come back here
     std::string prologue =
         "{\\rtf1\\ansi\\ansicpg1252\\deff0\\uc1\n"

@@ -5,6 +5,7 @@
 #include "RegistryStore.h"
 #include "SettingsMessages.h"
 #include "SettingsText.h"
+#include "core/Files.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
 
@@ -65,7 +66,8 @@ Delivery ReadFromStore(std::string_view path, std::string_view section, std::str
     }
     if (!path.empty()) {
         IniFile file;
-        delivery.found = file.Load(std::string(path)) == 0 && file.Get(section, key, delivery.text);
+        delivery.found =
+            LoadParamFileToRead(file, std::string(path)) == 0 && file.Get(section, key, delivery.text);
     }
     if (!delivery.found) delivery.text.assign(defaultValue);
     CutToValueBuffer(delivery.text, kFileValueBuffer);
@@ -92,13 +94,13 @@ int WriteFileValue(std::string_view path, std::string_view section, std::string_
     if (path.empty()) return ENOENT;
     const std::string name(path);
     IniFile file;
-    if (const int code = file.Load(name); code != 0 && code != ENOENT)
+    if (const int code = LoadParamFileToWrite(file, name); code != 0 && code != ENOENT)
         return code; // a file that cannot be read is never written over
     file.Set(section, key, value);
     return file.Save(name);
 }
 
-void ReportFileFailure(std::string_view path, int code) {
+void ReportFileFailure(std::string_view path, std::string_view key, int code) {
     std::string text;
     if (path.data() == nullptr) {
         text = Sprintf(kMsgParamFileNullName, code);
@@ -107,8 +109,11 @@ void ReportFileFailure(std::string_view path, int code) {
     } else {
         const std::string name(path);
         text = Sprintf(PathExists(name) ? kMsgParamFileSaveFailed : kMsgParamFileMissing, name.c_str(), code);
+        // The refusal of an empty key is ours: the system's words for its code would not fit it.
+        const std::string cause = key.empty() ? std::string(kCauseNoKeyName) : SystemErrorText(code);
+        text += Sprintf(kMsgFailureCause, cause.c_str());
     }
-    ShowParamMessage(nullptr, text, ui::kIconWarning);
+    ReportParamFailure(nullptr, text, ui::kIconWarning);
 }
 
 bool WriteText(std::string_view path, std::string_view section, std::string_view key,
@@ -120,7 +125,7 @@ bool WriteText(std::string_view path, std::string_view section, std::string_view
         return true;
     }
     if (!IsRemembered(path)) {
-        ReportFileFailure(path, code);
+        ReportFileFailure(path, key, code);
         Remember(path);
     }
     return false;
@@ -206,6 +211,11 @@ std::string FormatDecimals(double value, int decimals) {
 void ShowParamMessage(ui::FrontEnd* parent, std::string_view text, int icon) {
     ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
     frontEnd.MessageBox(text, ui::kCaption, icon);
+}
+
+void ReportParamFailure(ui::FrontEnd* parent, std::string_view text, int icon) {
+    ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
+    frontEnd.ReportFailure(text, icon);
 }
 
 } // namespace pyr

@@ -21,8 +21,10 @@
 // Values are text in both forms: integers and switches "%d" (a switch is 0 or 1), reals "%f" (six
 // decimals, always with a '.', whatever the user's locale), strings as they are.
 //
-// Reads never fail and never show a message: an absent store, section or key gives the default, and
-// numbers are brought within their limits. A failed write shows a message, once per file (below).
+// Reads never fail: an absent store, section or key gives the default, and numbers are brought within
+// their limits. They show no message, but for a parameter file that is not text (binary, UTF-16): it
+// gives the defaults and is named once (IniFileStore.h). A failed write shows a message, once per file
+// (below).
 namespace pyr {
 
 inline constexpr std::string_view kNullParamPath{};
@@ -68,10 +70,13 @@ bool ReadParamDouble(std::string_view path, std::string_view section, std::strin
 // Each returns true when the value is stored.
 //
 // A file is written whole through a temporary file renamed over it; a file that does not exist is
-// created when its folder exists. On failure a message (warning icon) names the file and the system's
-// error code (errno), unless the file is the last parameter file written or reported: a dialog writing
+// created when its folder exists. A file that is not text is never written over: the first write moves
+// it aside (LoadParamFileToWrite, IniFileStore.h) and makes a new file. On failure a message (warning
+// icon) names the file and the system's error code (errno), then the reason in words
+// (kMsgFailureCause), unless the file is the last parameter file written or reported: a dialog writing
 // twenty values to a read-only file is reported once, and a file just written successfully is not
-// reported when a later write to it fails. The messages, in this order:
+// reported when a later write to it fails. The message is a failure of the command (ReportFailure). The
+// messages, in this order:
 //   null path: kMsgParamFileNullName; empty path: kMsgParamFileNoName; the file exists:
 //   kMsgParamFileSaveFailed; it does not (its folder is missing): kMsgParamFileMissing.
 // The remembered name starts empty, so a failing write to the empty path is reported only once another
@@ -98,6 +103,9 @@ std::string FormatDecimals(double value, int decimals);
 // A message box captioned "PYRALIS", on the parent front end when one is given, else on the
 // application's own. Parameter-file messages take the warning icon, registry messages the error icon.
 void ShowParamMessage(ui::FrontEnd* parent, std::string_view text, int icon = ui::kIconWarning);
+// The same for a failure of something asked for (a value not written): the command running then ends on
+// a failure status.
+void ReportParamFailure(ui::FrontEnd* parent, std::string_view text, int icon = ui::kIconWarning);
 
 // --- The parameter-file object ----------------------------------------------------------------------------
 

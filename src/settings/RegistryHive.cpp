@@ -28,7 +28,7 @@ std::string HiveFile(RegistryRoot root) {
 Outcome ReadValue(RegistryRoot root, const std::string& keyPath, const std::string& name,
                   std::string& value) {
     IniFile hive;
-    int code = hive.Load(HiveFile(root));
+    int code = LoadParamFileToRead(hive, HiveFile(root));
     if (code == 0 && !hive.HasSection(keyPath)) code = kNotFound;
     if (code != 0) return {Step::Open, code};
     if (!hive.Get(keyPath, name, value)) return {Step::Query, kNotFound};
@@ -39,9 +39,9 @@ Outcome WriteValue(RegistryRoot root, const std::string& keyPath, const std::str
                    const std::string& value) {
     const std::string file = HiveFile(root);
     IniFile hive;
-    const int code = hive.Load(file);
-    if (code != 0 && code != ENOENT)
-        return {Step::Create, code}; // a hive that cannot be read is never written over
+    // A hive file that is not text is moved aside first; one that cannot be read is never written over.
+    const int code = LoadParamFileToWrite(hive, file);
+    if (code != 0 && code != ENOENT) return {Step::Create, code};
     if (code == ENOENT || !hive.HasSection(keyPath)) {
         std::error_code error;
         std::filesystem::create_directories(RegistryHiveFolder(), error);

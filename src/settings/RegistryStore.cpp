@@ -5,6 +5,7 @@
 #include "RegistryPlatform.h"
 #include "SettingsMessages.h"
 #include "SettingsText.h"
+#include "core/Files.h"
 #include "core/Strings.h"
 
 #include <array>
@@ -32,6 +33,18 @@ constexpr std::array<RootEntry, 7> kRoots = {{
 
 void Report(bool report, ui::FrontEnd* parent, const std::string& text) {
     if (report) ShowParamMessage(parent, text, ui::kIconError);
+}
+
+// A write that failed is a failure of the command. Where the registry is a hive of files, its codes are
+// the system's errno, and the reason in words follows the message.
+void ReportWriteFailure(bool report, ui::FrontEnd* parent, std::string text, int code) {
+    if (!report) return;
+#ifndef _WIN32
+    if (code != 0) text += Sprintf(kMsgFailureCause, SystemErrorText(code).c_str());
+#else
+    (void)code;
+#endif
+    ReportParamFailure(parent, text, ui::kIconError);
 }
 
 // The checks common to reads and writes: a known root, a key path.
@@ -96,8 +109,15 @@ bool ReadRegistryValue(std::string_view rootName, std::string_view keyPath, std:
 
 bool WriteRegistryValue(std::string_view rootName, std::string_view keyPath, std::string_view name,
                         std::string_view value, bool report, ui::FrontEnd* parent) {
-    const auto root = CheckedRoot(rootName, keyPath, report, parent);
-    if (!root) return false;
+    const auto root = RegistryRootFromName(rootName);
+    if (!root) {
+        ReportWriteFailure(report, parent, kMsgRegistryBadRoot, 0);
+        return false;
+    }
+    if (keyPath.empty()) {
+        ReportWriteFailure(report, parent, kMsgRegistryNoKeyName, 0);
+        return false;
+    }
     const std::string key(keyPath);
     const std::string valueName(name);
     const registry_detail::Outcome outcome =
@@ -107,11 +127,13 @@ bool WriteRegistryValue(std::string_view rootName, std::string_view keyPath, std
         return true;
     case registry_detail::Step::Create:
     case registry_detail::Step::Open:
-        Report(report, parent, Sprintf(kMsgRegistryCreateFailed, key.c_str(), outcome.code));
+        ReportWriteFailure(report, parent, Sprintf(kMsgRegistryCreateFailed, key.c_str(), outcome.code),
+                           outcome.code);
         return false;
     default:
-        Report(report, parent,
-               Sprintf(kMsgRegistryWriteFailed, valueName.c_str(), key.c_str(), outcome.code));
+        ReportWriteFailure(report, parent,
+                           Sprintf(kMsgRegistryWriteFailed, valueName.c_str(), key.c_str(), outcome.code),
+                           outcome.code);
         return false;
     }
 }

@@ -45,7 +45,9 @@ bool ReadRegistryValue(std::string_view rootName, std::string_view keyPath, std:
                        std::string& value, bool report, ui::FrontEnd* parent = nullptr);
 
 // Writes a value as text, creating the key (and the hive's folder and file) when it does not exist yet.
-// Refusals and failures as for ReadRegistryValue.
+// Refusals and failures as for ReadRegistryValue, each reported as a failure of the command running;
+// in a hive of files the message ends with the reason in words (kMsgFailureCause). A hive file that is
+// not text is moved aside and a new one made, as a parameter file is (IniFileStore.h).
 bool WriteRegistryValue(std::string_view rootName, std::string_view keyPath, std::string_view name,
                         std::string_view value, bool report, ui::FrontEnd* parent = nullptr);
 

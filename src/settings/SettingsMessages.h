@@ -28,4 +28,20 @@ inline constexpr char kMsgParamFileSaveFailed[] =
     "%s :\nSauvegarde des paramètres imposssible !\n(Code d'erreur %d)";
 inline constexpr char kMsgParamFileMissing[] = "%s :\nFichier de paramètres inexistant !\n(Code d'erreur %d)";
 
+// The reason of a failure in words, a last line after each message of a write that failed:
+// "Cause : accès refusé."
+inline constexpr char kMsgFailureCause[] = "\nCause : %s.";
+// The cause of a value refused because it has no name.
+inline constexpr char kCauseNoKeyName[] = "paramètre sans nom";
+
+// A parameter file (or a registry hive file) that is not text: %s is its name; for the move, then the
+// name it was moved to.
+inline constexpr char kMsgParamFileNotText[] =
+    "%s :\nFichier de paramètres illisible (ce n'est pas un fichier texte) !\n"
+    "Les paramètres par défaut sont utilisés ; le fichier sera mis de côté tel quel au premier "
+    "enregistrement des paramètres.";
+inline constexpr char kMsgParamFileSetAside[] =
+    "%s :\nFichier de paramètres illisible (ce n'est pas un fichier texte) !\n"
+    "Il a été mis de côté tel quel sous le nom\n%s\net un nouveau fichier de paramètres est créé.";
+
 } // namespace pyr

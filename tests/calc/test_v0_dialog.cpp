@@ -3,11 +3,13 @@
 #include "TestSupport.h"
 #include "calc/CalculV0Sta.h"
 #include "core/Files.h"
+#include "core/SafeFile.h"
 #include "settings/LastGeoBase.h"
 #include "settings/ListingKinds.h"
 #include "test_v0_geometry.h"
 #include "ui/ScriptedFrontEnd.h"
 
+#include <filesystem>
 #include <gtest/gtest.h>
 
 namespace pyr::test {
@@ -137,6 +139,26 @@ TEST_F(V0Dialog, OneStationIsOrientedWrittenBackListedAndJournalled) {
               " -> V0 hors tolérance pour la référence <D> !\n"
               "    (écart = 0.01714 Gr > 0.00372 Gr)\n"
               "--------------------------------------------------------------------------------\n");
+}
+
+// A listing or a journal that cannot be written does not undo what was saved: each is a failure of the
+// command, told with its file and the reason, and the GéoBase keeps its new V0.
+TEST_F(V0Dialog, AListingOrAJournalThatCannotBeWrittenIsAFailureAndTheGeoBaseStands) {
+    AddStationS1();
+    ASSERT_TRUE(Open());
+    ASSERT_TRUE(dialog.Calculate());
+    ASSERT_TRUE(dialog.Enregistrer());
+    // Folders where the listing and the journal go.
+    std::filesystem::create_directory(dir / "chantier.cv0");
+    std::filesystem::create_directory(dir / "chantier.jnl");
+    frontEnd.messages.clear();
+    frontEnd.answers = {ui::Answer::Yes};
+    EXPECT_EQ(dialog.Close(true), "");
+    EXPECT_EQ(Messages(), (std::vector<std::string>{FileWriteFailure(dir / "chantier.cv0", EISDIR),
+                                                    FileWriteFailure(dir / "chantier.jnl", EISDIR)}));
+    EXPECT_EQ(frontEnd.Failures(), 2);
+    EXPECT_NEAR(SavedV0("S1", 1), 50.0, 1e-9);
+    EXPECT_EQ(ReadLastGeoBase(params), geo);
 }
 
 TEST_F(V0Dialog, ListsAndAllStationsCountThoseThatCannotBeOriented) {

@@ -1,6 +1,8 @@
-#include "TestSupport.h"
+#include "SettingsTestSupport.h"
+#include "core/TextEncoding.h"
 #include "settings/IniFileStore.h"
 
+#include <algorithm>
 #include <gtest/gtest.h>
 
 namespace pyr {
@@ -58,7 +60,7 @@ TEST(IniFile, FileWithoutSectionsKeepsItsLinesFirst) {
     EXPECT_EQ(ini.Bytes(), "; premier bloc\n\n; second bloc\n\n[G]\nx=a\n");
 }
 
-TEST(IniFile, Windows1252FileReadsRightAndIsWrittenBackInItsCodePage) {
+TEST(IniFile, Windows1252FileReadsRightAndIsWrittenBackInItsCodePageUnlessItWouldLoseACharacter) {
     // "[Paramètres]\r\nClé=Géomètre expert\r\n" as a Windows machine writes it.
     IniFile ini;
     ini.Parse("[Param\xE8tres]\r\nCl\xE9=G\xE9om\xE8tre expert\r\nAutre=\x80 \x9C\r\n");
@@ -66,8 +68,10 @@ TEST(IniFile, Windows1252FileReadsRightAndIsWrittenBackInItsCodePage) {
     EXPECT_EQ(Value(ini, "Paramètres", "Autre"), "€ œ");
 
     ini.Set("Paramètres", "Clé", "Relevé");
-    ini.Set("Paramètres", "Nouvelle", "€ ≠"); // '≠' has no place in the code page
-    EXPECT_EQ(ini.Bytes(), "[Param\xE8tres]\r\nCl\xE9=Relev\xE9\r\nAutre=\x80 \x9C\r\nNouvelle=\x80 ?\r\n");
+    EXPECT_EQ(ini.Bytes(), "[Param\xE8tres]\r\nCl\xE9=Relev\xE9\r\nAutre=\x80 \x9C\r\n");
+    // '≠' has no place in the code page: the file goes over to UTF-8 whole rather than lose it.
+    ini.Set("Paramètres", "Nouvelle", "€ ≠");
+    EXPECT_EQ(ini.Bytes(), "[Paramètres]\r\nClé=Relevé\r\nAutre=€ œ\r\nNouvelle=€ ≠\r\n");
 }
 
 TEST(IniFile, Utf8FileKeepsItsByteOrderMarkAndLineEndsAndStaysUtf8) {
@@ -75,10 +79,90 @@ TEST(IniFile, Utf8FileKeepsItsByteOrderMarkAndLineEndsAndStaysUtf8) {
     ini.Parse("\xEF\xBB\xBF[Réglages]\r\nClé=été\r\n");
     EXPECT_EQ(Value(ini, "Réglages", "Clé"), "été");
     ini.Set("Réglages", "Clé", "hiver");
-    ini.Set("Réglages", "Autre", "caf\xE9"); // not UTF-8: taken as Windows-1252
-    EXPECT_EQ(ini.Bytes(), "\xEF\xBB\xBF[Réglages]\r\nClé=hiver\r\nAutre=café\r\n");
+    ini.Set("Réglages", "Autre", "caf\xE9"); // a Latin-1 byte: kept as U+EFE9
+    EXPECT_EQ(ini.Bytes(), "\xEF\xBB\xBF[Réglages]\r\nClé=hiver\r\nAutre=caf\uEFE9\r\n");
 }
 
+// A file name is a string of bytes that the system gives and takes back as it is: whatever they are, the
+// value reads back byte for byte, at once and from the file written, and the file stays UTF-8 text of
+// the lines it had (in a Windows-1252 file too, which goes over to UTF-8).
+TEST(IniFile, AnyBytesReadBackExactlyWhileTheFileStaysUtf8Text) {
+    const std::string values[] = {
+        "/chantiers/relev\xE9.geo",      // Latin-1
+        "C:\\Relev\xC3\xA9\xFF\xC3.geo", // UTF-8, then a byte of none, then a cut sequence
+        test::BytesOf("a\0b\nc\rd"),     // what a line cannot hold
+        "\uEFE9 \uEF0A",                 // the escape characters themselves
+        "\"C:\\a b.geo\"",
+        "\"\"",
+        "\"",
+        " \"x\" ",                                // quotes, which the file takes off one pair of
+        "  blancs\t",                             // blanks around
+        "\xED\xA0\x80 \xF4\x90\x80\x80 \xC0\xAF", // a surrogate, past U+10FFFF, an overlong '/'
+    };
+    const struct {
+        const char* bytes;
+        long lines;
+    } files[] = {{"[GeoBase]\nDerniere=x\n", 2}, {"[GeoBase]\r\nNote=Relev\xE9\r\n", 3}};
+    for (const auto& file : files) {
+        for (const std::string& value : values) {
+            IniFile ini;
+            ini.Parse(file.bytes);
+            ini.Set("GeoBase", "Derniere", value);
+            EXPECT_EQ(Value(ini, "GeoBase", "Derniere"), value);
+            const std::string bytes = ini.Bytes();
+            EXPECT_EQ(std::count(bytes.begin(), bytes.end(), '\n'), file.lines) << bytes;
+            EXPECT_EQ(bytes.find('\0'), std::string::npos) << bytes;
+            IniFile again;
+            again.Parse(bytes);
+            EXPECT_EQ(Value(again, "GeoBase", "Derniere"), value) << bytes;
+            EXPECT_EQ(Value(again, "GeoBase", "Note"), file.lines == 3 ? "Relevé" : "<absent>");
+            EXPECT_EQ(again.Bytes(), bytes);
+        }
+        IniFile latin1;
+        latin1.Parse(file.bytes);
+        latin1.Set("GeoBase", "Derniere", values[0]);
+        EXPECT_TRUE(IsValidUtf8(latin1.Bytes())) << "else read whole as Windows-1252 next time";
+    }
+}
+
+TEST(IniFile, QuotedValuesAndCommentsThatLookLikeMarksKeepReadingTheSame) {
+    IniFile ini;
+    ini.Parse(";\x01 commentaire\n[A]\nDouble=\"\"C:\\a.geo\"\"\nSimple=\"  b \"\n");
+    EXPECT_EQ(Value(ini, "A", "Double"), "\"C:\\a.geo\"");
+    EXPECT_EQ(Value(ini, "A", "Simple"), "  b ");
+    ini.Set("A", "Autre", "1");
+    const std::string bytes = ini.Bytes();
+    EXPECT_EQ(bytes.rfind(";\x01 commentaire\n", 0), 0u) << bytes;
+    IniFile again;
+    again.Parse(bytes);
+    EXPECT_EQ(again.Entries(), ini.Entries());
+}
+
+TEST(IniFile, TextIsToldFromWhatNoEditorWrites) {
+    const struct {
+        std::string bytes;
+        bool text;
+        const char* what;
+    } cases[] = {
+        {"", true, "empty"},
+        {"; rien que des notes\r\n", true, "comments only"},
+        {"[A]\r\nx=1\r\n\x1A", true, "ended by Ctrl-Z"},
+        {"[Param\xE8tres]\r\nCl\xE9=\x80\r\n", true, "Windows-1252"},
+        {"\xEF\xBB\xBF[Réglages]\nClé=été\n", true, "UTF-8 with its mark"},
+        {"[A]\nnote=collée\x0B d'un traitement de texte \x1B\n" + std::string(40, 'x'), true,
+         "a vertical tab and an escape slipped in"},
+        {test::BytesOf("[A]\nx=1\0\n"), false, "a NUL"},
+        {test::BytesOf("\xFF\xFE[\0A\0]\0"), false, "UTF-16LE"},
+        {test::BytesOf("[\0A\0]\0\n\0"), false, "UTF-16LE without its mark"},
+        {"\xFE\xFF\x4E\x2D\x65\x87", false, "UTF-16BE of two CJK letters, no NUL"},
+        {"\x7F"
+         "ELF\x02\x01\x01\x03\x04\x05\x06\x07\x08" +
+             std::string(20, 'a'),
+         false, "controls"},
+    };
+    for (const auto& c : cases)
+        EXPECT_EQ(IsParamFileText(c.bytes), c.text) << c.what;
+}
 TEST(IniFile, SaveReplacesTheFileAndKeepsItsPermissionsAndLink) {
     TempDir folder;
     const std::string real = folder / "reel.ini";

@@ -1,6 +1,7 @@
 // The journal's lines, byte for byte; expected texts worked out by hand from the printf formats
 // ("%7s" pads the identifier to 7, "%12.4f" and "%9.4f" the coordinates, "%9.5f" the V0).
-#include "TestSupport.h"
+#include "SettingsTestSupport.h"
+#include "core/SafeFile.h"
 #include "core/Undefined.h"
 #include "settings/Journal.h"
 
@@ -9,6 +10,7 @@
 namespace {
 
 using namespace pyr;
+using pyr::test::InChildWithFileSizeLimit;
 
 TEST(JournalLine, EachCombinationOfKnownCoordinatesInBothAxisOrders) {
     const double x = 651200.1234, y = 6862300.5, z = 52.3107, none = kUndefined;
@@ -35,36 +37,70 @@ TEST(JournalLine, EachCombinationOfKnownCoordinatesInBothAxisOrders) {
     EXPECT_EQ(JournalStationLine("S1", 12.345678), "\nStation      S1 : V0 =  12.34568");
 }
 
+std::tm Monday() {
+    std::tm day{};
+    day.tm_year = 125, day.tm_mon = 2, day.tm_mday = 3, day.tm_wday = 1, day.tm_hour = 9, day.tm_min = 5;
+    return day;
+}
+
 TEST(JournalFile, BesideTheGeoBaseAppendedComputationAfterComputation) {
     EXPECT_EQ(JournalPath("/chantiers/lotissement.geo"), "/chantiers/lotissement.jnl");
     EXPECT_EQ(JournalPath("/chantiers/sans-extension"), "/chantiers/sans-extension.jnl");
 
     TempDir dir;
-    std::tm day{}; // a Monday
-    day.tm_year = 125, day.tm_mon = 2, day.tm_mday = 3, day.tm_wday = 1, day.tm_hour = 9, day.tm_min = 5;
-    EXPECT_TRUE(CJournal(dir / "a.geo", kJournalIntersection).Append(day));
+    ui::ScriptedFrontEnd frontEnd;
+    const std::tm day = Monday();
+    EXPECT_TRUE(CJournal(dir / "a.geo", kJournalIntersection).Append(frontEnd, day));
     EXPECT_FALSE(std::filesystem::exists(dir / "a.jnl")); // no point written, no journal
 
     CJournal intersection(dir / "a.geo", kJournalIntersection);
     intersection.AddPoint("100", 10.0, 20.0, kUndefined, false);
-    ASSERT_TRUE(intersection.Append(day));
+    ASSERT_TRUE(intersection.Append(frontEnd, day));
     EXPECT_TRUE(intersection.IsEmpty());
     CJournal resection(dir / "a.geo", kJournalResection);
     resection.AddPoint("S9", kUndefined, kUndefined, 51.5, false);
     resection.AddStation("S9", 399.99999);
-    ASSERT_TRUE(resection.Append(day));
+    ASSERT_TRUE(resection.Append(frontEnd, day));
     EXPECT_EQ(ReadBytes(dir / "a.jnl"),
               "\n\nlundi 03 mars 2025 à 09 h 05 mn - Calcul de points par intersection"
               "\nPoint     100 : X =      10.0000 Y =      20.0000"
               "\n\nlundi 03 mars 2025 à 09 h 05 mn - Calcul de points par relèvement"
               "\nPoint      S9 : Z =   51.5000"
               "\nStation      S9 : V0 = 399.99999");
+    EXPECT_TRUE(frontEnd.messages.empty());
+}
 
-    // A journal that cannot be written keeps its lines for another try.
+// The journal is the history of the job: an append that fails, however late, leaves it as it was, and
+// the person is told which file and why.
+TEST(JournalFile, AnAppendThatFailsLeavesTheJournalWholeKeepsItsLinesAndIsReported) {
+    TempDir dir;
+    const std::tm day = Monday();
+    ui::ScriptedFrontEnd frontEnd;
     CJournal lost(dir / "absent/b.geo", kJournalEccentric);
     lost.AddStation("S2", 1.0);
-    EXPECT_FALSE(lost.Append(day));
+    EXPECT_FALSE(lost.Append(frontEnd, day));
     EXPECT_FALSE(lost.IsEmpty());
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(frontEnd.messages[0].text, FileWriteFailure(dir / "absent/b.jnl", ENOENT));
+    EXPECT_EQ(frontEnd.Failures(), 1);
+
+    // Past the size a file may reach, as on a full disk: the old lines fit, the new ones do not.
+    std::string history;
+    for (int i = 0; i < 20; ++i)
+        history += "\n\nlundi 03 mars 2025 à 09 h 05 mn - Calcul de points par intersection";
+    WriteBytes(dir / "a.jnl", history);
+    const int status = InChildWithFileSizeLimit(history.size() + 40, [&] {
+        ui::ScriptedFrontEnd child;
+        CJournal journal(dir / "a.geo", kJournalIntersection);
+        for (int i = 0; i < 5; ++i)
+            journal.AddPoint("P" + std::to_string(i), 10.0, 20.0, 30.0, false);
+        const bool reported = !journal.Append(child, day) && !journal.IsEmpty() && child.Failures() == 1 &&
+                              child.messages[0].text == FileWriteFailure(dir / "a.jnl", EFBIG);
+        return reported ? 0 : 1;
+    });
+    EXPECT_EQ(status, 0) << "the append did not fail, or was not reported";
+    EXPECT_EQ(ReadBytes(dir / "a.jnl"), history);
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(dir.Root()), {}), 1) << "no copy left";
 }
 
 } // namespace

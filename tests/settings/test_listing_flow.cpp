@@ -1,4 +1,5 @@
 #include "SettingsTestSupport.h"
+#include "core/SafeFile.h"
 #include "core/Strings.h"
 #include "settings/ListingFlow.h"
 
@@ -34,7 +35,7 @@ protected:
     std::string geobase = folder / "chantier.geo";
 };
 
-TEST_F(ListingFlow, NothingWithoutResultsAfterNoOrWhereItCannotBeOpened) {
+TEST_F(ListingFlow, NothingWithoutResultsOrAfterNo) {
     Options(false, true, true, 1);
     EXPECT_EQ(Write(ListingKind::Intersection, 0), "");
     EXPECT_TRUE(frontEnd.questions.empty());
@@ -42,10 +43,47 @@ TEST_F(ListingFlow, NothingWithoutResultsAfterNoOrWhereItCannotBeOpened) {
     frontEnd.answers = {ui::Answer::No};
     EXPECT_EQ(Write(ListingKind::StationV0, 2), "");
     EXPECT_EQ(frontEnd.questions, std::vector<std::string>{kListingQuestionV0});
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.Root()), {}), 1) << "Pyralis.ini only";
+    EXPECT_TRUE(frontEnd.messages.empty());
+}
 
+// A listing that cannot be written is a failure of the command, told with its file and the reason; the
+// listing that was there before stays whole, whether the new one was to complete it or replace it.
+TEST_F(ListingFlow, AListingThatCannotBeWrittenIsReportedAndLeavesTheOldOneWhole) {
+    Options(false, true, true, 1);
     geobase = folder / "absent/chantier.geo";
     EXPECT_EQ(Write(ListingKind::Intersection, 1, false), "");
-    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.Root()), {}), 1) << "Pyralis.ini only";
+    EXPECT_EQ(frontEnd.Failures(), 1);
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_EQ(frontEnd.messages[0].text, FileWriteFailure(folder / "absent/chantier.cin", ENOENT));
+    EXPECT_TRUE(frontEnd.shownFiles.empty());
+
+    // Past the size a file may reach, as on a full disk: a page of the listing does not fit.
+    geobase = folder / "chantier.geo";
+    const std::string listingPath = folder / "chantier.cin";
+    const std::string yesterday = "listing d'hier\n";
+    const struct {
+        int format;
+        ui::Answer answer; // to "complete the listing?"
+    } cases[] = {{1, ui::Answer::Yes}, {1, ui::Answer::No}, {0, ui::Answer::Yes}};
+    for (const auto& c : cases) {
+        Options(false, true, true, c.format);
+        const std::string target = c.format == 0 ? folder / "chantier.rtf" : listingPath;
+        WriteBytes(target, yesterday);
+        const int status = InChildWithFileSizeLimit(600, [&] {
+            frontEnd.ResetFailures();
+            frontEnd.messages.clear();
+            frontEnd.answers = {c.answer};
+            const bool reported = Write(ListingKind::Intersection, 3, false).empty() &&
+                                  frontEnd.Failures() == 1 && frontEnd.shownFiles.empty() &&
+                                  frontEnd.messages.back().text == FileWriteFailure(target, EFBIG);
+            return reported ? 0 : 1;
+        });
+        EXPECT_EQ(status, 0) << "format " << c.format << ": not failed, or not reported";
+        EXPECT_EQ(ReadBytes(target), yesterday) << "format " << c.format;
+        std::filesystem::remove(target);
+    }
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.Root()), {}), 1) << "no copy left";
 }
 
 TEST_F(ListingFlow, BesideTheGeoBaseWithoutFileChoiceEachResultOnItsOwnPage) {

@@ -1,5 +1,7 @@
 #include "SettingsTestSupport.h"
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
+#include "settings/IniFileStore.h"
 #include "settings/ParamStore.h"
 #include "settings/RegistryStore.h"
 
@@ -89,8 +91,11 @@ TEST_F(ParamStore, FailingWritesAreReportedOncePerFileAndNotRightAfterASuccess) 
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 3));
     EXPECT_EQ(
         Texts(frontEnd, ui::kIconWarning),
-        (std::vector<std::string>{missing + " :\nFichier de paramètres inexistant !\n(Code d'erreur 2)",
-                                  path + " :\nSauvegarde des paramètres imposssible !\n(Code d'erreur 21)"}));
+        (std::vector<std::string>{missing + " :\nFichier de paramètres inexistant !\n(Code d'erreur 2)\n"
+                                            "Cause : fichier ou dossier inexistant.",
+                                  path + " :\nSauvegarde des paramètres imposssible !\n(Code d'erreur 21)\n"
+                                         "Cause : c'est un dossier, pas un fichier."}));
+    EXPECT_EQ(frontEnd.Failures(), 2) << "each message a failure of the command";
 }
 
 TEST_F(ParamStore, NullAndEmptyNames) {
@@ -103,6 +108,11 @@ TEST_F(ParamStore, NullAndEmptyNames) {
               (std::vector<std::string>{"Pointeur nul pour le fichier de paramètres !\n(Code d'erreur 22)",
                                         "Pas de nom pour le fichier de paramètres !\n(Code d'erreur 2)",
                                         "Pointeur nul pour le fichier de paramètres !\n(Code d'erreur 22)"}));
+    // An empty key is refused with a reason of its own.
+    EXPECT_FALSE(WriteParamInt(path, "A", "", 1));
+    EXPECT_EQ(frontEnd.messages.back().text,
+              path +
+                  " :\nFichier de paramètres inexistant !\n(Code d'erreur 22)\nCause : paramètre sans nom.");
 }
 
 class ParamStoreAsUser : public ParamStore {};
@@ -114,9 +124,92 @@ TEST_F(ParamStoreAsUser, AFileThatCannotBeReadIsNotWrittenOverAndIsNamedWithTheS
     EXPECT_FALSE(WriteParamInt(path, "A", "x", 1));
     ASSERT_EQ(chmod(path.c_str(), 0600), 0);
     EXPECT_EQ(ReadBytes(path), "[A]\nx=0\n");
-    EXPECT_EQ(
-        Texts(frontEnd, ui::kIconWarning),
-        std::vector<std::string>{path + " :\nSauvegarde des paramètres imposssible !\n(Code d'erreur 13)"});
+    EXPECT_EQ(Texts(frontEnd, ui::kIconWarning),
+              std::vector<std::string>{path +
+                                       " :\nSauvegarde des paramètres imposssible !\n(Code d'erreur 13)\n"
+                                       "Cause : accès refusé."});
+    EXPECT_EQ(frontEnd.Failures(), 1);
+}
+
+TEST_F(ParamStoreAsUser, AFileThatIsNotTextStaysWhereItIsWhenItsFolderCannotTakeAnother) {
+    SKIP_WHEN_ROOT();
+    const std::string sealed = folder / "scelle";
+    std::filesystem::create_directory(sealed);
+    const std::string file = sealed + "/Pyralis.ini";
+    WriteBytes(file, test::BytesOf("\xFF\xFE[\0"));
+    ASSERT_EQ(chmod(sealed.c_str(), 0555), 0);
+    EXPECT_FALSE(WriteParamInt(file, "A", "x", 1));
+    ASSERT_EQ(chmod(sealed.c_str(), 0755), 0);
+    EXPECT_EQ(ReadBytes(file), test::BytesOf("\xFF\xFE[\0"));
+    EXPECT_FALSE(std::filesystem::exists(file + ".illisible"));
+    EXPECT_EQ(frontEnd.messages.back().text, file + " :\nSauvegarde des paramètres imposssible !\n"
+                                                    "(Code d'erreur 13)\nCause : accès refusé.");
+}
+
+// A parameter file in a form this program cannot read holds someone's settings all the same: it is never
+// written over, but kept aside whole, under a name of its own, when the settings are first written.
+TEST_F(ParamStore, AFileThatIsNotTextGivesTheDefaultsIsNamedOnceAndIsSetAsideWholeOnTheFirstWrite) {
+    const std::string notText[] = {
+        test::BytesOf("\xFF\xFE[\0G\0]\0\r\0\n\0x\0=\0\x31\0"), // UTF-16LE with its mark
+        test::BytesOf("[\0G\0]\0\r\0\n\0x\0=\0\x31\0"),         // and without
+        test::BytesOf("PK\x03\x04\x14\0\0\0\x08\0"),            // a zip archive
+    };
+    const std::string aside[] = {path + ".illisible", path + ".illisible.2", path + ".illisible.3"};
+    for (int i = 0; i < 3; ++i) {
+        ForgetUnreadableParamFiles();
+        frontEnd.messages.clear();
+        WriteBytes(path, notText[i]);
+        int number = 0;
+        std::string text;
+        for (int read = 0; read < 2; ++read) {
+            EXPECT_TRUE(ReadParamInt(path, "G", "x", 7, 0, 10, number));
+            EXPECT_TRUE(ReadParamString(path, "G", "y", "défaut", text));
+            EXPECT_EQ(std::tie(number, text), std::make_tuple(7, "défaut"));
+        }
+        EXPECT_EQ(Texts(frontEnd, ui::kIconWarning),
+                  std::vector<std::string>{path +
+                                           " :\nFichier de paramètres illisible (ce n'est pas un fichier "
+                                           "texte) !\nLes paramètres par défaut sont utilisés ; le fichier "
+                                           "sera mis de côté tel quel au premier enregistrement des "
+                                           "paramètres."});
+        EXPECT_EQ(ReadBytes(path), notText[i]) << "reading changes nothing";
+
+        EXPECT_TRUE(WriteParamInt(path, "G", "x", 2));
+        EXPECT_TRUE(WriteParamInt(path, "G", "z", 3));
+        EXPECT_EQ(ReadBytes(aside[i]), notText[i]);
+        EXPECT_EQ(ReadBytes(path), "[G]\nx=2\nz=3\n");
+        EXPECT_EQ(frontEnd.messages.back().text,
+                  path +
+                      " :\nFichier de paramètres illisible (ce n'est pas un fichier texte) !\n"
+                      "Il a été mis de côté tel quel sous le nom\n" +
+                      aside[i] + "\net un nouveau fichier de paramètres est créé.");
+        EXPECT_EQ(frontEnd.messages.size(), 2u);
+    }
+    EXPECT_EQ(frontEnd.Failures(), 0) << "the settings were written";
+}
+
+// A GéoBase named by the system in Latin-1 must be found again by the next command: its name is kept byte
+// for byte, and the file that keeps it stays UTF-8 (else it would be read whole as Windows-1252).
+TEST_F(ParamStore, AFileNameInAnyEncodingComesBackByteForByteInEveryFormOfTheStore) {
+    const std::string name = folder / "relev\xE9.geo";
+    WriteBytes(folder / "windows.ini", "[GeoBase]\r\nNote=Relev\xE9\r\n");
+    const struct {
+        std::string params;
+        std::string file;
+    } stores[] = {{path, path},
+                  {folder / "windows.ini", folder / "windows.ini"},
+                  {"HKEY_CURRENT_USER", folder / "registre/HKEY_CURRENT_USER.ini"}};
+    for (const auto& store : stores) {
+        ASSERT_TRUE(WriteParamString(store.params, "GeoBase", "Derniere", name)) << store.params;
+        std::string read;
+        ReadParamString(store.params, "GeoBase", "Derniere", "", read);
+        EXPECT_EQ(read, name) << store.params;
+        EXPECT_TRUE(IsValidUtf8(ReadBytes(store.file))) << ReadBytes(store.file);
+    }
+    std::string note;
+    ReadParamString(folder / "windows.ini", "GeoBase", "Note", "", note);
+    EXPECT_EQ(note, "Relevé");
+    EXPECT_TRUE(frontEnd.messages.empty());
 }
 
 TEST_F(ParamStore, NumbersKeepTheirDecimalPointUnderAFrenchLocale) {

@@ -1,6 +1,8 @@
 #include "SettingsTestSupport.h"
+#include "core/Strings.h"
 #include "settings/ParamStore.h"
 #include "settings/RegistryStore.h"
+#include "settings/SettingsMessages.h"
 
 namespace pyr {
 namespace {
@@ -81,21 +83,44 @@ TEST_F(RegistryStore, EveryFailingWriteIsReportedWithTheErrorIcon) {
     EXPECT_FALSE(WriteRegistryValue("HKEY_CURRENT_USER", "Software", "Cle", "13", false));
     const std::string cannotCreate =
         "Software : \nimpossible de créer la clef dans la base de registres !\n(Code d'erreur ";
-    EXPECT_EQ(
-        Texts(frontEnd, ui::kIconError),
-        (std::vector<std::string>{cannotCreate + "21) !", cannotCreate + "20) !", cannotCreate + "20) !"}));
+    const std::string notAFolder = ") !\nCause : un élément du chemin n'est pas un dossier.";
+    EXPECT_EQ(Texts(frontEnd, ui::kIconError),
+              (std::vector<std::string>{cannotCreate + "21) !\nCause : c'est un dossier, pas un fichier.",
+                                        cannotCreate + "20" + notAFolder, cannotCreate + "20" + notAFolder}));
+    EXPECT_EQ(frontEnd.Failures(), 3);
 }
 
-TEST_F(RegistryStore, ValueThatCannotBeSetIsNamedInTheReport) {
-    if (geteuid() == 0) GTEST_SKIP() << "root writes in read-only folders";
+TEST_F(RegistryStore, AHiveFileThatIsNotTextIsSetAsideWholeAndANewOneMade) {
+    const std::string hive = folder / "registre/HKEY_CURRENT_USER.ini";
+    std::filesystem::create_directories(folder / "registre");
+    const std::string utf16 = test::BytesOf("\xFF\xFE[\0S\0]\0");
+    WriteBytes(hive, utf16);
+    int value = 0;
+    ReadParamInt("HKEY_CURRENT_USER", "Software", "Cle", 4, 0, 10, value);
+    EXPECT_EQ(value, 4);
+    EXPECT_TRUE(WriteParamInt("HKEY_CURRENT_USER", "Software", "Cle", 5));
+    EXPECT_EQ(ReadBytes(hive + ".illisible"), utf16);
+    EXPECT_EQ(ReadBytes(hive), "[Software]\nCle=5\n");
+    EXPECT_EQ(Texts(frontEnd, ui::kIconWarning),
+              (std::vector<std::string>{
+                  Sprintf(kMsgParamFileNotText, hive.c_str()),
+                  Sprintf(kMsgParamFileSetAside, hive.c_str(), (hive + ".illisible").c_str())}));
+    EXPECT_EQ(frontEnd.Failures(), 0);
+}
+
+class RegistryStoreAsUser : public RegistryStore {};
+
+TEST_F(RegistryStoreAsUser, ValueThatCannotBeSetIsNamedInTheReport) {
+    SKIP_WHEN_ROOT();
     WriteParamString("HKEY_CURRENT_USER", "Software", "Cle", "x");
     ASSERT_EQ(chmod((folder / "registre").c_str(), 0555), 0);
     EXPECT_FALSE(WriteParamString("HKEY_CURRENT_USER", "Software", "Cle", "y"));
     chmod((folder / "registre").c_str(), 0755);
     EXPECT_EQ(
         Texts(frontEnd, ui::kIconError),
-        std::vector<std::string>{
-            "Impossible d'enregistrer le paramètre 'Cle' dans la clef\nSoftware !\n(Code d'erreur 13)"});
+        std::vector<std::string>{"Impossible d'enregistrer le paramètre 'Cle' dans la clef\nSoftware !\n"
+                                 "(Code d'erreur 13)\nCause : accès refusé."});
+    EXPECT_EQ(frontEnd.Failures(), 1);
 }
 
 } // namespace
