@@ -121,8 +121,7 @@ ui::DialogResult CGeoEditor::ReadFieldBook(CCarnet& carnet, CPyrTxtWnd& txt, ui:
 
     if (target == &fresh) carnet = std::move(fresh);
     const std::string path = carnet.PathName();
-    carnet.BackUp();
-    if (!carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
+    if (!carnet.BackUp(&frontEnd) || !carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
     txt.Print(msg::kSaved, path.c_str());
     WriteLastGeoBase(paramPath, WholePath(path));
     // The view refreshed from the former end of the GéoBase on.
@@ -142,8 +141,7 @@ bool CGeoEditor::ReduceStations(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& 
         return true;
     }
     const std::string path = carnet.PathName();
-    carnet.BackUp();
-    if (!carnet.Save(path, &frontEnd)) return false;
+    if (!carnet.BackUp(&frontEnd) || !carnet.Save(path, &frontEnd)) return false;
     txt.Print(msg::kSaved, path.c_str());
     return true;
 }

@@ -20,7 +20,8 @@ CCarnet::CCarnet() = default;
 CCarnet::~CCarnet() = default;
 
 CCarnet::CCarnet(const CCarnet& other)
-    : m_kinds(other.m_kinds), m_path(other.m_path), m_configuration(other.m_configuration) {
+    : m_kinds(other.m_kinds), m_path(other.m_path), m_configuration(other.m_configuration),
+      m_knownPath(other.m_knownPath), m_knownForeign(other.m_knownForeign) {
     m_elements.reserve(other.m_elements.size());
     for (const auto& element : other.m_elements) {
         m_elements.push_back(element->Clone());
@@ -38,7 +39,8 @@ CCarnet& CCarnet::operator=(const CCarnet& other) {
 
 CCarnet::CCarnet(CCarnet&& other) noexcept
     : m_elements(std::move(other.m_elements)), m_kinds(std::move(other.m_kinds)),
-      m_path(std::move(other.m_path)), m_configuration(std::move(other.m_configuration)) {
+      m_path(std::move(other.m_path)), m_configuration(std::move(other.m_configuration)),
+      m_knownPath(std::move(other.m_knownPath)), m_knownForeign(other.m_knownForeign) {
     other.m_elements.clear();
     other.m_kinds.clear();
     other.Changed();
@@ -52,6 +54,8 @@ CCarnet& CCarnet::operator=(CCarnet&& other) noexcept {
         m_kinds = std::move(other.m_kinds);
         m_path = std::move(other.m_path);
         m_configuration = std::move(other.m_configuration);
+        m_knownPath = std::move(other.m_knownPath);
+        m_knownForeign = other.m_knownForeign;
         other.m_elements.clear();
         other.m_kinds.clear();
     }

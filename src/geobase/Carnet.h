@@ -170,19 +170,29 @@ public:
 
     // ---- Files
     // Reads the GéoBase at `path`, replacing the contents. Lines that cannot be read are reported in the
-    // text window with their number and kept as comments. `configuration` names the code table the
+    // text window with their number and kept as comments. A read-only file is said to be so in the text
+    // window; a file that is not a GéoBase (see GeoFileCensus) is shown all the same, said to be foreign,
+    // and remembered as such so that no save replaces it. `configuration` names the code table the
     // GéoBase goes with, kept for the editor; with `report`, a summary line is written. Returns 1 when
     // the file was read, 0 when it could not be opened (the store is then left empty).
     int Load(CPyrTxtWnd* txt, const std::string& path, const std::string& configuration = {}, int report = 0,
              ui::FrontEnd* parent = nullptr);
-    // Writes the whole store to `path`, atomically (a temporary file beside it, then renamed over it).
-    // A failure is always reported; with `report`, so is the success. Returns 1 on success.
+    // Writes the whole store to `path`, atomically (a temporary file of a name no file holds, beside it,
+    // then renamed over it, with its access rights). Refused, leaving the file as it is, when `path` is
+    // read-only or holds something else than a GéoBase. A refusal or a failure is always reported, with
+    // its reason, as a failure of the running command; with `report`, so is the success. Returns 1 on
+    // success.
     int Save(const std::string& path, ui::FrontEnd* parent = nullptr, bool report = false);
     // Keeps a copy of the GéoBase file as it is before it is overwritten ("chantier.geo" gives
-    // "chantier.bak"). Returns 1 when there was nothing to keep or the copy was made.
-    int BackUp();
+    // "chantier.bak"), replacing the former copy whole or not at all. Returns 1 when there was nothing to
+    // keep or the copy was made; 0, reported as Save reports, when the file may not be saved over (as
+    // Save would refuse it, so that the refusal comes before the copy) or the copy failed: the caller
+    // then does not save.
+    int BackUp(ui::FrontEnd* parent = nullptr);
     // Writes the whole store to an open text file, with the format's header line when asked.
     bool Write(std::FILE* file, bool withHeader = true) const;
+    // Whether the file last loaded, still the store's path, was found not to be a GéoBase.
+    bool LoadedFileIsForeign() const { return m_knownForeign && m_knownPath == m_path; }
 
     const std::string& PathName() const { return m_path; }
     void SetPathName(std::string path) { m_path = std::move(path); }
@@ -217,8 +227,16 @@ private:
     // elements before m_noStationBefore hold none (forgotten at every change but an append).
     mutable int m_stationSeen = -1;
     mutable std::size_t m_noStationBefore = 0;
+    // The refusal (its reason, after kSaveFailed) of a save over `path`, empty when the save may go on.
+    std::string SaveRefusal(const std::string& path) const;
+    bool IsForeignFile(const std::string& path) const;
+
     std::string m_path;
     std::string m_configuration;
+    // What is known of the file at m_knownPath (the one loaded or last saved): whether it is foreign.
+    // Saving over that file needs no second look at it, which for a big GéoBase would mean reading it.
+    std::string m_knownPath;
+    bool m_knownForeign = false;
 
     static inline int s_deciXY = 4;
     static inline int s_deciZ = 3;

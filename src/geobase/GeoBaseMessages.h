@@ -12,6 +12,20 @@ inline constexpr const char* kCannotWrite = "Impossible d'écrire dans la GéoBa
 inline constexpr const char* kCreated = "GéoBase créée = <%s>.";
 inline constexpr const char* kElementDeleted = "Elément # %d (%s%s) supprimé de la GéoBase.";
 
+// Saving: a file is replaced only by a GéoBase written whole, and only when it is a GéoBase that its owner
+// left writable. Each refusal or failure follows kSaveFailed with its reason.
+inline constexpr const char* kSaveFailedReason = "\n(%s).";
+inline constexpr const char* kLeftAsItWas = "\nLe fichier est resté tel qu'il était.";
+inline constexpr const char* kRefusedReadOnly =
+    "\nCe fichier est en lecture seule : il est laissé tel qu'il est.\nEnregistrez la GéoBase sous un autre "
+    "nom, ou retirez d'abord la protection du fichier.";
+inline constexpr const char* kRefusedForeign =
+    "\nCe fichier n'est pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase sous un autre "
+    "nom.";
+inline constexpr const char* kBackUpFailed =
+    "Impossible de faire la copie de sauvegarde de la GéoBase\n%s\ndans\n%s\n(%s).\nLa GéoBase n'est pas "
+    "enregistrée ; l'ancienne copie de sauvegarde, s'il y en a une, est restée telle qu'elle était.";
+
 // Loading
 inline constexpr const char* kCannotOpen = "Impossible d'ouvrir la GéoBase <%s> !\n(%s)";
 inline constexpr const char* kNoHeader = "GéoBase <%s> : la première ligne n'est pas l'en-tête d'une GéoBase "
@@ -22,7 +36,12 @@ inline constexpr const char* kNewerVersion =
 inline constexpr const char* kReadAsWindows1252 = "GéoBase <%s> : fichier lu en Windows-1252.";
 inline constexpr const char* kLineKept = "Erreur ligne %d : %s ; la ligne est conservée en commentaire.";
 inline constexpr const char* kLoaded = "GéoBase <%s> : %d éléments lus.";
-inline constexpr const char* kBackUpFailed = "Impossible de faire la copie de sauvegarde de la GéoBase\n%s !";
+inline constexpr const char* kOpenedReadOnly =
+    "GéoBase <%s> en lecture seule : elle peut être lue et calculée, mais ses résultats ne pourront pas y "
+    "être enregistrés.";
+inline constexpr const char* kOpenedForeign =
+    "<%s> n'est pas une GéoBase (%lld ligne(s) illisible(s) sur %lld) : ses lignes sont montrées en "
+    "commentaires, mais ce fichier ne sera pas remplacé par un enregistrement.";
 
 // Reasons a line cannot be read
 inline constexpr const char* kUnknownKind = "type d'élément %s inconnu";

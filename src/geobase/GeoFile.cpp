@@ -1,7 +1,9 @@
 #include "geobase/GeoFile.h"
 
+#include "core/Lines.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 #include "geobase/Elements.h"
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/Kinds.h"
@@ -17,8 +19,28 @@ namespace {
 
 constexpr char kSeparator = '\t';
 
-// Texts may hold anything: a backslash, a tabulation and the line ends are escaped.
+bool NeedsEscape(char c) {
+    return c == '\\' || c == '\t' || c == '\n' || c == '\r';
+}
+
+// Texts may hold anything: a backslash, a tabulation and the line ends are escaped. A GéoBase is UTF-8
+// whatever a text brings (a field book read byte for byte, an instrument header cut in the middle of a
+// letter): a text that is not valid UTF-8 is written as its Windows-1252 reading, the one the loader gives
+// a file that is not UTF-8, so that the file reads back as it was written.
 void AppendEscaped(std::string& out, std::string_view text) {
+    // Most texts are plain ASCII (identifiers, codes): written at once.
+    size_t plain = 0;
+    while (plain < text.size() && static_cast<unsigned char>(text[plain]) < 0x80 && !NeedsEscape(text[plain]))
+        ++plain;
+    out.append(text.substr(0, plain));
+    text.remove_prefix(plain);
+    if (text.empty()) return;
+
+    std::string converted;
+    if (!IsValidUtf8(text)) {
+        converted = Windows1252ToUtf8(text);
+        text = converted;
+    }
     for (char c : text) {
         switch (c) {
         case '\\':
@@ -176,6 +198,27 @@ int GeoHeaderVersion(std::string_view line) {
     long long version = 0;
     if (!ParseInt(line, version) || version < 1 || version > 1000000) return 0;
     return static_cast<int>(version);
+}
+
+bool IsBlankGeoLine(std::string_view line) {
+    return line.find_first_not_of(" \t") == std::string_view::npos;
+}
+
+GeoFileCensus TakeGeoFileCensus(std::string_view text) {
+    GeoFileCensus census;
+    std::string error;
+    if (text.substr(0, 3) == "\xEF\xBB\xBF") text.remove_prefix(3);
+    ForEachLine(text, [&](std::string_view line, int) {
+        if (census.header) return; // a GéoBase: nothing more to learn
+        if (GeoHeaderVersion(line)) {
+            census.header = true;
+            return;
+        }
+        if (IsBlankGeoLine(line)) return;
+        int kind = 0;
+        census.Line(ParseElementLine(line, kind, error, false) != nullptr);
+    });
+    return census;
 }
 
 void AppendElementLine(std::string& out, const CElement& element, int kind) {

@@ -6,6 +6,7 @@
 #include "ui/ScriptedFrontEnd.h"
 
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
 namespace {
 
@@ -62,6 +63,29 @@ TEST_F(Editor, ANamedGeoBaseIsOpenedWithoutAskingAndAMissingOneIsRefused) {
 TEST_F(Editor, NoGeoBaseChosenEndsWithoutChange) {
     EXPECT_EQ(Open(""), DialogResult::Cancel);
     EXPECT_TRUE(frontEnd.lines.empty());
+}
+
+// The reduction saves only once the former GéoBase is backed up: a backup that fails stops it.
+TEST_F(Editor, TheReductionIsNotSavedWhenTheBackUpFails) {
+    const std::string twoSetUps = "GEOBASE PYRALIS\t1\n"
+                                  "1001\tS1\t1.75\t-999999\n"
+                                  "1002\tA\t1.25\t2\t100\t50\n"
+                                  "1001\tS1\t1.5\t-999999\n"
+                                  "1002\tA\t1.25\t397\t100\t50\n";
+    WriteBytes(dir / "a.geo", twoSetUps);
+    WriteBytes(dir / "a.bak", "copie protégée\n");
+    ASSERT_EQ(chmod((dir / "a.bak").c_str(), 0444), 0); // refused to root as well
+    frontEnd.dialogArguments = {dir / "a.geo", "--reduction", "--Suppress", "1"};
+    editor.SetInputs({"", dir / "Pyralis.ini", "", "éditeur de GéoBases"});
+    EXPECT_EQ(frontEnd.DoModal(editor), DialogResult::Failed);
+    EXPECT_EQ(ReadBytes(dir / "a.geo"), twoSetUps);
+    EXPECT_EQ(ReadBytes(dir / "a.bak"), "copie protégée\n");
+    ASSERT_FALSE(frontEnd.messages.empty());
+    EXPECT_EQ(
+        frontEnd.messages.back().text.find("Impossible de faire la copie de sauvegarde de la GéoBase\n" +
+                                           dir / "a.geo" + "\ndans\n" + dir / "a.bak" + "\n(accès refusé)."),
+        0u)
+        << frontEnd.messages.back().text;
 }
 
 } // namespace
