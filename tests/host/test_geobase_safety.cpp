@@ -1,0 +1,199 @@
+// The GéoBase is never lost, as a person or a script running pyralis sees it: a raw field book is never
+// written over as a GéoBase, a protected GéoBase stays as it is, a full disk leaves the GéoBase and its
+// backup as they were, and the surveyor's own files beside it are never touched.
+#include "HostTestSupport.h"
+#include "calc/test_v0_geometry.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <gtest/gtest.h>
+#include <sys/resource.h>
+#include <sys/stat.h>
+#include <sys/wait.h>
+#include <tuple>
+#include <unistd.h>
+
+namespace pyr::test {
+namespace {
+
+// Two small Wild GSI-8 books: a station and its sightings.
+constexpr const char* kWildBook = "410001+0000STA1 42....+00001.55 \r\n"
+                                  "110002+00000001 21.102+00000000 22.102+10000000 31..00+00025000 \r\n"
+                                  "110003+00000002 21.102+05000000 22.102+09500000 31..00+00030000 \r\n";
+constexpr const char* kOtherWildBook = "410001+0000STA2 42....+00001.62 \r\n"
+                                       "110002+0000STA1 21.102+20000000 22.102+10000000 31..00+00050000 \r\n";
+constexpr const char* kQuendalBook = "QUENDAL-PC;1\n"
+                                     "STATION;S1;1.562\n"
+                                     "REFERENCE;A1;1.3;323.76206;99.40145;260.0083\n"
+                                     "MESURE;102;1.8;388.64623;99.18242;111.5994;POTEAU\n";
+// What the Quendal book above adds to a GéoBase.
+constexpr const char* kQuendalLines = "1001\tS1\t1.562\t-999999\n"
+                                      "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
+                                      "1003\t102\t1.8\t388.64623\t99.18242\t111.5994\tPOTEAU\n";
+
+struct Outcome {
+    int status = -1;
+    std::string out, err;
+};
+
+bool Has(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
+
+std::vector<std::string> Names(const std::filesystem::path& folder) {
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(folder))
+        names.push_back(entry.path().filename().string());
+    std::sort(names.begin(), names.end());
+    return names;
+}
+
+class GeoBaseSafety : public ::testing::Test {
+protected:
+    // Runs pyralis in the test's folder with its own parameter file; with a limit, no file may grow past
+    // that many bytes, as a disk that fills up would stop it.
+    Outcome Run(const std::string& arguments, rlim_t limit = RLIM_INFINITY) {
+        const std::string command = "cd '" + dir.Root().string() + "' && '" + ProgramFile("pyralis") +
+                                    "' --params Pyralis.ini " + arguments +
+                                    " </dev/null >sortie.txt 2>erreurs.txt";
+        const pid_t child = fork();
+        if (child == 0) {
+            const rlimit bytes{limit, limit};
+            setrlimit(RLIMIT_FSIZE, &bytes);
+            execl("/bin/sh", "sh", "-c", command.c_str(), static_cast<char*>(nullptr));
+            _exit(127);
+        }
+        int raw = 0;
+        waitpid(child, &raw, 0);
+        return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(dir / "sortie.txt"),
+                ReadBytes(dir / "erreurs.txt")};
+    }
+
+    TempDir dir;
+};
+
+TEST_F(GeoBaseSafety, TheEditorNeverWritesAGeoBaseOverARawFieldBookNorOverItsBackup) {
+    WriteBytes(dir / "carnet.gsi", kWildBook);
+    WriteBytes(dir / "autre.gsi", kOtherWildBook);
+    WriteBytes(dir / "carnet.bak", "copie d'un autre jour\n");
+    for (int run = 1; run <= 2; ++run) {
+        const Outcome outcome = Run("--oui GeoEdit carnet.gsi --lecture Wild autre.gsi");
+        EXPECT_EQ(outcome.status, 1) << run << "\n" << outcome.err;
+        EXPECT_TRUE(Has(outcome.out, "<carnet.gsi> n'est pas une GéoBase (3 ligne(s) illisible(s) sur 3)"))
+            << outcome.out;
+        EXPECT_TRUE(Has(outcome.err,
+                        "Impossible d'enregistrer la GéoBase sous\ncarnet.gsi !\nCe fichier n'est "
+                        "pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase "
+                        "sous un autre nom."))
+            << outcome.err;
+        EXPECT_EQ(ReadBytes(dir / "carnet.gsi"), kWildBook);
+        EXPECT_EQ(ReadBytes(dir / "carnet.bak"), "copie d'un autre jour\n");
+    }
+}
+
+TEST_F(GeoBaseSafety, AReadOnlyGeoBaseIsComputedButNotWrittenEvenByRoot) {
+    const Place s1{1000.0, 2000.0, 100.0};
+    const std::pair<std::string, Place> references[] = {{"A", {1000.0, 2100.0, 101.0}},
+                                                        {"B", {1200.0, 2000.0, 99.2}}};
+    CCarnet carnet;
+    AddPoint(carnet, "S1", s1);
+    for (const auto& [name, place] : references)
+        AddPoint(carnet, name, place);
+    AddStation(carnet, "S1", 1.5);
+    for (const auto& [name, target] : references)
+        AddSighting(carnet, name, s1, 1.5, target, 1.3, 50.0);
+    ASSERT_EQ(carnet.Save(dir / "chantier.geo"), 1);
+    const std::string before = ReadBytes(dir / "chantier.geo");
+    ASSERT_EQ(chmod((dir / "chantier.geo").c_str(), 0444), 0);
+
+    const Outcome outcome = Run("CalculV0 --geobase chantier.geo --type toutes --enregistrer --non");
+    EXPECT_EQ(outcome.status, 1) << outcome.err;
+    EXPECT_TRUE(Has(outcome.out,
+                    "GéoBase <chantier.geo> en lecture seule : elle peut être lue et calculée, mais "
+                    "ses résultats ne pourront pas y être enregistrés."))
+        << outcome.out;
+    EXPECT_TRUE(Has(outcome.out, "Station S1(1) : V0 = 50.00000 gr")) << outcome.out;
+    EXPECT_TRUE(Has(outcome.err,
+                    "Impossible d'enregistrer la GéoBase sous\nchantier.geo !\nCe fichier est en "
+                    "lecture seule : il est laissé tel qu'il est."))
+        << outcome.err;
+    EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
+    EXPECT_FALSE(std::filesystem::exists(dir / "chantier.bak")) << "no backup of a file that is not saved";
+}
+
+// The GéoBase in a folder of its own, so that whatever a save leaves behind shows.
+class GeoBaseUnderSizeLimit : public GeoBaseSafety {
+protected:
+    GeoBaseUnderSizeLimit() {
+        std::filesystem::create_directory(dir.Root() / "travail");
+        WriteBytes(dir / "carnet.qdl", kQuendalBook);
+    }
+    std::string Geo() const { return dir / "travail/job.geo"; }
+    std::string Bak() const { return dir / "travail/job.bak"; }
+    Outcome Read(rlim_t limit) {
+        return Run("--oui GeoEdit travail/job.geo --lecture Quendal carnet.qdl", limit);
+    }
+
+    // A GéoBase of a few hundred points, as big as a small job.
+    static std::string Job() {
+        std::string job = "GEOBASE PYRALIS\t1\n";
+        for (int i = 0; i < 200; ++i)
+            job += "1006\tP" + std::to_string(i) + "\t651000.125\t6862000.5\t52.3\t-\tBORNE\n";
+        return job;
+    }
+};
+
+TEST_F(GeoBaseUnderSizeLimit, ASaveThatDoesNotFitLeavesTheGeoBaseItsBackupAndNoTemporaryFile) {
+    // As after the last save, the backup holds what the GéoBase holds: the backup of this save succeeds.
+    const std::string job = Job();
+    WriteBytes(Geo(), job);
+    WriteBytes(Bak(), job);
+    const auto names = Names(dir.Root() / "travail");
+
+    const Outcome outcome = Read(job.size() + std::string(kQuendalLines).size() - 1);
+    EXPECT_EQ(outcome.status, 1) << outcome.err;
+    EXPECT_TRUE(Has(outcome.err,
+                    "Impossible d'enregistrer la GéoBase sous\ntravail/job.geo !\n(fichier trop grand "
+                    "pour la limite de taille permise).\nLe fichier est resté tel qu'il était."))
+        << outcome.err;
+    EXPECT_EQ(ReadBytes(Geo()), job);
+    EXPECT_EQ(ReadBytes(Bak()), job);
+    EXPECT_EQ(Names(dir.Root() / "travail"), names);
+
+    // Without the limit, the very same command saves: the limit was all that stopped it.
+    const Outcome saved = Read(RLIM_INFINITY);
+    EXPECT_EQ(saved.status, 0) << saved.err;
+    EXPECT_EQ(ReadBytes(Geo()), job + kQuendalLines);
+}
+
+TEST_F(GeoBaseUnderSizeLimit, ABackupThatDoesNotFitLeavesTheFormerBackupWholeAndSavesNothing) {
+    const std::string job = Job();
+    const std::string former(4000, '#'); // an older backup, bigger than the limit below
+    WriteBytes(Geo(), job);
+    WriteBytes(Bak(), former);
+    const auto names = Names(dir.Root() / "travail");
+
+    const Outcome outcome = Read(2048);
+    EXPECT_EQ(outcome.status, 1) << outcome.err;
+    EXPECT_TRUE(Has(outcome.err,
+                    "Impossible de faire la copie de sauvegarde de la GéoBase\ntravail/job.geo\ndans\n"
+                    "travail/job.bak\n(fichier trop grand pour la limite de taille permise)."))
+        << outcome.err;
+    EXPECT_EQ(ReadBytes(Geo()), job);
+    EXPECT_EQ(ReadBytes(Bak()), former);
+    EXPECT_EQ(Names(dir.Root() / "travail"), names);
+}
+
+TEST_F(GeoBaseSafety, AFileOfTheSurveyorsNamedLikeTheGeoBaseSurvivesASave) {
+    WriteBytes(dir / "carnet.qdl", kQuendalBook);
+    WriteBytes(dir / "chantier.geo", "GEOBASE PYRALIS\t1\n");
+    WriteBytes(dir / "chantier.tmp", "mes notes de terrain\n");
+    const Outcome outcome = Run("--oui GeoEdit chantier.geo --lecture Quendal carnet.qdl");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_EQ(ReadBytes(dir / "chantier.geo"), std::string("GEOBASE PYRALIS\t1\n") + kQuendalLines);
+    EXPECT_EQ(ReadBytes(dir / "chantier.tmp"), "mes notes de terrain\n");
+    EXPECT_EQ(ReadBytes(dir / "chantier.bak"), "GEOBASE PYRALIS\t1\n");
+}
+
+} // namespace
+} // namespace pyr::test
