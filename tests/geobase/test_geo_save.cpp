@@ -268,35 +268,6 @@ TEST_F(GeoSave, TheBackUpReplacesTheFormerCopyWholeOrNotAtAll) {
     EXPECT_EQ(ReadBytes(backup), geo);
 }
 
-TEST_F(GeoSave, ASaveThatFailsLeavesTheGeoBaseAndNoTemporaryFileAndTheSurveyorsOwnFilesAreNeverTouched) {
-    WriteBytes(path, kGeo);
-    WriteBytes(dir / "chantier.tmp", "notes du géomètre\n"); // a file of the surveyor's, of that name
-    const std::vector<std::string> before = Names(dir.Root());
-    CCarnet job;
-    ASSERT_EQ(job.Load(&txt, path), 1);
-    job.Append(Points(500));
-
-    const ChildOutcome full = UnderSizeLimit(8192, [&](std::FILE* said) {
-        ui::ScriptedFrontEnd child;
-        const int done = job.Save(path, &child);
-        for (const auto& message : child.messages)
-            std::fputs(message.text.c_str(), said);
-        return done + 10 * child.Failures();
-    });
-    EXPECT_EQ(full.status, 10); // not saved, and said as a failure
-    EXPECT_EQ(full.said,
-              "Impossible d'enregistrer la GéoBase sous\n" + path +
-                  " !\n(fichier trop grand pour la limite de taille permise).\nLe fichier est resté "
-                  "tel qu'il était.");
-    EXPECT_EQ(ReadBytes(path), kGeo);
-    EXPECT_EQ(Names(dir.Root()), before);
-
-    // Saved for good: the surveyor's file is still there as it was.
-    ASSERT_EQ(job.Save(path, &fe), 1);
-    EXPECT_EQ(ReadBytes(dir / "chantier.tmp"), "notes du géomètre\n");
-    EXPECT_EQ(Names(dir.Root()), before);
-}
-
 TEST(GeoSaveAsUser, AFolderThatMayNotBeWrittenKeepsTheGeoBaseAndItsBackupAsTheyWere) {
     SKIP_WHEN_ROOT();
     TempDir dir;
