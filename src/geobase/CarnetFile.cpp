@@ -128,8 +128,9 @@ bool CCarnet::Write(std::FILE* file, bool withHeader) const {
 }
 
 bool CCarnet::IsForeignFile(const std::string& path) const {
+    if (!FileExists(path)) return false; // nothing there to lose
     if (path == m_knownPath) return m_knownForeign;
-    if (!FileExists(path) || OpensWithHeader(path)) return false;
+    if (OpensWithHeader(path)) return false;
     // Rare: a save under another name, over a file without a header at its top.
     std::string bytes;
     return ReadWholeFile(path, bytes) && TakeGeoFileCensus(bytes).IsForeign();
