@@ -99,7 +99,8 @@ void AppendEscapedByte(std::string& out, std::uint8_t byte) {
     out += static_cast<char>(0x80 | (byte & 0x3F));
 }
 
-// The text as the file keeps it: valid UTF-8 without NUL, CR or LF, each byte that is not so escaped.
+// The text as the file keeps it: valid UTF-8 without control characters but tab, each byte that is not
+// so escaped (a line end would cut the line, and a file of controls would no longer pass for text).
 std::string EscapeForFile(std::string_view text) {
     std::string out;
     out.reserve(text.size());
@@ -108,8 +109,8 @@ std::string EscapeForFile(std::string_view text) {
     while (p < end) {
         char32_t cp = 0;
         const std::size_t length = Utf8Sequence(p, end, cp);
-        const bool escaped =
-            length == 0 || cp == 0 || cp == '\n' || cp == '\r' || (cp >= kEscapeFirst && cp <= kEscapeLast);
+        const bool control = (cp < 0x20 && cp != '\t') || cp == 0x7F;
+        const bool escaped = length == 0 || control || (cp >= kEscapeFirst && cp <= kEscapeLast);
         if (!escaped) {
             out.append(reinterpret_cast<const char*>(p), length);
             p += length;
@@ -119,6 +120,12 @@ std::string EscapeForFile(std::string_view text) {
             AppendEscapedByte(out, *p);
     }
     return out;
+}
+
+// A section or key name as the file keeps it. Names are the program's own, and kept as they are: UTF-8,
+// a name that is not being taken as Windows-1252.
+std::string NameText(std::string_view name) {
+    return IsValidUtf8(name) ? std::string(name) : Windows1252ToUtf8(name);
 }
 
 // The bytes that the file's text stands for.
@@ -216,11 +223,15 @@ struct IniFile::Impl {
         ini.SetQuotes(true);
     }
 
-    // The library holds the file from its first line to its last section or key line. Of a file with
-    // neither, every line is in `leading`, written back before anything added; the comment, blank and
-    // stray lines after the last section or key line are in `trailing`, written back after everything.
+    // The library holds the file from its first section or key line to its last. The lines before the
+    // first are in `leading`, written back as they are before everything (the library would take a
+    // comment there for the file's or for the first section's depending on the blank lines around it,
+    // and write it back otherwise); of a file with no section or key, that is every line, and what is
+    // added comes after a blank line. The comment, blank and stray lines after the last section or key
+    // line are in `trailing`, written back after everything.
     CSimpleIniA ini;
     std::string leading;
+    bool anyEntry = false;
     std::string trailing;
     bool windows1252 = false;
     bool byteOrderMark = false;
@@ -232,6 +243,10 @@ IniFile::~IniFile() = default;
 IniFile::IniFile(IniFile&&) noexcept = default;
 IniFile& IniFile::operator=(IniFile&&) noexcept = default;
 
+// Control characters that a hand-edited file may hold and still be text (see IsParamFileText): a count,
+// not a rate, so that a file written from a text one, holding no more of them, is text too.
+constexpr std::size_t kMostStrayControls = 8;
+
 bool IsParamFileText(std::string_view bytes) {
     if (bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF")) return false;
     std::size_t controls = 0;
@@ -242,7 +257,7 @@ bool IsParamFileText(std::string_view bytes) {
             byte == '\t' || byte == '\n' || byte == '\v' || byte == '\f' || byte == '\r' || byte == 0x1A;
         if ((byte < 0x20 && !textControl) || byte == 0x7F) ++controls;
     }
-    return controls * 32 <= bytes.size();
+    return controls <= kMostStrayControls;
 }
 
 int IniFile::Load(const std::string& path) {
@@ -264,17 +279,35 @@ void IniFile::Parse(std::string_view bytes) {
     impl_ = std::make_unique<Impl>();
     Impl& d = *impl_;
     d.byteOrderMark = bytes.starts_with(kByteOrderMark);
-    const std::string text = FileBytesToUtf8(bytes, &d.windows1252);
+    std::string text = FileBytesToUtf8(bytes, &d.windows1252);
+    // No text holds a NUL, and the library would stop reading at the first: one stands for its escape.
+    if (text.find('\0') != std::string::npos) {
+        std::string escapedNul;
+        AppendEscapedByte(escapedNul, 0);
+        std::string withoutNul;
+        for (const char c : text) {
+            if (c == '\0')
+                withoutNul += escapedNul;
+            else
+                withoutNul += c;
+        }
+        text = std::move(withoutNul);
+    }
     if (text.find('\n') != std::string::npos || text.find('\r') != std::string::npos)
         d.crlf = text.find("\r\n") != std::string::npos;
 
     std::string head;
     std::string pendingMarked; // the lines since the last section or key line, strays marked
     std::string pendingRaw;    // the same lines as they are
-    bool anyEntry = false;
     ForEachLine(text, [&](std::string_view line, int) {
         const LineKind kind = Classify(line);
-        if (kind == LineKind::Section || kind == LineKind::Entry) {
+        const bool entry = kind == LineKind::Section || kind == LineKind::Entry;
+        if (!entry && !d.anyEntry) {
+            d.leading.append(line);
+            d.leading += '\n';
+            return;
+        }
+        if (entry) {
             head += pendingMarked;
             if (kind == LineKind::Entry)
                 head += KeepInnerQuotes(line);
@@ -283,7 +316,7 @@ void IniFile::Parse(std::string_view bytes) {
             head += '\n';
             pendingMarked.clear();
             pendingRaw.clear();
-            anyEntry = true;
+            d.anyEntry = true;
             return;
         }
         if (kind == LineKind::Stray || StartsWithStrayMark(line)) pendingMarked += kStrayMark;
@@ -292,28 +325,24 @@ void IniFile::Parse(std::string_view bytes) {
         pendingRaw.append(line);
         pendingRaw += '\n';
     });
-    if (anyEntry)
-        d.trailing = std::move(pendingRaw);
-    else
-        d.leading = std::move(pendingRaw);
+    d.trailing = std::move(pendingRaw);
     d.ini.LoadData(head.data(), head.size());
 }
 
 bool IniFile::HasSection(std::string_view section) const {
-    return impl_->ini.GetSection(EscapeForFile(section).c_str()) != nullptr;
+    return impl_->ini.GetSection(NameText(section).c_str()) != nullptr;
 }
 
 bool IniFile::Get(std::string_view section, std::string_view key, std::string& value) const {
-    const char* found =
-        impl_->ini.GetValue(EscapeForFile(section).c_str(), EscapeForFile(key).c_str(), nullptr);
+    const char* found = impl_->ini.GetValue(NameText(section).c_str(), NameText(key).c_str(), nullptr);
     if (!found) return false;
     value = UnescapeFromFile(found);
     return true;
 }
 
 void IniFile::Set(std::string_view section, std::string_view key, std::string_view value) {
-    const std::string sectionText = EscapeForFile(section);
-    std::string keyText = EscapeForFile(key);
+    const std::string sectionText = NameText(section);
+    std::string keyText = NameText(key);
     // A key already there keeps its spelling; the library would give it the caller's.
     CSimpleIniA::TNamesDepend keys;
     if (impl_->ini.GetAllKeys(sectionText.c_str(), keys)) {
@@ -350,8 +379,7 @@ std::vector<IniFile::Entry> IniFile::Entries() const {
             impl_->ini.GetAllValues(section.pItem, key.pItem, values);
             values.sort(CSimpleIniA::Entry::LoadOrder());
             for (const auto& value : values)
-                entries.push_back({UnescapeFromFile(section.pItem), UnescapeFromFile(key.pItem),
-                                   UnescapeFromFile(value.pItem)});
+                entries.push_back({section.pItem, key.pItem, UnescapeFromFile(value.pItem)});
         }
     }
     return entries;
@@ -363,7 +391,7 @@ std::string IniFile::Bytes() const {
     d.ini.Save(output, /*addSignature*/ false);
 
     std::string text = d.leading;
-    if (!text.empty() && !output.empty()) text += '\n';
+    if (!d.anyEntry && !d.leading.empty() && !output.empty()) text += '\n';
     AppendLibraryOutput(text, output);
     text += d.trailing;
 
@@ -376,8 +404,11 @@ std::string IniFile::Bytes() const {
         }
         text = std::move(withCr);
     }
+    // Back in its code page, unless a character has no place there, or the bytes that made the file
+    // not UTF-8 are gone (a value replaced): read as UTF-8, it would then change. UTF-8 keeps it all.
     if (d.windows1252) {
-        if (auto inCodePage = Utf8ToWindows1252(text)) text = std::move(*inCodePage);
+        auto inCodePage = Utf8ToWindows1252(text);
+        if (inCodePage && (*inCodePage == text || !IsValidUtf8(*inCodePage))) text = std::move(*inCodePage);
     }
     if (d.byteOrderMark) text.insert(0, kByteOrderMark);
     return text;

@@ -15,10 +15,11 @@
 //
 // Any bytes may be stored and read back exactly, while the file stays text: a file name given by the
 // system in Latin-1 ("relev\xE9.geo"), or holding a line end. Each byte of a text that UTF-8 cannot carry
-// (a byte of an invalid sequence), and each NUL, CR and LF, is kept in the file as the private-use
-// character U+EF00 + byte ("\xE9" as U+EFE9); reading maps every character from U+EF00 to U+EFFF back to
-// its byte. A character of that range in the text given is stored byte by byte the same way, so that it
-// too reads back as given.
+// (a byte of an invalid sequence), and each control character but tab (NUL, CR, LF ...), is kept in the
+// file as the private-use character U+EF00 + byte ("\xE9" as U+EFE9); reading maps every character from
+// U+EF00 to U+EFFF back to its byte. A character of that range in the text given is stored byte by byte
+// the same way, so that it too reads back as given. Section and key names are the program's own and are
+// kept as they are (UTF-8; a name that is not is taken as Windows-1252).
 namespace pyr {
 
 // What Load answers for a file that is there but is no parameter file (see IsParamFileText): the
@@ -29,9 +30,10 @@ inline constexpr int kNotParamText = EILSEQ;
 // Windows code page, with any line ends. Not text:
 //  - a byte-order mark of UTF-16 or UTF-32 (FF FE, FE FF), or a NUL byte anywhere: binary files, and
 //    UTF-16 or UTF-32 of any Latin letter, hold NULs, which no text editor writes;
-//  - control characters other than tab, line feed, vertical and form feed, carriage return and the old
-//    end-of-file mark (Ctrl-Z) for more than one byte in 32: the rate of binary data. A vertical tab
-//    pasted from a word processor or an escape slipped into a hand-edited file stays far below it.
+//  - more than eight control characters other than tab, line feed, vertical and form feed, carriage
+//    return and the old end-of-file mark (Ctrl-Z): binary data. A vertical tab pasted from a word
+//    processor, or an escape or two slipped into a hand-edited file, stay below it. The program writes no
+//    such character (its values escape them): a file it writes from a text is text.
 // A text without any section or key is text all the same: its lines are kept and the program's sections
 // follow them.
 bool IsParamFileText(std::string_view bytes);
@@ -50,7 +52,8 @@ public:
     // errno of any other failure.
     int Load(const std::string& path);
 
-    // Takes the bytes of a file: UTF-8, or Windows-1252 when they are not valid UTF-8; CRLF or LF.
+    // Takes the bytes of a file: UTF-8, or Windows-1252 when they are not valid UTF-8; CRLF or LF. A NUL
+    // byte, which no text holds, is read as its escape.
     void Parse(std::string_view bytes);
 
     bool HasSection(std::string_view section) const;
@@ -70,12 +73,15 @@ public:
         std::string value; // as Get gives it
         bool operator==(const Entry&) const = default;
     };
-    // Every value, section by section and key by key in the file's order, each line of a repeated key.
+    // Every value, section by section and key by key in the file's order, each line of a repeated key;
+    // the names as the file spells them.
     std::vector<Entry> Entries() const;
 
     // The file's bytes, in the encoding, line ending and byte-order mark the file was read with (UTF-8
     // and the platform's line ending for a new file). A Windows-1252 file that has come to hold a
-    // character its code page lacks ("≠", an escaped byte) is written whole in UTF-8 rather than lose it.
+    // character its code page lacks ("≠", an escaped byte) is written whole in UTF-8 rather than lose it;
+    // so is one whose bytes in the code page would read as UTF-8 next time (the value that was not UTF-8
+    // replaced), so that its accents read the same.
     std::string Bytes() const;
 
     // Writes Bytes() to the file through a temporary file beside it, renamed over it, so that the file is

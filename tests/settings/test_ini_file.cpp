@@ -132,7 +132,7 @@ TEST(IniFile, QuotedValuesAndCommentsThatLookLikeMarksKeepReadingTheSame) {
     EXPECT_EQ(Value(ini, "A", "Simple"), "  b ");
     ini.Set("A", "Autre", "1");
     const std::string bytes = ini.Bytes();
-    EXPECT_EQ(bytes.rfind(";\x01 commentaire\n", 0), 0u) << bytes;
+    EXPECT_EQ(bytes.rfind(";\x01 commentaire\n[A]\n", 0), 0u) << bytes;
     IniFile again;
     again.Parse(bytes);
     EXPECT_EQ(again.Entries(), ini.Entries());
@@ -157,8 +157,10 @@ TEST(IniFile, TextIsToldFromWhatNoEditorWrites) {
         {"\xFE\xFF\x4E\x2D\x65\x87", false, "UTF-16BE of two CJK letters, no NUL"},
         {"\x7F"
          "ELF\x02\x01\x01\x03\x04\x05\x06\x07\x08" +
-             std::string(20, 'a'),
-         false, "controls"},
+             std::string(200, 'a'),
+         false, "an executable's head"},
+        {"[A]\nx=\x01\x02\x03\x04\x05\x06\x07\x08\n", true, "eight stray controls"},
+        {"[A]\nx=\x01\x02\x03\x04\x05\x06\x07\x08\x0E\n", false, "nine"},
     };
     for (const auto& c : cases)
         EXPECT_EQ(IsParamFileText(c.bytes), c.text) << c.what;
