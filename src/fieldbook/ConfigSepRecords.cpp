@@ -6,6 +6,7 @@
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "core/Undefined.h"
+#include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "geobase/Carnet.h"
 #include "ui/FrontEnd.h"
@@ -13,6 +14,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cerrno>
 #include <cmath>
 
 namespace pyr {
@@ -219,7 +221,10 @@ void RecordBuilder::Missing(int line, const char* datum) const {
 void ImportRecords(const RecordLayout& layout, RecordUnits units, std::string_view text,
                    CRecordFields& fields, CCarnet& records, CPyrTxtWnd* txt) {
     RecordBuilder builder(layout, units, fields, records, txt);
-    ForEachLine(text, [&builder](std::string_view line, int number) { builder.ReadLine(line, number); });
+    ForEachLine(text, [&](std::string_view line, int number) {
+        if (txt && IsCutLastLine(text, line)) txt->PrintText(Sprintf(fb::kCutLastLine, number));
+        builder.ReadLine(line, number);
+    });
 }
 
 void ImportRecords(const CParamDriver& layout, std::string_view text, CRecordFields& fields, CCarnet& records,
@@ -231,8 +236,9 @@ bool ImportRecordFile(const CParamDriver& layout, const std::string& carnet, CRe
                       CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent) {
     std::string bytes;
     if (!ReadWholeFile(carnet, bytes)) {
+        const int code = errno;
         ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
-        frontEnd.MessageBox(fb::kMsgCannotOpenCarnet, ui::kCaption, ui::kIconWarning);
+        frontEnd.MessageBox(CarnetOpenFailure(carnet, code), ui::kCaption, ui::kIconWarning);
         return false;
     }
     bool windows1252 = false;

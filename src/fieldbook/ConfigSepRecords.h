@@ -51,7 +51,8 @@ struct RecordUnits {
     DistanceUnit distances = DistanceUnit::Metres;
 };
 
-// Reads a field book's text (UTF-8) line by line into `records` (appended), reporting in `txt`.
+// Reads a field book's text (UTF-8) line by line into `records` (appended), reporting in `txt` (a last
+// line cut by the transfer too, IsCutLastLine).
 void ImportRecords(const RecordLayout& layout, RecordUnits units, std::string_view text,
                    CRecordFields& fields, CCarnet& records, CPyrTxtWnd* txt);
 
@@ -60,8 +61,8 @@ void ImportRecords(const CParamDriver& layout, std::string_view text, CRecordFie
                    CPyrTxtWnd* txt);
 
 // Reads the file `carnet` (UTF-8, or Windows-1252 when it is not valid UTF-8) the same way. False when it
-// cannot be read: "Impossible d'ouvrir le fichier carnet !" is shown on `parent` (else the application's
-// front end) and nothing is added.
+// cannot be read: "Impossible d'ouvrir le fichier carnet !" with the path and the reason is shown on
+// `parent` (else the application's front end) and nothing is added.
 bool ImportRecordFile(const CParamDriver& layout, const std::string& carnet, CRecordFields& fields,
                       CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent);
 

@@ -1,6 +1,7 @@
 #include "fieldbook/FieldBookConverter.h"
 
 #include "core/Files.h"
+#include "core/SafeFile.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookReaders.h"
@@ -13,9 +14,9 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
+#include <cerrno>
 #include <cstdio>
 #include <filesystem>
-#include <unistd.h>
 
 namespace pyr {
 
@@ -65,6 +66,14 @@ std::string Recorded(const std::string& path) {
     return error ? path : absolute.lexically_normal().string();
 }
 
+// What the reader took from the field book: the instrument that the conversion writes at the head when
+// asked is not.
+int ElementsRead(const CCarnet& result, const ReadingChoices& choices) {
+    const bool instrument =
+        choices.writeInstrument && !result.IsEmpty() && result.GetType(0) == kKindAppareil;
+    return result.GetSize() - (instrument ? 1 : 0);
+}
+
 } // namespace
 
 FieldBookConverter::FieldBookConverter(FieldBookFormat format, ui::FrontEnd* parent, std::string paramPath,
@@ -84,16 +93,17 @@ bool HasZeroPrismHeight(const CCarnet& carnet) {
     return false;
 }
 
-bool WriteNewGeoBase(const CCarnet& carnet, const std::string& path) {
-    if (path.empty()) return false;
-    const std::string temporary = path + ".tmp";
-    std::FILE* file = std::fopen(temporary.c_str(), "w");
-    if (!file) return false;
-    bool written = carnet.Write(file, true) && std::fflush(file) == 0 && fsync(fileno(file)) == 0;
-    written = std::fclose(file) == 0 && written;
-    written = written && std::rename(temporary.c_str(), path.c_str()) == 0;
-    if (!written) std::remove(temporary.c_str());
-    return written;
+int WriteNewGeoBase(const CCarnet& carnet, const std::string& path) {
+    SafeFileWriter writer(path);
+    if (!writer.File()) return writer.Error() != 0 ? writer.Error() : EIO;
+    errno = 0;
+    if (!carnet.Write(writer.File(), true)) {
+        // A write refused by the system says why (a full disk, a size limit).
+        const int code = errno != 0 ? errno : EIO;
+        writer.Abandon();
+        return code;
+    }
+    return writer.Commit() ? 0 : writer.Error();
 }
 
 ui::DialogResult RunConversion(FieldBookConverter& c, CCarnet* target) {
@@ -165,24 +175,43 @@ ui::DialogResult RunConversion(FieldBookConverter& c, CCarnet* target) {
     if (preformatted.temporary) std::remove(preformatted.fileToRead.c_str());
     if (!read) return ui::DialogResult::Failed;
 
-    // 13 to 15: the check of the prism heights, then the merge or the new GéoBase.
+    // 15: the new GéoBase, written whole; recorded as the last file when it holds what was read.
+    const std::string& path = dialog->GeoBasePath();
+    const auto writeGeoBase = [&](const CCarnet& carnet, bool record) {
+        const bool existed = FileExists(path);
+        if (const int error = WriteNewGeoBase(carnet, path); error != 0) {
+            std::string text = Sprintf(fb::kGeoBaseAndReason, msg::kCannotWrite, path.c_str(),
+                                       SystemErrorText(error).c_str());
+            if (existed) text += fb::kGeoBaseKept;
+            frontEnd.ReportFailure(text);
+            return false;
+        }
+        if (c.txt) c.txt->Print(msg::kCreated, path.c_str());
+        c.m_written = path;
+        if (!record) return true;
+        const std::string recorded = Recorded(path);
+        c.registry.WriteString(kSectionPyralis, kKeyDernierFichier, recorded);
+        WriteLastGeoBase(c.params.Path(), recorded);
+        return true;
+    };
+
+    // A field book of another format, or an empty one, gives nothing: no GéoBase that holds something is
+    // replaced by an empty one, nothing is added to the editor's, and the last file stays the one the
+    // surveyor worked on.
+    if (ElementsRead(c.result, choices) == 0) {
+        frontEnd.ReportFailure(Sprintf(fb::kMsgNothingRead, choices.carnet.c_str(), info.name));
+        if (!target && !FileExists(path)) writeGeoBase(CCarnet(), false);
+        return ui::DialogResult::Failed;
+    }
+
+    // 13, 14: the check of the prism heights, then the merge.
     if (dialog->TestHpNulle() && HasZeroPrismHeight(c.result))
         frontEnd.MessageBox(fb::kMsgZeroPrismHeight, ui::kCaption, ui::kIconInformation);
     if (target) {
         target->Append(std::move(c.result));
         return ui::DialogResult::Ok;
     }
-    const std::string& path = dialog->GeoBasePath();
-    if (!WriteNewGeoBase(c.result, path)) {
-        frontEnd.MessageBox(msg::kCannotWrite, ui::kCaption, ui::kIconWarning);
-        return ui::DialogResult::Failed;
-    }
-    if (c.txt) c.txt->Print(msg::kCreated, path.c_str());
-    const std::string recorded = Recorded(path);
-    c.registry.WriteString(kSectionPyralis, kKeyDernierFichier, recorded);
-    WriteLastGeoBase(c.params.Path(), recorded);
-    c.m_written = path;
-    return ui::DialogResult::Ok;
+    return writeGeoBase(c.result, true) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
 }
 
 } // namespace pyr

@@ -64,14 +64,17 @@ private:
 // nothing is written to disk) or, without a target, writes a new GéoBase and records it as the last file.
 // Ok when the elements went where they should; Cancel when the person stopped; Failed when a message said
 // why it could not be done. A conversion stopped before the reading leaves the target and the disk as they
-// were.
+// were. A field book from which no element is read is a failure that says so: nothing is appended to the
+// target, no existing file is replaced (a new empty GéoBase is written only where there was no file), and
+// no last file is recorded.
 ui::DialogResult RunConversion(FieldBookConverter& converter, CCarnet* target = nullptr);
 
 // Whether a reference (1002) or measured sighting (1003) has a prism height of exactly 0.
 bool HasZeroPrismHeight(const CCarnet& carnet);
 
-// Writes a new GéoBase at `path` whole (through a temporary file beside it, renamed over it). False when it
-// cannot be written: nothing is left at `path` that was not there.
-bool WriteNewGeoBase(const CCarnet& carnet, const std::string& path);
+// Writes a new GéoBase at `path` whole (through a temporary file beside it, renamed over it, with the
+// access rights of the file it replaces). 0, or the system error when it cannot be written: then nothing
+// is left at `path` that was not there, and a file that was there is as it was.
+int WriteNewGeoBase(const CCarnet& carnet, const std::string& path);
 
 } // namespace pyr

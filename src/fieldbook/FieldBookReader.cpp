@@ -12,6 +12,7 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
+#include <cerrno>
 #include <cmath>
 
 namespace pyr {
@@ -46,15 +47,26 @@ const ReadingChoices& CFieldBookReader::Choices() const {
     return m_choices ? *m_choices : NoChoices();
 }
 
-std::string CFieldBookReader::OpenFailure(const std::string&) const {
-    return fb::kMsgCannotOpenCarnet;
+bool IsCutLastLine(std::string_view text, std::string_view line) {
+    return !text.empty() && line.data() + line.size() == text.data() + text.size() && text.back() != '\n' &&
+           text.back() != '\r' && !TrimmedOfControls(line).empty();
+}
+
+std::string CarnetOpenFailure(const std::string& path, int code) {
+    return Sprintf(fb::kCarnetPathAndReason, fb::kMsgCannotOpenCarnet, path.c_str(),
+                   SystemErrorText(code).c_str());
+}
+
+std::string CFieldBookReader::OpenFailure(const std::string& path, int code) const {
+    return CarnetOpenFailure(path, code);
 }
 
 bool CFieldBookReader::Read(const std::string& path, CCarnet& result) {
     std::string bytes;
     if (!ReadWholeFile(path, bytes)) {
+        const int code = errno;
         ui::FrontEnd& frontEnd = m_parent ? *m_parent : ui::ApplicationFrontEnd();
-        frontEnd.MessageBox(OpenFailure(path), ui::kCaption, ui::kIconWarning);
+        frontEnd.MessageBox(OpenFailure(path, code), ui::kCaption, ui::kIconWarning);
         return false;
     }
     m_path = path;
@@ -77,6 +89,7 @@ void CFieldBookReader::Run(std::string_view text, CCarnet& result) {
     BeginReading();
     if (Choices().writeInstrument) AddInstrument();
     ForEachLine(text, [&](std::string_view line, int number) {
+        if (IsCutLastLine(text, line)) LineError(fb::kCutLastLine, number);
         ReadLine(line, number);
         if (number % kProgressStride == 0)
             ShowProgress(number, static_cast<std::size_t>(line.data() - text.data()) + line.size(),

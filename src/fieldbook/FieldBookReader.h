@@ -87,11 +87,12 @@ public:
 
 protected:
     // ---- What a format gives
-    // The message when the file cannot be opened (the path given for those that name it).
-    virtual std::string OpenFailure(const std::string& path) const;
+    // The message when the file cannot be opened, the system error `code` telling why.
+    virtual std::string OpenFailure(const std::string& path, int code) const;
     // Before the first line: every pending value back to kUndefined, the pending texts emptied.
     virtual void BeginReading() {}
-    // One line, without its end, numbered from 1.
+    // One line, without its end, numbered from 1. A cut last line (IsCutLastLine) has been
+    // reported before it is given.
     virtual void ReadLine(std::string_view line, int number) = 0;
     // After the last line: what is still pending is written.
     virtual void EndReading() {}
@@ -162,6 +163,16 @@ private:
     std::chrono::steady_clock::time_point m_start;
     std::chrono::steady_clock::time_point m_lastProgress;
 };
+
+// Whether `line`, a line of `text` as ForEachLine gives it, is the last one and ends the text without a
+// line end while it holds more than blanks and transmission controls. Such a line was most often cut by
+// the transfer (a cable pulled, a download stopped): it is read all the same, and the surveyor is told to
+// check it. A last line of only a Ctrl-Z or an EOT is the normal end of a transfer.
+bool IsCutLastLine(std::string_view text, std::string_view line);
+
+// The message of a field book that cannot be opened: the text of the format, the path and the reason in
+// words of the system error `code`.
+std::string CarnetOpenFailure(const std::string& path, int code);
 
 // The instrument element of a configuration of the options: its name and constants.
 std::unique_ptr<CAppareil> MakeInstrument(const InstrumentOptions& instrument);

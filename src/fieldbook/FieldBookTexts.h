@@ -6,6 +6,8 @@ namespace pyr::fb {
 
 // ---- Message boxes of a conversion
 inline constexpr const char* kMsgCannotOpenCarnet = "Impossible d'ouvrir le fichier carnet !";
+// The field book named, and why the system could not open it.
+inline constexpr const char* kCarnetPathAndReason = "%s\n(%s : %s)";
 inline constexpr const char* kMsgCannotOpenCarnetForReading =
     "Impossible d'ouvrir le fichier carnet en lecture !\n(%s)";
 inline constexpr const char* kMsgNoCodeTableLoaded = "Pas de table de codes actuellement chargée !!!";
@@ -19,11 +21,20 @@ inline constexpr const char* kMsgReaderMissing =
     "La lecture des carnets %s n'est pas encore disponible dans cette version de PYRALIS Calculs Topo.";
 inline constexpr const char* kMsgCodeTableUnreadable = "La table de codes <%s> ne peut pas être lue !";
 inline constexpr const char* kMsgCannotWriteFile = "Impossible d'écrire le fichier <%s> !";
+// A message, then on their own lines the GéoBase that could not be written and why.
+inline constexpr const char* kGeoBaseAndReason = "%s\n<%s>\n(%s).";
+inline constexpr const char* kGeoBaseKept = "\nLa GéoBase est restée telle qu'elle était.";
+// A field book that gave no element: empty, cut at its start, or written in another format than the one of
+// the command.
+inline constexpr const char* kMsgNothingRead =
+    "Carnet <%s> : aucun élément lu au format « %s » !\nLe carnet est vide ou n'est pas de ce format.";
 
 // ---- The reading dialog
 inline constexpr const char* kCaption = "Lecture du carnet";
 inline constexpr const char* kMsgCarnetMissing = "Le fichier carnet indiqué n'existe pas !";
 inline constexpr const char* kMsgParamFileMissing = "Le fichier de paramétrage indiqué n'existe pas !";
+// A message followed by what it is about (the path of a file, the reason in words of a failure).
+inline constexpr const char* kInParentheses = "%s\n(%s)";
 inline constexpr const char* kAskCreateParamFile = "%s\nVoulez-vous en créer un nouveau ?";
 inline constexpr const char* kAskCodeTable = "%s%s";
 inline constexpr const char* kNoCodeTableNamed = "Aucune table de codes n'est indiquée.";
@@ -73,6 +84,8 @@ inline constexpr const char* kCreating = "\nCréation de la GéoBase en cours ..
 inline constexpr const char* kFinished = " ... terminée : %d lignes écrites.";
 inline constexpr const char* kProgress = "   ... %d lignes lues (%d %%)";
 inline constexpr const char* kBadLength = "Attention : ligne %d de longueur incorrecte (%d / %d) !";
+inline constexpr const char* kCutLastLine =
+    "Attention : ligne %d sans fin de ligne, le carnet semble coupé ; elle est lue telle quelle !";
 inline constexpr const char* kUnrecognised = "Erreur ligne %d : donnée non reconnue !";
 inline constexpr const char* kMissingDatum = "Erreur ligne %d : donnée manquante pour %s !";
 inline constexpr const char* kNoStationForHI =

@@ -180,9 +180,11 @@ ui::DialogResult CLectCarnet::OnOK(ui::FrontEnd& frontEnd) {
     m_focus = Field::None;
     m_noCodeTable = false;
     if (m_carnet.empty() || !FileExists(m_carnet))
-        return Fail(frontEnd, fb::kMsgCarnetMissing, Field::Carnet);
+        return Fail(frontEnd, Sprintf(fb::kInParentheses, fb::kMsgCarnetMissing, m_carnet.c_str()),
+                    Field::Carnet);
     if (HasParamFile() && (ParamFile().empty() || !FileExists(ParamFile())))
-        return Fail(frontEnd, fb::kMsgParamFileMissing, Field::ParamFile);
+        return Fail(frontEnd, Sprintf(fb::kInParentheses, fb::kMsgParamFileMissing, ParamFile().c_str()),
+                    Field::ParamFile);
 
     m_codeTable = std::string(Trimmed(m_codeTable));
     const std::string table = ResolvedCodeTable();

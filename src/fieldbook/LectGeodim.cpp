@@ -179,7 +179,9 @@ void CLectGeodim::EndReading() {
 // ---- Second pass: the blocks -----------------------------------------------------------------------------
 
 void CLectGeodim::ReadRecords(std::string_view records) {
-    if (!Path().empty()) AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
+    // A book without one record of the format (another file) gives nothing, not even its name.
+    if (!Path().empty() && !records.empty())
+        AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
     ForEachLine(records, [&](std::string_view line, int) {
         int number = 0;
         gdm::Record record;

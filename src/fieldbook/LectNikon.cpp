@@ -131,27 +131,24 @@ void CLectNikon::ReadLine(std::string_view line, int number) {
     const std::string_view type = m_fields[0];
     // The instrument keeps a record that was measured again with a "*" in front: the later one counts.
     if (type.starts_with('*')) return;
-    if (IsDigits(type)) {
-        if (!m_dtmStarted) {
-            m_dtmStarted = true;
-            Started(nik::kDtmFormat);
-        }
-        return ReadDtm(number);
-    }
+    if (IsDigits(type)) return ReadDtm(number);
+    const bool comment = EqualIgnoringCase(type, "CO"), coordinates = IsCoordinateType(type),
+               station = EqualIgnoringCase(type, "ST"), bothFaces = IsAnyOf(type, {"F1", "F2"}),
+               shot = IsAnyOf(type, {"SS", "CP", "SO"});
+    // A line of another file says nothing of this one: the header waits for a record of the format.
+    if (!comment && !coordinates && !station && !bothFaces && !shot) return LineUnrecognised(number);
     if (!m_rawStarted) {
         m_rawStarted = true;
         Started(nullptr);
     }
-    if (EqualIgnoringCase(type, "CO")) {
+    if (comment) {
         const std::size_t comma = line.find(',');
         return ReadComment(comma == std::string_view::npos ? std::string_view() : line.substr(comma + 1),
                            number);
     }
-    if (IsCoordinateType(type)) return ReadCoordinates(number);
-    if (EqualIgnoringCase(type, "ST")) return ReadStation(number);
-    if (IsAnyOf(type, {"F1", "F2"})) return ReadShot(number, true);
-    if (IsAnyOf(type, {"SS", "CP", "SO"})) return ReadShot(number, false);
-    LineUnrecognised(number);
+    if (coordinates) return ReadCoordinates(number);
+    if (station) return ReadStation(number);
+    ReadShot(number, bothFaces);
 }
 
 // ---- Raw format V2.00: comments and declarations ---------------------------------------------------------
@@ -332,6 +329,10 @@ void CLectNikon::ReadDtm(int number) {
     if (!ParseInt(f[1], type) || type < 0 || type > 3) {
         if (TextWindow()) TextWindow()->Print(nik::kBadType, number, std::string(f[1]).c_str());
         return;
+    }
+    if (!m_dtmStarted) {
+        m_dtmStarted = true;
+        Started(nik::kDtmFormat);
     }
     AngleUnit angles = m_settings.angles;
     DistanceUnit distances = m_settings.distances;

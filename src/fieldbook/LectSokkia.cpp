@@ -34,13 +34,18 @@ constexpr int kEdmColumn = 28, kEdmSerialColumn = 44;
 constexpr std::size_t kZeroVerticalIndex = 50;
 constexpr int kConstantsColumn = 52;
 constexpr int kJobWidth = 16;
+constexpr int kFirstFieldColumn = 5; // after the type (columns 1-2) and the derivation code (3-4)
 
 bool IsDigit(char c) {
     return c >= '0' && c <= '9';
 }
 
+// The code letter at a column counted from 0 in characters, ' ' beyond the line; '?' for a letter that is
+// no code (an accented one), which says it in the report of an unknown code.
 char At(std::string_view line, std::size_t index) {
-    return index < line.size() ? line[index] : ' ';
+    const std::string_view letter = sdr::Column(line, static_cast<int>(index) + 1, 1);
+    if (letter.empty()) return ' ';
+    return letter.size() == 1 ? letter.front() : '?';
 }
 
 // A line without the blanks, the line-end and transfer controls (EOT, Ctrl-Z) behind its last datum.
@@ -149,12 +154,17 @@ void CLectSokkia::ReadRecord(std::string_view line, int number) {
     const std::string_view content = Content(line);
     if (content.empty()) return;
     if (content.size() < 2 || !IsDigit(content[0]) || !IsDigit(content[1])) return LineUnrecognised(number);
-    HeaderOnce();
     const std::string_view type = content.substr(0, 2);
-    const std::string_view derivation = content.substr(2, std::min<std::size_t>(2, content.size() - 2));
     if (type != "08" && type != "09" && type != "13") m_lastSighted.clear();
+    const sdr::Layout* layout = sdr::LayoutOf(type);
+    // A line of another file says nothing of this one: the header waits for a record of the format.
+    if (!layout && type != "00" && type != "01" && type != "04" && type != "05" && type != "06" &&
+        type != "10")
+        return LineUnrecognised(number);
+    HeaderOnce();
+    const std::string_view derivation = content.substr(2, std::min<std::size_t>(2, content.size() - 2));
 
-    if (const sdr::Layout* layout = sdr::LayoutOf(type)) {
+    if (layout) {
         if (!m_variantKnown && type != "03" && type != "13") SetVariant(sdr::GuessVariant(content, *layout));
         const int expected = sdr::RecordLength(*layout, m_variant);
         if (static_cast<int>(Utf8Length(content)) > expected) CheckLength(number, line, expected);
@@ -175,12 +185,8 @@ void CLectSokkia::ReadRecord(std::string_view line, int number) {
     if (type == "00") return ReadHeader(content, number);
     if (type == "01") return ReadInstrument(content);
     if (type == "04" || type == "05" || type == "06") return ReadConstants(type, content);
-    if (type == "10") {
-        const std::string_view job = sdr::Column(content, 5, kJobWidth);
-        if (!job.empty()) AddHeaderComment(fb::kLabelJob, job);
-        return;
-    }
-    LineUnrecognised(number);
+    const std::string_view job = sdr::Column(content, kFirstFieldColumn, kJobWidth);
+    if (!job.empty()) AddHeaderComment(fb::kLabelJob, job);
 }
 
 // ---- Header records --------------------------------------------------------------------------------------
@@ -255,7 +261,7 @@ void CLectSokkia::ReadInstrument(std::string_view line) {
 }
 
 void CLectSokkia::ReadConstants(std::string_view type, std::string_view line) {
-    const std::string values = Words(line.substr(std::min<std::size_t>(4, line.size())));
+    const std::string values = Words(sdr::From(line, kFirstFieldColumn));
     if (values.empty()) return;
     const char* label = type == "04"   ? text::kLabelCollimation
                         : type == "05" ? fb::kLabelAtmosphere

@@ -79,6 +79,10 @@ std::string_view Column(std::string_view line, int first, int width) {
     return Trimmed(line.substr(start, Advance(line, start, width) - start));
 }
 
+std::string_view From(std::string_view line, int first) {
+    return line.substr(Advance(line, 0, first - 1));
+}
+
 void SplitRecord(std::string_view line, const Layout& layout, Variant variant, Fields& fields) {
     std::size_t start = Advance(line, 0, kFirstField - 1);
     for (int i = 0; i < layout.count; ++i) {

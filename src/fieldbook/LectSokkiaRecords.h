@@ -44,6 +44,10 @@ void SplitRecord(std::string_view line, const Layout& layout, Variant variant, F
 // line.
 std::string_view Column(std::string_view line, int first, int width);
 
+// The rest of the line from column `first` counted from 1 in characters (an accented letter of a
+// Windows-1252 book is one column, never split), untrimmed; empty beyond the line.
+std::string_view From(std::string_view line, int first);
+
 // The variant of a record written without a header to say it: SDR2x always fills its 4-character
 // identifier in columns 5 to 8, where SDR33 writes the blanks in front of its right-justified ones; and
 // an SDR2x record is never longer than its layout.

@@ -1,6 +1,7 @@
 #include "fieldbook/LectTopcon.h"
 
 #include "core/Angles.h"
+#include "core/Files.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookTexts.h"
@@ -49,8 +50,9 @@ std::unique_ptr<CFieldBookReader> MakeTopconReader() {
     return std::make_unique<CLectTopcon>();
 }
 
-std::string CLectTopcon::OpenFailure(const std::string& path) const {
-    return Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str());
+std::string CLectTopcon::OpenFailure(const std::string& path, int code) const {
+    return Sprintf(fb::kInParentheses, Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str()).c_str(),
+                   SystemErrorText(code).c_str());
 }
 
 // ---- Settings and state ----------------------------------------------------------------------------------
@@ -61,7 +63,8 @@ void CLectTopcon::ReadSettings() {
 
 void CLectTopcon::BeginReading() {
     ReadSettings();
-    m_started = false;
+    m_started = m_lineSeen = false;
+    m_software.clear();
     m_stationPending = false;
     m_stationName.clear();
     m_stationCode.clear();
@@ -91,11 +94,20 @@ void CLectTopcon::ReadLine(std::string_view line, int number) {
     topcon::SplitRecord(clean, m_record);
     const Keyword kind = m_record.kind;
 
-    const bool first = !m_started;
-    if (first) {
+    // The first line of a field book names the program that wrote it ("TopSURV v6.04(OnBoard)"). It is
+    // written, after the name of the file, once a record of the format shows that the file is one: a file
+    // of another kind gives nothing.
+    const bool firstLine = !m_lineSeen;
+    m_lineSeen = true;
+    if (kind == Keyword::Unknown && firstLine) {
+        m_software.assign(clean);
+        return;
+    }
+    if (kind != Keyword::Unknown && !m_started) {
         m_started = true;
         if (!Path().empty())
             AddHeaderComment(fb::kLabelFile, std::filesystem::path(Path()).filename().string());
+        if (!m_software.empty()) AddHeaderComment(fb::kLabelSoftware, m_software);
     }
     // A station waits only for its coordinates, a sighting only for its observation (a note between
     // them is allowed), an XYZ line belongs only to the line just before it.
@@ -149,8 +161,6 @@ void CLectTopcon::ReadLine(std::string_view line, int number) {
     case Keyword::Unknown:
         break;
     }
-    // The first line of a field book names the program that wrote it ("TopSURV v6.04(OnBoard)").
-    if (first) return AddHeaderComment(fb::kLabelSoftware, clean);
     LineUnrecognised(number);
 }
 

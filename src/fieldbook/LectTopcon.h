@@ -25,7 +25,7 @@ namespace pyr {
 //  - NOTE is a comment; OFFSET is said not to be applied; any other line is reported.
 class CLectTopcon : public CFieldBookReader {
 protected:
-    std::string OpenFailure(const std::string& path) const override;
+    std::string OpenFailure(const std::string& path, int code) const override;
     void BeginReading() override;
     void ReadLine(std::string_view line, int number) override;
     void EndReading() override;
@@ -59,7 +59,9 @@ private:
     // ---- The line being read
     topcon::Record m_record;
     std::string m_text;
-    bool m_started = false; // a line with content was read
+    bool m_lineSeen = false; // a line with content was read
+    bool m_started = false;  // a record of the format was read: the header comments are written
+    std::string m_software;  // the first line, when it is no record: the program that wrote the book
 
     // ---- A station waits for the XYZ line that may follow it
     bool m_stationPending = false;

@@ -2,6 +2,7 @@
 
 #include "core/Files.h"
 #include "core/Numbers.h"
+#include "core/SafeFile.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "settings/ParamStore.h"
@@ -9,7 +10,6 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <filesystem>
 
 namespace pyr {
 
@@ -344,9 +344,8 @@ void CParamDriver::Edit(ui::FrontEnd& frontEnd) {
         // A new file starts as a copy of the installation's, with its explanations; else with the defaults.
         const char* shipped = FormatInfo(m_format).parameterFile;
         const std::string installed = shipped ? InstallationConfigFile(m_installDir, shipped) : std::string();
-        std::error_code error;
-        const bool copied = !installed.empty() && FileExists(installed) &&
-                            std::filesystem::copy_file(installed, m_file, error) && !error;
+        const bool copied =
+            !installed.empty() && FileExists(installed) && CopyFileContents(installed, m_file) == 0;
         if (!copied && !Save()) return;
     }
     frontEnd.ShowFile(m_file);

@@ -1,6 +1,7 @@
 // A whole conversion: settings read, dialog, settings written back, reading, then a new GéoBase or the
 // elements appended to the editor's; and every way it stops without touching anything.
 #include "FieldBookTestSupport.h"
+#include "core/Lines.h"
 #include "fieldbook/FieldBookConverter.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectCarnet.h"
@@ -26,6 +27,8 @@ constexpr const char* kBook = "QUENDAL-PC;1\n"
                               "REFERENCE;A1;1.3;323.76206;99.40145;260.0083\n"
                               "MESURE;102;1.8;388.64623;99.18242;111.5994;POTEAU\n";
 constexpr const char* kEmptyGeoBase = "GEOBASE PYRALIS\t1\n";
+constexpr const char* kJob = "GEOBASE PYRALIS\t1\n"
+                             "1006\tA1\t651050.118\t6862512.447\t-999999\tXY\tBORNE\n";
 
 class Conversion : public ::testing::Test {
 protected:
@@ -82,11 +85,104 @@ TEST_F(Conversion, ANewGeoBaseIsWrittenBesideTheFieldBookAndRecorded) {
     EXPECT_EQ(LastFile(), dir / "carnet.geo");
 }
 
-TEST_F(Conversion, AFieldBookWithNothingToReadMakesAnEmptyGeoBase) {
-    WriteBytes(dir / "vide.qdl", "QUENDAL-PC;1\n\n");
-    EXPECT_EQ(Convert({dir / "vide.qdl"}), DialogResult::Ok);
-    EXPECT_TRUE(Said(" ... terminée : 0 lignes écrites."));
-    EXPECT_EQ(ReadBytes(dir / "vide.geo"), kEmptyGeoBase);
+// A field book that gives no element (empty, junk, another format, or only a header that the format
+// skips) is a failure that says which book and format: the existing GéoBase stays as it was, the editor's
+// gets nothing, the last file stays the one the surveyor worked on; a new, empty GéoBase is left only where
+// there was no file. The instrument the conversion writes at the head is no element read.
+TEST_F(Conversion, AFieldBookWithNothingToReadIsAFailureThatReplacesNothing) {
+    const std::string nothing = "Carnet <" + dir / "vide.qdl" +
+                                "> : aucun élément lu au format « Quendal-Pc » !\nLe carnet est vide ou "
+                                "n'est pas de ce format.";
+    const struct {
+        const char* what;
+        std::string book;
+        bool geoBaseThere;
+        bool merge;
+        bool instrument;
+    } cases[] = {
+        {"vide, GéoBase absente", "", false, false, false},
+        {"en-tête seul, GéoBase absente", "QUENDAL-PC;1\n\n", false, false, true},
+        {"octets quelconques, GéoBase présente", "\x7f\x45LF\x02\x01\xff\xfe\n\x00\x01", true, false, false},
+        {"autre format, GéoBase présente", "0000000001+0000000000000101 21.324+0000000012345678\n", true,
+         false, true},
+        {"vide, dans la GéoBase de l'éditeur", "", false, true, true},
+    };
+    for (const auto& c : cases) {
+        fs::remove(dir / "vide.geo");
+        if (c.geoBaseThere) WriteBytes(dir / "vide.geo", kJob);
+        WriteLastGeoBase(Params(), "avant.geo");
+        WriteParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "avant.geo");
+        WriteBytes(dir / "vide.qdl", c.book);
+        frontEnd = {};
+        CCarnet target;
+        target.Add(std::make_unique<CComment>("déjà là"), kKindComment);
+        const std::vector<std::string> arguments{dir / "vide.qdl", "--ecrire-appareil",
+                                                 c.instrument ? "1" : "0"};
+        if (c.geoBaseThere) frontEnd.answers = {Answer::Yes}; // replace it: the person agreed
+        EXPECT_EQ(Convert(arguments, c.merge ? &target : nullptr), DialogResult::Failed) << c.what;
+        EXPECT_TRUE(Said(" ... terminée : " + std::string(c.instrument ? "1" : "0") + " lignes écrites."))
+            << c.what << frontEnd.AllLines();
+        EXPECT_EQ(MessageTexts(frontEnd), nothing) << c.what;
+        EXPECT_EQ(frontEnd.Failures(), 1) << c.what;
+        EXPECT_EQ(target.GetSize(), 1) << c.what;
+        const std::string left = c.geoBaseThere ? std::string(kJob) : c.merge ? "" : kEmptyGeoBase;
+        EXPECT_EQ(fs::exists(dir / "vide.geo") ? ReadBytes(dir / "vide.geo") : "", left) << c.what;
+        EXPECT_EQ(ReadLastGeoBase(Params()), "avant.geo") << c.what;
+        EXPECT_EQ(LastFile(), "avant.geo") << c.what;
+    }
+}
+
+// Every format through its own reader and the shipped settings: a field book cut in the middle of its
+// last line is told once, with the number of that line in the surveyor's file, and what it held is read.
+TEST_F(Conversion, EveryFormatTellsACutLastLineOnce) {
+    for (const auto& entry : fs::directory_iterator(std::string(PYR_SOURCE_DIR) + "/data/Config"))
+        fs::copy_file(entry.path(), install + "Config/" + entry.path().filename().string(),
+                      fs::copy_options::skip_existing);
+    const struct {
+        FieldBookFormat format;
+        const char* sample;
+        const char* layout;
+    } cases[] = {
+        {FieldBookFormat::Geotronics, "gdm-chantier.job", nullptr},
+        {FieldBookFormat::NikonAtlas, "nikon-raw-gons.raw", nullptr},
+        {FieldBookFormat::NikonPsion, "nikon-dtm.nik", nullptr},
+        {FieldBookFormat::Sokkia, "sokkia-sdr33.sdr", nullptr},
+        {FieldBookFormat::TopconGT7, "topcon-metres-dms.gts7", nullptr},
+        {FieldBookFormat::Wild, "wild-gsi8-41.gsi", nullptr},
+        {FieldBookFormat::Zeiss, "zeiss-m5-mesures.txt", nullptr},
+        {FieldBookFormat::Separateur, "leve-separateur.csv", "leve.sep"},
+        {FieldBookFormat::Colonne, "leve-colonne.txt", "leve.col"},
+        {FieldBookFormat::Quendal, "leve-quendal.txt", nullptr},
+    };
+    for (const auto& c : cases) {
+        // The book without its end: its last line loses its line end, its transfer marks and a character.
+        std::string book = ReadBytes(FieldBookData(c.sample));
+        while (!book.empty() && (static_cast<unsigned char>(book.back()) <= ' ' || book.back() == '\x7f'))
+            book.pop_back();
+        book.pop_back();
+        int lines = 0;
+        ForEachLine(book, [&lines](std::string_view, int number) { lines = number; });
+        const std::string carnet = dir / (std::string("coupé-") + c.sample);
+        WriteBytes(carnet, book);
+        frontEnd = {};
+        frontEnd.answers = {Answer::Yes};
+        frontEnd.dialogArguments = {carnet};
+        if (c.layout)
+            frontEnd.dialogArguments.insert(frontEnd.dialogArguments.end(),
+                                            {"--parametrage", FieldBookData(c.layout)});
+        EXPECT_EQ(RunConversion(*Make(c.format), nullptr), DialogResult::Ok)
+            << c.sample << frontEnd.AllLines();
+        const std::string cut = "Attention : ligne " + std::to_string(lines) + " sans fin de ligne";
+        EXPECT_EQ(std::count_if(frontEnd.lines.begin(), frontEnd.lines.end(),
+                                [](const std::string& line) {
+                                    return line.find("sans fin de ligne") != std::string::npos;
+                                }),
+                  1)
+            << c.sample << frontEnd.AllLines();
+        EXPECT_TRUE(std::any_of(frontEnd.lines.begin(), frontEnd.lines.end(),
+                                [&](const std::string& line) { return line.starts_with(cut); }))
+            << c.sample << frontEnd.AllLines();
+    }
 }
 
 // Stopped before the reading, a conversion leaves the disk and the open GéoBase as they were.
@@ -119,14 +215,47 @@ TEST_F(Conversion, AStoppedConversionTouchesNothing) {
     }
 }
 
-TEST_F(Conversion, AFailedWriteLeavesTheLastFileKeysAsTheyWere) {
-    WriteLastGeoBase(Params(), "avant.geo");
-    WriteParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "avant.geo");
-    EXPECT_EQ(Convert({dir / "carnet.qdl", "--geobase", dir / "absent/carnet.geo"}), DialogResult::Failed);
-    EXPECT_EQ(MessageTexts(frontEnd), "Impossible d'écrire dans la GéoBase indiquée !");
-    EXPECT_EQ(ReadLastGeoBase(Params()), "avant.geo");
-    EXPECT_EQ(LastFile(), "avant.geo");
+// A GéoBase that cannot be written is named with the reason in words; one that is there stays as it was,
+// and the last-file keys too. A GéoBase replaced keeps the access rights the surveyor gave it.
+TEST_F(Conversion, AFailedWriteSaysWhyAndLeavesTheLastFileKeysAsTheyWere) {
+    const std::string noFolder = dir / "absent/carnet.geo", readOnly = dir / "protégée.geo";
+    WriteBytes(readOnly, kJob);
+    chmod(readOnly.c_str(), 0444);
+    const struct {
+        std::string geoBase;
+        std::string message;
+    } cases[] = {
+        {noFolder, "Impossible d'écrire dans la GéoBase indiquée !\n<" + noFolder +
+                       ">\n(fichier ou dossier inexistant)."},
+        {readOnly, "Impossible d'écrire dans la GéoBase indiquée !\n<" + readOnly +
+                       ">\n(accès refusé).\nLa GéoBase est restée telle qu'elle était."},
+    };
+    for (const auto& c : cases) {
+        frontEnd = {};
+        frontEnd.answers = {Answer::Yes};
+        WriteLastGeoBase(Params(), "avant.geo");
+        WriteParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "avant.geo");
+        EXPECT_EQ(Convert({dir / "carnet.qdl", "--geobase", c.geoBase}), DialogResult::Failed);
+        EXPECT_EQ(MessageTexts(frontEnd), c.message);
+        EXPECT_EQ(frontEnd.Failures(), 1);
+        EXPECT_EQ(ReadLastGeoBase(Params()), "avant.geo");
+        EXPECT_EQ(LastFile(), "avant.geo");
+    }
     EXPECT_FALSE(fs::exists(dir / "absent"));
+    EXPECT_EQ(ReadBytes(readOnly), kJob);
+
+    const std::string shared = dir / "partagée.geo";
+    WriteBytes(shared, kJob);
+    chmod(shared.c_str(), 0664);
+    frontEnd = {};
+    frontEnd.answers = {Answer::Yes};
+    EXPECT_EQ(Convert({dir / "carnet.qdl", "--geobase", shared}), DialogResult::Ok);
+    struct stat info {};
+    ASSERT_EQ(stat(shared.c_str(), &info), 0);
+    EXPECT_EQ(info.st_mode & 0777, 0664u);
+    EXPECT_TRUE(ReadBytes(shared).ends_with("POTEAU\n"));
+    for (const auto& entry : fs::directory_iterator(dir.Root()))
+        EXPECT_NE(entry.path().extension(), ".tmp") << entry.path();
 }
 
 // Into the editor's GéoBase: after its elements, in reading order, the instrument first; nothing written.

@@ -94,8 +94,9 @@ TEST_F(LectCarnet, TheChecksOfOkInTheirOrder) {
     auto d = wild();
     EXPECT_EQ(check(d), tuple(DialogResult::Ok, Field::None, ""));
     d.SetParamFile(dir / "absent.ini");
-    EXPECT_EQ(check(d), tuple(DialogResult::Failed, Field::ParamFile,
-                              "Le fichier de paramétrage indiqué n'existe pas !"));
+    EXPECT_EQ(check(d),
+              tuple(DialogResult::Failed, Field::ParamFile,
+                    "Le fichier de paramétrage indiqué n'existe pas !\n(" + dir / "absent.ini" + ")"));
     auto interpreting = wild();
     interpreting.SetInterpret(true);
     EXPECT_EQ(check(interpreting, {Answer::No}), tuple(DialogResult::Cancel, Field::CodeTable, noTable));
@@ -112,7 +113,8 @@ TEST_F(LectCarnet, TheChecksOfOkInTheirOrder) {
     WriteBytes(dir / "carnet.geo", "");
     interpreting.SetCarnet(dir / "absent.gsi");
     EXPECT_EQ(check(interpreting),
-              tuple(DialogResult::Failed, Field::Carnet, "Le fichier carnet indiqué n'existe pas !"));
+              tuple(DialogResult::Failed, Field::Carnet,
+                    "Le fichier carnet indiqué n'existe pas !\n(" + dir / "absent.gsi" + ")"));
     WriteBytes(dir / "Wild.ini", "[Parametrage]\n");
     auto existing = wild();
     EXPECT_EQ(check(existing, {Answer::No}), tuple(DialogResult::Cancel, Field::GeoBase, replace));

@@ -4,7 +4,9 @@
 // 100 gr) read at 50 gr on the circle. Every expected value is worked out by hand from the text written:
 // 1 ft = 0.3048 m, 1° = 10/9 gr, 1 mil = 1/16 gr, 123.758333° = 137.509259 gr.
 #include "FieldBookTestSupport.h"
+#include "core/TextEncoding.h"
 #include "fieldbook/LectSokkia.h"
+#include "geobase/GeoFile.h"
 
 #include <gtest/gtest.h>
 
@@ -122,6 +124,45 @@ TEST(LectSokkia, UnitsAndAxisOrderFromTheHeaderOrTheSettings) {
     SokkiaRun latin1;
     const CCarnet& read = latin1.Read(Point("\xC9T\xC9", "2000", "1000"));
     ExpectValues(read, read.Find(kKindPoint, "ÉTÉ", 0, 0), {1000.0, 2000.0, U});
+}
+
+// Header records of a book written on Windows: their columns count characters, so an accented letter is
+// never split (the GéoBase stays valid UTF-8) and moves neither the values after it nor the unit codes.
+TEST(LectSokkia, HeaderRecordsOfAWindows1252BookAreCutAtCharacters) {
+    const struct {
+        const char* record;
+        const char* comments;
+    } cases[] = {
+        {"04N\xE9 1.000", "1000 Collimation          = 1.000; "},
+        {"04\xE9\xE9  1.000   2.5", "1000 Collimation          = 1.000 2.5; "},
+        {"05\xE9N 15.0 1013.25 \xB0"
+         "C",
+         "1000 Atmosphère           = 15.0 1013.25 °C; "},
+        {"06NM1.000 \xE9"
+         "chelle",
+         "1000 Facteur d'échelle    = 1.000 échelle; "},
+        {"10NMCHANTIER \xC9T\xC9", "1000 Chantier             = CHANTIER ÉTÉ; "},
+        {"00NMSDR33 V\xE9"
+         "4-04.02     22-Nov-26 10:15 211111",
+         "1000 Version              = SDR33 Vé4-04.02; 1000 Format               = SDR33; "
+         "1000 Date                 = 22-Nov-26 10:15; 1000 Unité des angles     = grades; "
+         "1000 Unité des distances  = mètres; 1000 Ordre des coordonnées = N-E-Z; "},
+    };
+    for (const auto& c : cases) {
+        SokkiaRun run;
+        const CCarnet& read = run.Read(std::string(c.record) + "\r\n");
+        EXPECT_EQ(ElementsSummary(read), c.comments) << c.record;
+        EXPECT_EQ(ReportText(run), "") << c.record;
+        std::string written;
+        for (int i = 0; i < read.GetSize(); ++i)
+            written += ElementLine(*read.GetAt(i), read.GetType(i));
+        EXPECT_TRUE(IsValidUtf8(written)) << written;
+    }
+    // A unit code that is an accented letter is no code: told as one, the settings' unit kept.
+    SokkiaRun accented;
+    accented.Read("00NMSDR33 V04-04.02     22-Nov-26 10:15 \xE9"
+                  "11111\n");
+    EXPECT_EQ(ReportHeads(accented), "Attention : ligne 1\n");
 }
 
 TEST(LectSokkia, VerticalAnglesFromTheHorizonBecomeZenithAngles) {

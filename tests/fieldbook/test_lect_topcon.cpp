@@ -79,7 +79,8 @@ TEST(LectTopcon, UnitsComeFromTheFieldBookElseFromTheParameterFile) {
         SCOPED_TRACE(std::string(c.angles) + " " + c.lengths + " " + c.units);
         TopconRun run;
         run.Set(kKeyUniteAngles, c.angles).Set(kKeyUniteDistances, c.lengths);
-        const CCarnet& read = run.Read(std::string(c.units) + "STN     S1,,\nSS      1,,\nSD      " + c.sd);
+        const CCarnet& read =
+            run.Read(std::string(c.units) + "STN     S1,,\nSS      1,,\nSD      " + c.sd + "\n");
         EXPECT_EQ(ReportText(run), "");
         ASSERT_EQ(read.GetType(read.GetSize() - 1), kKindMesure);
         ExpectValues(read, read.GetSize() - 1, {kNone, c.ah, c.av, c.di});
@@ -197,6 +198,7 @@ TEST(LectTopcon, AFieldBookThatCannotBeOpenedIsNamedInTheMessage) {
     TopconRun run;
     const std::string path = FieldBookData("topcon-absent.gts7");
     EXPECT_FALSE(run.reader.Read(path, run.result));
-    EXPECT_EQ(MessageTexts(run.frontEnd), Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str()));
+    EXPECT_EQ(MessageTexts(run.frontEnd), Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str()) +
+                                              "\n(fichier ou dossier inexistant)");
     EXPECT_EQ(run.result.GetSize(), 0);
 }

@@ -58,7 +58,7 @@ protected:
 
 class TopconLike : public TestReader {
 protected:
-    std::string OpenFailure(const std::string& path) const override {
+    std::string OpenFailure(const std::string& path, int) const override {
         return Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str());
     }
 };
@@ -142,17 +142,67 @@ TEST(ReaderSkeleton, CodesAreInterpretedOrKeptAndCutFromTheName) {
     EXPECT_EQ(read.matAt(1), "125EXR");
 }
 
+// The message names the field book and says why in words, a folder or a missing file alike.
 TEST(ReaderSkeleton, AFileThatCannotBeOpenedIsSaidAndAddsNothing) {
     TempDir dir;
     const std::string missing = dir / "absent.txt";
     ReaderRun<TestReader> plain;
     ReaderRun<TopconLike> topcon;
-    EXPECT_FALSE(plain.reader.Read(missing, plain.result) || topcon.reader.Read(missing, topcon.result));
-    EXPECT_EQ(MessageTexts(plain.frontEnd), "Impossible d'ouvrir le fichier carnet !");
+    ReaderRun<TestReader> folder;
+    EXPECT_FALSE(plain.reader.Read(missing, plain.result) || topcon.reader.Read(missing, topcon.result) ||
+                 folder.reader.Read(dir.Root().string(), folder.result));
+    EXPECT_EQ(MessageTexts(plain.frontEnd),
+              "Impossible d'ouvrir le fichier carnet !\n(" + missing + " : fichier ou dossier inexistant)");
     EXPECT_EQ(MessageTexts(topcon.frontEnd),
               "Impossible d'ouvrir le fichier carnet en lecture !\n(" + missing + ")");
+    EXPECT_TRUE(MessageTexts(folder.frontEnd)
+                    .starts_with("Impossible d'ouvrir le fichier carnet !\n(" + dir.Root().string() + " : "));
     EXPECT_TRUE(plain.frontEnd.lines.empty());
-    EXPECT_EQ(plain.result.GetSize(), 0);
+    EXPECT_EQ(plain.result.GetSize() + folder.result.GetSize(), 0);
+}
+
+// A book that ends in the middle of its last line (a transfer cut short) is told, with that line's
+// number, before what the reader says of the line, and the line is read all the same. The end of a
+// transfer (Ctrl-Z, EOT) or blanks after the last line end are no cut.
+TEST(ReaderSkeleton, ALastLineWithoutItsEndIsReportedAndRead) {
+    const std::string station = Pad("S S1 1.56") + "\r\n";
+    const std::string cut = "sans fin de ligne, le carnet semble coupé ; elle est lue telle quelle !";
+    const struct {
+        const char* what;
+        std::string text;
+        int cutLine; // 0: no cut told
+        int elements;
+    } cases[] = {
+        {"fin de ligne CR LF", station + Pad("M 101 12 100 25 1.3") + "\r\n", 0, 2},
+        {"fin de ligne CR", station + Pad("M 101 12 100 25 1.3") + "\r", 0, 2},
+        {"fin de transfert", station + "\x1a", 0, 1},
+        {"EOT et Ctrl-Z", station + " \x04\x1a", 0, 1},
+        {"blancs", station + "   ", 0, 1},
+        {"ligne entière sans fin", station + Pad("M 101 12 100 25 1.3"), 2, 2},
+        {"ligne coupée", station + "M 101 12 1", 2, 2},
+        {"ligne coupée puis Ctrl-Z", station + "M 101 12 1 \x1a", 2, 2},
+        {"seule ligne", "S S1", 1, 1},
+    };
+    for (const auto& c : cases) {
+        ReaderRun<TestReader> run;
+        const CCarnet& read = run.Read(c.text);
+        const std::vector<std::string> reports = run.Reports();
+        std::vector<std::string> told;
+        std::copy_if(reports.begin(), reports.end(), std::back_inserter(told),
+                     [&](const std::string& line) { return line.find(cut) != std::string::npos; });
+        if (c.cutLine == 0) {
+            EXPECT_TRUE(told.empty()) << c.what;
+        } else {
+            // Told once, first of what is said of that line.
+            const std::string line = "ligne " + std::to_string(c.cutLine);
+            EXPECT_EQ(told, std::vector<std::string>{"Attention : " + line + " " + cut}) << c.what;
+            const auto first = std::find_if(reports.begin(), reports.end(), [&](const std::string& report) {
+                return report.find(line) != std::string::npos;
+            });
+            EXPECT_TRUE(first != reports.end() && *first == told.front()) << c.what;
+        }
+        EXPECT_EQ(read.GetSize(), c.elements) << c.what;
+    }
 }
 
 // A field book from a Windows machine: its accents survive, and the window says how it was read.

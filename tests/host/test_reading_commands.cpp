@@ -4,6 +4,7 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 
 namespace {
@@ -103,4 +104,79 @@ TEST_F(ReadingCommands, TheEditorMakesANewGeoBaseFromAFieldBook) {
     EXPECT_EQ(outcome.status, 0) << outcome.err;
     EXPECT_TRUE(Has(ReadBytes(dir / "neuve.geo"), "1003\t102\t"));
     EXPECT_FALSE(Has(outcome.err, "n'est pas vide"));
+}
+
+// A field book from which nothing is read (empty, junk, another format) fails with a message that names
+// it and the format tried: the GéoBase of that name stays byte for byte, and the last GéoBase stays the
+// one the surveyor worked on.
+TEST_F(ReadingCommands, ABookWithNothingToReadFailsAndReplacesNothing) {
+    ASSERT_EQ(Run("LQuenda carnet.qdl").status, 0);
+    const std::string registry = ReadBytes(dir / "registre/HKEY_CURRENT_USER.ini");
+    ASSERT_TRUE(Has(ReadBytes(dir / "Pyralis.ini"), "Derniere=" + dir / "carnet.geo"));
+    const struct {
+        const char* command;
+        const char* name;
+        std::string bytes;
+        const char* format;
+    } cases[] = {
+        {"LQuenda", "vide.qdl", "", "Quendal-Pc"},
+        {"LecWild", "bruit.gsi", std::string("\x89PNG\r\n\x1a\n\0\0\0\rIHDR\xff\xfe", 18), "Wild"},
+        {"LSokkia", "quendal.sdr", kBook, "Sokkia"},
+        {"LTopcon", "quendal.gts7", kBook, "Topcon GT7"},
+    };
+    for (const auto& c : cases) {
+        const std::string geoBase = std::filesystem::path(c.name).replace_extension(".geo").string();
+        WriteBytes(dir / c.name, c.bytes);
+        WriteBytes(dir / geoBase, kJob);
+        const Outcome outcome = Run(std::string("--oui ") + c.command + " " + c.name);
+        EXPECT_EQ(outcome.status, 1) << c.command << outcome.out << outcome.err;
+        EXPECT_TRUE(Has(outcome.out, " ... terminée : 0 lignes écrites.\n")) << outcome.out;
+        EXPECT_TRUE(Has(outcome.err, std::string("Carnet <") + c.name + "> : aucun élément lu au format « " +
+                                         c.format + " » !"))
+            << outcome.err;
+        EXPECT_FALSE(Has(outcome.out, "GéoBase créée")) << outcome.out;
+        EXPECT_EQ(ReadBytes(dir / geoBase), kJob) << c.command;
+        EXPECT_TRUE(Has(ReadBytes(dir / "Pyralis.ini"), "Derniere=" + dir / "carnet.geo")) << c.command;
+        EXPECT_EQ(ReadBytes(dir / "registre/HKEY_CURRENT_USER.ini"), registry) << c.command;
+    }
+}
+
+// A book whose last line was cut by the transfer: that line is told with its number, and read.
+TEST_F(ReadingCommands, ATruncatedLastLineIsReportedWithItsNumber) {
+    std::string book = kBook;
+    book.resize(book.size() - 8); // "...;111.5994;POTEAU\n" loses "POTEAU\n" and the last ';'
+    WriteBytes(dir / "coupé.qdl", book);
+    const Outcome outcome = Run("LQuenda coupé.qdl");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_EQ(outcome.out,
+              "\nCréation de la GéoBase en cours ...\n"
+              "Attention : ligne 4 sans fin de ligne, le carnet semble coupé ; elle est lue telle "
+              "quelle !\n ... terminée : 3 lignes écrites.\nGéoBase créée = <coupé.geo>.\n");
+}
+
+// The reading dialog names the file it did not find.
+TEST_F(ReadingCommands, TheMissingFileMessagesNameTheFile) {
+    const Outcome book = Run("LQuenda absent.qdl");
+    EXPECT_EQ(book.status, 1);
+    EXPECT_TRUE(Has(book.err, "Le fichier carnet indiqué n'existe pas !\n(absent.qdl)")) << book.err;
+    const Outcome settings = Run("LecWild carnet.qdl --parametrage absent.ini");
+    EXPECT_EQ(settings.status, 1);
+    EXPECT_TRUE(Has(settings.err, "Le fichier de paramétrage indiqué n'existe pas !\n(absent.ini)"))
+        << settings.err;
+}
+
+namespace {
+// Access rights, which root does not meet: run again by CTest as a user.
+class ReadingCommandsAsUser : public ReadingCommands {};
+} // namespace
+
+// A field book its user may not read: the message names it and says why.
+TEST_F(ReadingCommandsAsUser, AnUnreadableBookIsNamedWithTheReason) {
+    SKIP_WHEN_ROOT();
+    chmod((dir / "carnet.qdl").c_str(), 0);
+    const Outcome outcome = Run("LQuenda carnet.qdl");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.err, "Impossible d'ouvrir le fichier carnet !\n(carnet.qdl : accès refusé)"))
+        << outcome.err;
+    EXPECT_FALSE(std::filesystem::exists(dir / "carnet.geo"));
 }
