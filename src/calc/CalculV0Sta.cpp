@@ -356,7 +356,7 @@ bool CCalculV0Sta::Enregistrer() {
         return true;
     }
     const std::string& path = GeoBase();
-    if (!m_carnet.BackUp() || !m_carnet.Save(path, m_frontEnd, false)) return false;
+    if (!m_carnet.BackUp(m_frontEnd) || !m_carnet.Save(path, m_frontEnd, false)) return false;
     m_written = true;
     // Recorded whole, so that the next command finds it from whatever folder it is run.
     std::error_code error;
