@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cctype>
 #include <cerrno>
+#include <csignal>
 #include <cstdlib>
 #include <spawn.h>
 #include <string>
@@ -43,13 +44,19 @@ const char* AnswerWord(Answer answer) {
     }
 }
 
-std::string ReadLine(std::FILE* in) {
-    std::string line;
+constexpr char kEscape = '\x1b';
+
+// A line of the input stream. A line that starts with Escape is a cancelled one, so that a script can
+// press the key as a person does.
+TypedLine ReadStreamLine(std::FILE* in) {
+    TypedLine typed;
     int c;
     while ((c = std::fgetc(in)) != EOF && c != '\n')
-        line += static_cast<char>(c);
-    if (c == EOF && line.empty()) return "\x04"; // end of input: the question takes its default
-    return line;
+        typed.text += static_cast<char>(c);
+    if (c == EOF && typed.text.empty()) return typed;
+    typed.kind =
+        !typed.text.empty() && typed.text[0] == kEscape ? TypedLine::Kind::Cancel : TypedLine::Kind::Line;
+    return typed;
 }
 
 // The words of a command held in an environment variable ("emacs -nw"), split at blanks: no shell
@@ -78,17 +85,31 @@ std::vector<char*> Argv(std::vector<std::string>& words) {
 }
 
 // Runs the editor on the file and waits for the person to close it. False when it cannot be started.
+// While the editor has the terminal, Ctrl-C is its own (an editor takes it for a key): here it would
+// cancel the command and leave the editor running behind the prompt.
 bool RunEditor(const char* command, const std::string& path) {
     std::vector<std::string> words = CommandWords(command);
     if (words.empty()) return false;
     words.push_back(path);
     std::vector<char*> argv = Argv(words);
+    posix_spawnattr_t attributes;
+    posix_spawnattr_init(&attributes);
+    sigset_t interrupt;
+    sigemptyset(&interrupt);
+    sigaddset(&interrupt, SIGINT);
+    posix_spawnattr_setsigdefault(&attributes, &interrupt);
+    posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETSIGDEF);
+    struct sigaction ignore = {}, before = {};
+    ignore.sa_handler = SIG_IGN;
+    sigaction(SIGINT, &ignore, &before);
     pid_t pid;
-    if (posix_spawnp(&pid, argv[0], nullptr, nullptr, argv.data(), environ) != 0) return false;
+    const bool started = posix_spawnp(&pid, argv[0], nullptr, &attributes, argv.data(), environ) == 0;
+    posix_spawnattr_destroy(&attributes);
     int status = 0;
-    while (waitpid(pid, &status, 0) < 0 && errno == EINTR) {
+    while (started && waitpid(pid, &status, 0) < 0 && errno == EINTR) {
     }
-    return true;
+    sigaction(SIGINT, &before, nullptr);
+    return started;
 }
 
 // Hands the file to the desktop's viewer without waiting for it: an intermediate process starts it and
@@ -134,12 +155,22 @@ Answer ConsoleFrontEnd::Ask(std::string_view text, std::string_view caption, But
         std::fflush(m_err);
         return answer;
     }
+    char prompt[64];
+    std::snprintf(prompt, sizeof prompt, "(o)ui / (n)on%s [%s] ? ", cancel ? " / (a)nnuler" : "",
+                  AnswerWord(byDefault));
     while (true) {
-        std::fprintf(Err(), "(o)ui / (n)on%s [%s] ? ", cancel ? " / (a)nnuler" : "", AnswerWord(byDefault));
-        std::fflush(m_err);
-        std::string line = ReadLine(m_in);
-        if (line == "\x04" || line.empty()) return byDefault;
-        char c = static_cast<char>(std::tolower(static_cast<unsigned char>(line[0])));
+        const TypedLine typed = Read(prompt, LinePurpose::Answer);
+        if (typed.kind != TypedLine::Kind::Line) {
+            // A key, not an answer, was typed: say which answer it gave.
+            const Answer answer = typed.kind == TypedLine::Kind::End ? byDefault
+                                  : cancel                           ? Answer::Cancel
+                                                                     : Answer::No;
+            std::fprintf(Err(), "Réponse : %s\n", AnswerWord(answer));
+            std::fflush(m_err);
+            return answer;
+        }
+        if (typed.text.empty()) return byDefault;
+        char c = static_cast<char>(std::tolower(static_cast<unsigned char>(typed.text[0])));
         if (c == 'o' || c == 'y') return Answer::Yes;
         if (c == 'n') return Answer::No;
         if (cancel && c == 'a') return Answer::Cancel;
@@ -152,21 +183,27 @@ std::optional<std::string> ConsoleFrontEnd::ChooseFile(const FileChoice& choice)
         std::fprintf(Err(), "%s %s\n", choice.title.c_str(), choice.startPath.c_str());
         return choice.startPath;
     }
-    std::fprintf(Err(), "%s [%s] ", choice.title.c_str(), choice.startPath.c_str());
-    std::fflush(m_err);
-    std::string line = ReadLine(m_in);
-    if (line == "\x04") return std::nullopt;
-    if (line.empty())
-        return choice.startPath.empty() ? std::nullopt : std::optional<std::string>(choice.startPath);
-    return line;
+    const TypedLine typed = Read(choice.title + " [" + choice.startPath + "] ", LinePurpose::File);
+    if (typed.kind == TypedLine::Kind::Line && !typed.text.empty()) return typed.text;
+    std::optional<std::string> chosen;
+    if (typed.kind != TypedLine::Kind::Cancel && !choice.startPath.empty()) chosen = choice.startPath;
+    if (typed.kind != TypedLine::Kind::Line) {
+        std::fprintf(Err(), "Réponse : %s\n", chosen ? chosen->c_str() : "aucun fichier");
+        std::fflush(m_err);
+    }
+    return chosen;
 }
 
-std::optional<std::string> ConsoleFrontEnd::Prompt(std::string_view prompt) {
-    std::fprintf(Err(), "%.*s", static_cast<int>(prompt.size()), prompt.data());
-    std::fflush(m_err);
-    std::string line = ReadLine(m_in);
-    if (line == "\x04") return std::nullopt;
-    return line;
+TypedLine ConsoleFrontEnd::Prompt(std::string_view prompt) {
+    return Read(prompt, LinePurpose::Command);
+}
+
+TypedLine ConsoleFrontEnd::Read(std::string_view prompt, LinePurpose purpose) {
+    std::FILE* err = Err();
+    if (m_reader) return m_reader->ReadLine(prompt, purpose);
+    std::fprintf(err, "%.*s", static_cast<int>(prompt.size()), prompt.data());
+    std::fflush(err);
+    return ReadStreamLine(m_in);
 }
 
 void ConsoleFrontEnd::TextLine(std::string_view line) {

@@ -41,18 +41,3 @@ TEST(ConsoleFrontEnd, InBatchAQuestionTakesTheAnswerGivenInAdvanceOrItsDefault) 
     std::fclose(out);
     std::fclose(err);
 }
-
-TEST(ConsoleFrontEnd, AtATerminalTheAnswerIsRead) {
-    std::FILE* in = std::tmpfile();
-    std::fputs("n\n\nquoi\na\n", in);
-    std::rewind(in);
-    std::FILE* err = std::tmpfile();
-    ui::ConsoleFrontEnd console(in, stdout, err);
-    console.SetInteractive(true);
-    EXPECT_EQ(console.Ask("?", ui::kCaption, ui::Buttons::YesNo, ui::Answer::Yes), ui::Answer::No);
-    EXPECT_EQ(console.Ask("?", ui::kCaption, ui::Buttons::YesNo, ui::Answer::Yes),
-              ui::Answer::Yes); // empty: default
-    EXPECT_EQ(console.Ask("?", ui::kCaption, ui::Buttons::YesNoCancel, ui::Answer::Yes), ui::Answer::Cancel);
-    std::fclose(in);
-    std::fclose(err);
-}
