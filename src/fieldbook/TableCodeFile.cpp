@@ -64,9 +64,18 @@ struct CodeColumns {
     std::string complement;
 };
 
+// Whether a code, written bare at the head of its line, would make the line read as something else: a
+// comment ("#12"), or the separator line ("Séparateur", whatever its case and accents, alone or before
+// '='). Such a code was written in double quotes and is written back so.
+bool CodeNeedsQuotes(std::string_view code) {
+    if (code.starts_with('#')) return true;
+    return CommandKey(code.substr(0, code.find('='))) == CommandKey(kSeparatorLabel);
+}
+
 CodeColumns ColumnsOf(const CodeTableLine& line) {
     CodeColumns columns;
     AppendWord(columns.code, line.code);
+    if (CodeNeedsQuotes(line.code) && !columns.code.starts_with('"')) columns.code = '"' + columns.code + '"';
     for (const std::string& word : line.complement)
         AppendWord(columns.complement, word);
     return columns;

@@ -2,6 +2,7 @@
 // into a command, and the table read from and written back to its file.
 #include "FieldBookTestSupport.h"
 #include "fieldbook/TableCode.h"
+#include "fieldbook/TableCodeFile.h"
 #include "geobase/Elements.h"
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -166,6 +167,35 @@ TEST_F(TableCode, SeparatorSettingsComeBackAsTheyWereSet) {
         EXPECT_EQ(again.Separator(), separator) << ReadBytes(dir / "separator.cod");
     }
     EXPECT_TRUE(fe.lines.empty()) << fe.AllLines();
+}
+
+// A code in double quotes that, bare at the head of its line, would read as a comment or as the separator
+// line is written back in its quotes, so the table saved says the same.
+TEST(CodeTableText, CodesThatLookLikeACommentOrTheSeparatorLineKeepTheirQuotes) {
+    const struct {
+        const char* line;
+        const char* written;
+    } cases[] = {
+        {"\"#12\" Liaison", "\"#12\"  Liaison\n"},
+        {"\"Séparateur\" Liaison", "\"Séparateur\"  Liaison\n"},
+        {"\"SEPARATEUR=x\" Liaison", "\"SEPARATEUR=x\"  Liaison\n"},
+        {"\"a;b\" Liaison", "\"a;b\"  Liaison\n"},
+        {"12# Liaison", "12#  Liaison\n"},
+        {"Séparateurs Liaison", "Séparateurs  Liaison\n"},
+    };
+    for (const auto& c : cases) {
+        const auto report = [&](int, const std::string& reason) {
+            ADD_FAILURE() << c.line << ": " << reason;
+        };
+        const CodeTableContent table = ParseCodeTable(c.line, report);
+        ASSERT_EQ(table.codes.size(), 1u) << c.line;
+        const std::string written = FormatCodeTable(table);
+        EXPECT_EQ(written.substr(written.find('\n') + 1), c.written) << written;
+        const CodeTableContent back = ParseCodeTable(written, report);
+        ASSERT_EQ(back.codes.size(), 1u) << written;
+        EXPECT_EQ(back.lines[back.codes.begin()->second].code, table.lines[table.codes.begin()->second].code);
+        EXPECT_EQ(back.separator, kSeparatorUpper) << written;
+    }
 }
 
 TEST_F(TableCode, ReadsWindows1252AndKeepsItsLineEnds) {
