@@ -1,5 +1,6 @@
 #include "fieldbook/ConfigQdl.h"
 
+#include "core/Files.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookTexts.h"
@@ -7,6 +8,7 @@
 #include "geobase/Carnet.h"
 #include "ui/FrontEnd.h"
 
+#include <cerrno>
 #include <cstdio>
 
 namespace pyr {
@@ -140,6 +142,7 @@ bool CDlgConfigQdl::Export(const CCarnet& records, const std::string& path, cons
                            QdlExportChoices choices, ui::FrontEnd* parent) {
     std::FILE* file = std::fopen(path.c_str(), mode);
     bool written = file != nullptr;
+    int error = written ? 0 : errno;
     if (file) {
         // The header heads a new file only: a completed one has it already.
         std::fseek(file, 0, SEEK_END);
@@ -151,15 +154,25 @@ bool CDlgConfigQdl::Export(const CCarnet& records, const std::string& path, cons
             if (Chosen(records.GetType(i), choices)) AppendRecord(out, *records.GetAt(i), records.GetType(i));
             if (out.size() >= kChunk) {
                 written = std::fwrite(out.data(), 1, out.size(), file) == out.size();
+                if (!written) error = errno;
                 out.clear();
             }
         }
-        written = written && std::fwrite(out.data(), 1, out.size(), file) == out.size();
-        written = std::fclose(file) == 0 && written;
+        if (written && std::fwrite(out.data(), 1, out.size(), file) != out.size()) {
+            written = false;
+            error = errno;
+        }
+        if (std::fclose(file) != 0 && written) {
+            written = false;
+            error = errno;
+        }
     }
     if (!written) {
         ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
-        frontEnd.MessageBox(Sprintf(fb::kMsgCannotWriteFile, path.c_str()), ui::kCaption, ui::kIconWarning);
+        frontEnd.MessageBox(Sprintf(fb::kInParentheses,
+                                    Sprintf(fb::kMsgCannotWriteFile, path.c_str()).c_str(),
+                                    SystemErrorText(error != 0 ? error : EIO).c_str()),
+                            ui::kCaption, ui::kIconWarning);
     }
     return written;
 }
