@@ -1,12 +1,15 @@
 #pragma once
 
 // What every fuzz target of a field-book reader checks besides "no crash": the GéoBase read is a GéoBase
-// like any other, that writes and reads back with as many elements, each of the same kind and name.
+// like any other, its texts in UTF-8 (a reader that cut a letter in two would garble the file), that writes
+// and reads back with as many elements, each of the same kind and name.
+#include "core/TextEncoding.h"
 #include "fieldbook/FieldBookFormats.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookReaders.h"
 #include "fieldbook/ParamDriver.h"
 #include "geobase/Carnet.h"
+#include "geobase/Elements.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -27,8 +30,19 @@ namespace pyr::fuzz {
     std::abort();
 }
 
+// Every text of every element in UTF-8, as the readers convert the field books' code pages.
+inline void CheckTexts(const char* target, const CCarnet& read) {
+    for (int i = 0; i < read.GetSize(); ++i) {
+        const auto* comment = dynamic_cast<const CComment*>(read.GetAt(i));
+        for (const std::string& text : {read.matAt(i), read.cmdAt(i), read.symAt(i), read.parAt(i),
+                                        comment ? comment->text() : std::string()})
+            if (!IsValidUtf8(text)) Broken(target, "un texte lu n'est pas en UTF-8", text);
+    }
+}
+
 // The store written to a file in memory and read back by its path.
 inline void CheckRoundTrip(const char* target, const CCarnet& read, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
+    CheckTexts(target, read);
     const int fd = memfd_create("geobase", 0);
     if (fd < 0) Broken(target, "impossible de créer le fichier en mémoire", {});
     std::FILE* file = fdopen(dup(fd), "w");

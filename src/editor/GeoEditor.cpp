@@ -157,11 +157,13 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
 
     CPyrTxtWnd txt(frontEnd);
     CCarnet carnet;
-    if (m_reading && !FileExists(path))
-        carnet.SetPathName(path); // a new GéoBase, made by the reading
-    else if (!carnet.Load(&txt, path, {}, 0, &frontEnd))
-        return ui::DialogResult::Failed;
-    WriteLastGeoBase(Inputs().paramPath, WholePath(path));
+    if (m_reading && !FileExists(path)) {
+        carnet.SetPathName(path); // a new GéoBase, made by the reading, recorded once it is saved
+    } else {
+        if (!carnet.Load(&txt, path, {}, 0, &frontEnd)) return ui::DialogResult::Failed;
+        // The next command opens the last GéoBase: never a file that is not one.
+        if (!carnet.LoadedFileIsForeign()) WriteLastGeoBase(Inputs().paramPath, WholePath(path));
+    }
 
     if (m_reduce && !ReduceStations(carnet, txt, frontEnd)) return ui::DialogResult::Failed;
     if (m_reading) return ReadFieldBook(carnet, txt, frontEnd);

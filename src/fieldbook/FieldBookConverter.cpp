@@ -179,6 +179,12 @@ ui::DialogResult RunConversion(FieldBookConverter& c, CCarnet* target) {
     const std::string& path = dialog->GeoBasePath();
     const auto writeGeoBase = [&](const CCarnet& carnet, bool record) {
         const bool existed = FileExists(path);
+        // "Replace it" is an answer about a GéoBase: a field book or any other file of that name (the
+        // book itself named as the GéoBase to create) is never written over.
+        if (const std::string refusal = carnet.SaveRefusal(path); !refusal.empty()) {
+            frontEnd.ReportFailure(std::string(msg::kCannotWrite) + "\n<" + path + ">" + refusal);
+            return false;
+        }
         if (const int error = WriteNewGeoBase(carnet, path); error != 0) {
             std::string text = Sprintf(fb::kGeoBaseAndReason, msg::kCannotWrite, path.c_str(),
                                        SystemErrorText(error).c_str());

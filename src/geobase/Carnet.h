@@ -191,6 +191,9 @@ public:
     int BackUp(ui::FrontEnd* parent = nullptr);
     // Writes the whole store to an open text file, with the format's header line when asked.
     bool Write(std::FILE* file, bool withHeader = true) const;
+    // Why the store may not be written to `path` (read-only, or a file that is not a GéoBase: a field book,
+    // a listing), as the sentences that follow a failure's first line; empty when it may.
+    std::string SaveRefusal(const std::string& path) const;
     // Whether the file last loaded, still the store's path, was found not to be a GéoBase.
     bool LoadedFileIsForeign() const { return m_knownForeign && m_knownPath == m_path; }
 
@@ -227,8 +230,6 @@ private:
     // elements before m_noStationBefore hold none (forgotten at every change but an append).
     mutable int m_stationSeen = -1;
     mutable std::size_t m_noStationBefore = 0;
-    // The refusal (its reason, after kSaveFailed) of a save over `path`, empty when the save may go on.
-    std::string SaveRefusal(const std::string& path) const;
     bool IsForeignFile(const std::string& path) const;
 
     std::string m_path;

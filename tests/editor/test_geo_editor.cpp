@@ -51,6 +51,15 @@ TEST_F(Editor, TheGeoBaseOfferedIsShownAndRecordedAsTheLastOne) {
     EXPECT_EQ(pyr::ReadLastGeoBase(dir / "Pyralis.ini"), dir / "a.geo");
 }
 
+// A field book opened by mistake is shown, line by line, but is no GéoBase for the next command to open.
+TEST_F(Editor, AFileThatIsNoGeoBaseIsShownButNotRecordedAsTheLastOne) {
+    pyr::WriteLastGeoBase(dir / "Pyralis.ini", dir / "a.geo");
+    WriteBytes(dir / "carnet.gsi", "110001+0000000S1 81..00+00000000\n110002+000000A1 21.324+12345678\n");
+    EXPECT_EQ(Open(dir / "carnet.gsi"), DialogResult::Ok);
+    EXPECT_EQ(frontEnd.lines.back(), "000002  Commentaire   110002+000000A1 21.324+12345678");
+    EXPECT_EQ(pyr::ReadLastGeoBase(dir / "Pyralis.ini"), dir / "a.geo");
+}
+
 TEST_F(Editor, ANamedGeoBaseIsOpenedWithoutAskingAndAMissingOneIsRefused) {
     editor.SetGeoBase(dir / "absente.geo");
     EXPECT_EQ(editor.Run(frontEnd), DialogResult::Failed);

@@ -221,14 +221,22 @@ TEST_F(Conversion, AFailedWriteSaysWhyAndLeavesTheLastFileKeysAsTheyWere) {
     const std::string noFolder = dir / "absent/carnet.geo", readOnly = dir / "protégée.geo";
     WriteBytes(readOnly, kJob);
     chmod(readOnly.c_str(), 0444);
+    // The field book itself named as the GéoBase to create: "replace it" cannot mean the book.
+    const std::string book = dir / "carnet.qdl";
     const struct {
         std::string geoBase;
         std::string message;
     } cases[] = {
         {noFolder, "Impossible d'écrire dans la GéoBase indiquée !\n<" + noFolder +
                        ">\n(fichier ou dossier inexistant)."},
-        {readOnly, "Impossible d'écrire dans la GéoBase indiquée !\n<" + readOnly +
-                       ">\n(accès refusé).\nLa GéoBase est restée telle qu'elle était."},
+        {readOnly,
+         "Impossible d'écrire dans la GéoBase indiquée !\n<" + readOnly +
+             ">\nCe fichier est en lecture seule : il est laissé tel qu'il est.\nEnregistrez la GéoBase "
+             "sous un autre nom, ou retirez d'abord la protection du fichier."},
+        {book,
+         "Impossible d'écrire dans la GéoBase indiquée !\n<" + book +
+             ">\nCe fichier n'est pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase "
+             "sous un autre nom."},
     };
     for (const auto& c : cases) {
         frontEnd = {};
@@ -243,6 +251,7 @@ TEST_F(Conversion, AFailedWriteSaysWhyAndLeavesTheLastFileKeysAsTheyWere) {
     }
     EXPECT_FALSE(fs::exists(dir / "absent"));
     EXPECT_EQ(ReadBytes(readOnly), kJob);
+    EXPECT_EQ(ReadBytes(book), kBook);
 
     const std::string shared = dir / "partagée.geo";
     WriteBytes(shared, kJob);
