@@ -248,7 +248,6 @@ IniFile& IniFile::operator=(IniFile&&) noexcept = default;
 constexpr std::size_t kMostStrayControls = 8;
 
 bool IsParamFileText(std::string_view bytes) {
-    if (bytes.starts_with("\xFF\xFE") || bytes.starts_with("\xFE\xFF")) return false;
     std::size_t controls = 0;
     for (const char c : bytes) {
         const auto byte = static_cast<unsigned char>(c);

@@ -28,8 +28,9 @@ inline constexpr int kNotParamText = EILSEQ;
 
 // Whether the bytes can be an initialisation file that a person or a program wrote: text in UTF-8 or a
 // Windows code page, with any line ends. Not text:
-//  - a byte-order mark of UTF-16 or UTF-32 (FF FE, FE FF), or a NUL byte anywhere: binary files, and
-//    UTF-16 or UTF-32 of any Latin letter, hold NULs, which no text editor writes;
+//  - a NUL byte anywhere: binary files, and UTF-16 or UTF-32 of any Latin letter (every key, "=" and line
+//    end of a parameter file), hold NULs, which no text editor writes. A byte-order mark alone proves
+//    nothing: "ÿþ" opens a Windows-1252 text as well, and a file written from a text must stay text;
 //  - more than eight control characters other than tab, line feed, vertical and form feed, carriage
 //    return and the old end-of-file mark (Ctrl-Z): binary data. A vertical tab pasted from a word
 //    processor, or an escape or two slipped into a hand-edited file, stay below it. The program writes no

@@ -154,7 +154,8 @@ TEST(IniFile, TextIsToldFromWhatNoEditorWrites) {
         {test::BytesOf("[A]\nx=1\0\n"), false, "a NUL"},
         {test::BytesOf("\xFF\xFE[\0A\0]\0"), false, "UTF-16LE"},
         {test::BytesOf("[\0A\0]\0\n\0"), false, "UTF-16LE without its mark"},
-        {"\xFE\xFF\x4E\x2D\x65\x87", false, "UTF-16BE of two CJK letters, no NUL"},
+        {test::BytesOf("\xFE\xFF\0[\0A\0]"), false, "UTF-16BE"},
+        {"    \xFF\xFE  1 KN STAT=R\n", true, "Windows-1252 that opens as a UTF-16 mark would"},
         {"\x7F"
          "ELF\x02\x01\x01\x03\x04\x05\x06\x07\x08" +
              std::string(200, 'a'),
