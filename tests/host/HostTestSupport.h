@@ -9,10 +9,62 @@
 #include "ui/DialogModel.h"
 #include "ui/ScriptedFrontEnd.h"
 
+#include <filesystem>
+#include <sstream>
 #include <string>
+#include <sys/resource.h>
+#include <sys/wait.h>
+#include <unistd.h>
+#include <vector>
 
 inline std::string ProgramFile(const char* name) {
     return std::string(PYR_PROGRAM_DIR) + "/" + name;
+}
+
+// What a run of a built program came to: its exit status (-1 when a signal ended it) and what it wrote.
+struct Outcome {
+    int status = -1;
+    std::string out;
+    std::string err;
+    std::vector<std::string> OutLines() const {
+        std::vector<std::string> lines;
+        std::istringstream text(out);
+        for (std::string line; std::getline(text, line);)
+            lines.push_back(line);
+        return lines;
+    }
+};
+
+inline bool Has(const std::string& text, const std::string& part) {
+    return text.find(part) != std::string::npos;
+}
+
+// Runs "pyralis --params Pyralis.ini <arguments>" in `folder` as a script runs it, with the parameter
+// file and the registry of that folder, never the person's own; `input` is its standard input. With a
+// limit, no file may grow past that many bytes, as on a full disk.
+inline Outcome RunPyralis(const std::filesystem::path& folder, const std::string& arguments,
+                          const std::string& input = "", rlim_t fileSizeLimit = RLIM_INFINITY,
+                          const std::string& program = ProgramFile("pyralis")) {
+    const std::filesystem::path inputFile = folder / "entree.txt", out = folder / "sortie.txt",
+                                err = folder / "erreurs.txt";
+    WriteBytes(inputFile.string(), input);
+    const std::string command = "cd '" + folder.string() + "' && PYRALIS_REGISTRE='" +
+                                (folder / "registre").string() + "' '" + program + "' --params Pyralis.ini " +
+                                arguments + " <entree.txt >sortie.txt 2>erreurs.txt";
+    const pid_t child = fork();
+    if (child == 0) {
+        const rlimit size{fileSizeLimit, fileSizeLimit};
+        setrlimit(RLIMIT_FSIZE, &size);
+        execl("/bin/sh", "sh", "-c", command.c_str(), static_cast<char*>(nullptr));
+        _exit(127);
+    }
+    int raw = 0;
+    waitpid(child, &raw, 0);
+    Outcome outcome{WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(out.string()), ReadBytes(err.string())};
+    std::filesystem::remove(inputFile);
+    std::filesystem::remove(out);
+    std::filesystem::remove(err);
+    return outcome;
 }
 
 inline pyr::host::CPyrMainServices* RegisteredServices() {

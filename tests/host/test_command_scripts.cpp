@@ -5,32 +5,14 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
-#include <sys/wait.h>
 #include <tuple>
 
 namespace pyr::test {
 namespace {
 
-struct Outcome {
-    int status;
-    std::string out, err;
-};
-
-bool Has(const std::string& text, const std::string& part) {
-    return text.find(part) != std::string::npos;
-}
-
 class CommandScript : public ::testing::Test {
 protected:
-    // Runs pyralis in the test's folder with its own parameter file.
-    Outcome Run(const std::string& arguments) {
-        const std::string command = "cd '" + dir.Root().string() + "' && '" + ProgramFile("pyralis") +
-                                    "' --params Pyralis.ini " + arguments +
-                                    " </dev/null >sortie.txt 2>erreurs.txt";
-        const int raw = std::system(command.c_str());
-        return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(dir / "sortie.txt"),
-                ReadBytes(dir / "erreurs.txt")};
-    }
+    Outcome Run(const std::string& arguments) { return RunPyralis(dir.Root(), arguments); }
 
     TempDir dir;
 };

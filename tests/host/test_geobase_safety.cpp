@@ -7,11 +7,8 @@
 #include <algorithm>
 #include <filesystem>
 #include <gtest/gtest.h>
-#include <sys/resource.h>
 #include <sys/stat.h>
-#include <sys/wait.h>
 #include <tuple>
-#include <unistd.h>
 
 namespace pyr::test {
 namespace {
@@ -31,15 +28,6 @@ constexpr const char* kQuendalLines = "1001\tS1\t1.562\t-999999\n"
                                       "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
                                       "1003\t102\t1.8\t388.64623\t99.18242\t111.5994\tPOTEAU\n";
 
-struct Outcome {
-    int status = -1;
-    std::string out, err;
-};
-
-bool Has(const std::string& text, const std::string& part) {
-    return text.find(part) != std::string::npos;
-}
-
 std::vector<std::string> Names(const std::filesystem::path& folder) {
     std::vector<std::string> names;
     for (const auto& entry : std::filesystem::directory_iterator(folder))
@@ -50,23 +38,8 @@ std::vector<std::string> Names(const std::filesystem::path& folder) {
 
 class GeoBaseSafety : public ::testing::Test {
 protected:
-    // Runs pyralis in the test's folder with its own parameter file; with a limit, no file may grow past
-    // that many bytes, as a disk that fills up would stop it.
     Outcome Run(const std::string& arguments, rlim_t limit = RLIM_INFINITY) {
-        const std::string command = "cd '" + dir.Root().string() + "' && '" + ProgramFile("pyralis") +
-                                    "' --params Pyralis.ini " + arguments +
-                                    " </dev/null >sortie.txt 2>erreurs.txt";
-        const pid_t child = fork();
-        if (child == 0) {
-            const rlimit bytes{limit, limit};
-            setrlimit(RLIMIT_FSIZE, &bytes);
-            execl("/bin/sh", "sh", "-c", command.c_str(), static_cast<char*>(nullptr));
-            _exit(127);
-        }
-        int raw = 0;
-        waitpid(child, &raw, 0);
-        return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(dir / "sortie.txt"),
-                ReadBytes(dir / "erreurs.txt")};
+        return RunPyralis(dir.Root(), arguments, "", limit);
     }
 
     TempDir dir;

@@ -4,47 +4,19 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
-#include <sstream>
-#include <sys/wait.h>
 
 namespace {
 
-struct Outcome {
-    int status = -1;
-    std::string out;
-    std::string err;
-    std::vector<std::string> OutLines() const {
-        std::vector<std::string> lines;
-        std::istringstream text(out);
-        for (std::string line; std::getline(text, line);)
-            lines.push_back(line);
-        return lines;
-    }
-};
-
 class Pyralis : public ::testing::Test {
 protected:
-    // Runs "pyralis <arguments>" from the test's folder, with its own parameter file.
     Outcome Run(const std::string& arguments, const std::string& input = "",
                 const std::string& program = ProgramFile("pyralis")) {
-        WriteBytes(dir / "entree.txt", input);
-        const std::string command = "cd '" + dir.Root().string() + "' && '" + program + "' --params '" +
-                                    Params() + "' " + arguments + " <entree.txt >sortie.txt 2>erreurs.txt";
-        Outcome outcome;
-        const int raw = std::system(command.c_str());
-        outcome.status = WIFEXITED(raw) ? WEXITSTATUS(raw) : -1;
-        outcome.out = ReadBytes(dir / "sortie.txt");
-        outcome.err = ReadBytes(dir / "erreurs.txt");
-        return outcome;
+        return RunPyralis(dir.Root(), arguments, input, RLIM_INFINITY, program);
     }
     std::string Params() const { return dir / "Pyralis.ini"; }
 
     TempDir dir;
 };
-
-bool Has(const std::string& text, const std::string& part) {
-    return text.find(part) != std::string::npos;
-}
 
 TEST_F(Pyralis, AloneItListsTheCommandsInRegistrationOrder) {
     const Outcome outcome = Run("");

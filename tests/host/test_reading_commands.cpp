@@ -5,7 +5,6 @@
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
-#include <sys/wait.h>
 
 namespace {
 
@@ -16,28 +15,10 @@ constexpr const char* kBook = "QUENDAL-PC;1\n"
 constexpr const char* kJob = "GEOBASE PYRALIS\t1\n"
                              "1006\tA1\t651050.118\t6862512.447\t-999999\tXY\tBORNE\n";
 
-struct Outcome {
-    int status = -1;
-    std::string out;
-    std::string err;
-};
-
 class ReadingCommands : public ::testing::Test {
 protected:
     ReadingCommands() { WriteBytes(dir / "carnet.qdl", kBook); }
-    // Runs "pyralis <arguments>" in the test's folder, with its own parameter file and registry.
-    Outcome Run(const std::string& arguments) {
-        const std::string command = "cd '" + dir.Root().string() + "' && PYRALIS_REGISTRE='" +
-                                    dir / "registre" + "' '" + ProgramFile("pyralis") + "' --params '" +
-                                    dir / "Pyralis.ini" + "' " + arguments +
-                                    " </dev/null >sortie.txt 2>erreurs.txt";
-        const int raw = std::system(command.c_str());
-        return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(dir / "sortie.txt"),
-                ReadBytes(dir / "erreurs.txt")};
-    }
-    static bool Has(const std::string& text, const std::string& part) {
-        return text.find(part) != std::string::npos;
-    }
+    Outcome Run(const std::string& arguments) { return RunPyralis(dir.Root(), arguments); }
 
     TempDir dir;
 };

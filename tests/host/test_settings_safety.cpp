@@ -6,41 +6,13 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
-#include <sys/resource.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 namespace {
 
-struct Outcome {
-    int status = -1;
-    std::string out;
-    std::string err;
-};
-
-bool Has(const std::string& text, const std::string& part) {
-    return text.find(part) != std::string::npos;
-}
-
 class SettingsSafety : public ::testing::Test {
 protected:
-    // Runs "pyralis --params Pyralis.ini <arguments>" in the test's folder, as a script runs it. With a
-    // limit, no file the command writes may grow past that many bytes, as on a full disk.
     Outcome Run(const std::string& arguments, rlim_t limit = RLIM_INFINITY) {
-        const std::string command = "cd '" + dir.Root().string() + "' && '" + ProgramFile("pyralis") +
-                                    "' --params Pyralis.ini " + arguments +
-                                    " </dev/null >sortie.txt 2>erreurs.txt";
-        const pid_t child = fork();
-        if (child == 0) {
-            const rlimit size{limit, limit};
-            setrlimit(RLIMIT_FSIZE, &size);
-            execl("/bin/sh", "sh", "-c", command.c_str(), static_cast<char*>(nullptr));
-            _exit(127);
-        }
-        int raw = 0;
-        waitpid(child, &raw, 0);
-        return {WIFEXITED(raw) ? WEXITSTATUS(raw) : -1, ReadBytes(dir / "sortie.txt"),
-                ReadBytes(dir / "erreurs.txt")};
+        return RunPyralis(dir.Root(), arguments, "", limit);
     }
     // The small job whose stations orient, under that name in the test's folder; its bytes.
     std::string Demo(const std::string& name) {
