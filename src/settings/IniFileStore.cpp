@@ -325,6 +325,9 @@ void IniFile::Parse(std::string_view bytes) {
         pendingRaw += '\n';
     });
     d.trailing = std::move(pendingRaw);
+    // The library takes a mark at the very start of what it is given for the file's own and drops it:
+    // the file's mark is gone already, so these bytes open a key, and a line end before them keeps them.
+    if (head.starts_with(kByteOrderMark)) head.insert(0, "\n");
     d.ini.LoadData(head.data(), head.size());
 }
 
@@ -409,7 +412,9 @@ std::string IniFile::Bytes() const {
         auto inCodePage = Utf8ToWindows1252(text);
         if (inCodePage && (*inCodePage == text || !IsValidUtf8(*inCodePage))) text = std::move(*inCodePage);
     }
-    if (d.byteOrderMark) text.insert(0, kByteOrderMark);
+    // A file whose first key opens with the bytes of the mark (the blanks before them dropped) gets a mark
+    // of its own: the next reading takes the first mark for the file's and keeps the key whole.
+    if (d.byteOrderMark || text.starts_with(kByteOrderMark)) text.insert(0, kByteOrderMark);
     return text;
 }
 

@@ -136,6 +136,15 @@ TEST(IniFile, QuotedValuesAndCommentsThatLookLikeMarksKeepReadingTheSame) {
     IniFile again;
     again.Parse(bytes);
     EXPECT_EQ(again.Entries(), ini.Entries());
+
+    // A key that opens with the bytes of a UTF-8 mark, behind blanks that the writing drops.
+    IniFile marked;
+    marked.Parse("  \xEF\xBB\xBF  Cle=1\n");
+    const std::string markedBytes = marked.Bytes();
+    IniFile markedAgain;
+    markedAgain.Parse(markedBytes);
+    EXPECT_EQ(markedAgain.Entries(), marked.Entries()) << markedBytes;
+    EXPECT_EQ(markedAgain.Bytes(), markedBytes);
 }
 
 TEST(IniFile, TextIsToldFromWhatNoEditorWrites) {
