@@ -5,6 +5,7 @@
 //    same command and complement), and written again gives the same bytes;
 //  - the code of a point's name field starts within the field, on a character;
 //  - a field code interpreted gives a command of the table's kinds, with valid UTF-8 parameters.
+#include "MemoryFile.h"
 #include "core/Lines.h"
 #include "core/TextEncoding.h"
 #include "fieldbook/TableCode.h"
@@ -30,20 +31,6 @@ using namespace pyr;
                  detail.data());
     std::abort();
 }
-
-// The input as a file that the table opens by its path, without touching a disk.
-class MemoryFile {
-public:
-    explicit MemoryFile(std::string_view bytes) : m_fd(memfd_create("table", 0)) {
-        if (m_fd < 0 || write(m_fd, bytes.data(), bytes.size()) != static_cast<ssize_t>(bytes.size()))
-            Broken("impossible d'écrire le fichier en mémoire", {});
-    }
-    ~MemoryFile() { close(m_fd); }
-    std::string Path() const { return "/proc/self/fd/" + std::to_string(m_fd); }
-
-private:
-    int m_fd;
-};
 
 int LineCount(std::string_view text) {
     int count = 0;
@@ -104,7 +91,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (FormatCodeTable(back) != written) Broken("écrite deux fois, la table change", written);
 
     // The same table loaded from its file, as a conversion loads it, interprets the lines as field codes.
-    MemoryFile file(bytes);
+    fuzz::MemoryFile file("table", bytes);
     CTableCode loaded;
     if (!loaded.Init(file.Path())) Broken("le fichier en mémoire ne se lit pas", {});
     std::vector<std::string> words;

@@ -2,6 +2,7 @@
 //  - a line that reads as an element is written back as a line that reads as the same element;
 //  - a file read then saved, read again and saved again gives the same bytes twice, and the second
 //    reading holds as many elements as the first (no line is lost or split on the way).
+#include "MemoryFile.h"
 #include "core/Files.h"
 #include "core/Lines.h"
 #include "geobase/Carnet.h"
@@ -47,20 +48,6 @@ const std::string& Folder() {
     return *folder;
 }
 
-// The input as a file that the loader opens by its path, without touching a disk.
-class MemoryFile {
-public:
-    explicit MemoryFile(std::string_view bytes) : m_fd(memfd_create("geobase", 0)) {
-        if (m_fd < 0 || write(m_fd, bytes.data(), bytes.size()) != static_cast<ssize_t>(bytes.size()))
-            Broken("impossible d'écrire le fichier en mémoire", {});
-    }
-    ~MemoryFile() { close(m_fd); }
-    std::string Path() const { return "/proc/self/fd/" + std::to_string(m_fd); }
-
-private:
-    int m_fd;
-};
-
 void CheckLine(std::string_view line) {
     std::string error;
     for (bool lenient : {false, true}) {
@@ -95,7 +82,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     const std::string first = Folder() + "/premier.geo";
     const std::string second = Folder() + "/second.geo";
 
-    MemoryFile input(bytes);
+    fuzz::MemoryFile input("geobase", bytes);
     CCarnet carnet;
     if (!carnet.Load(&txt, input.Path(), {}, 1, &frontEnd)) Broken("le fichier en mémoire ne se lit pas", {});
     const std::string saved = Saved(carnet, first);

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <algorithm>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
@@ -9,6 +10,7 @@
 #include <string>
 #include <string_view>
 #include <unistd.h>
+#include <vector>
 
 // Tests of access rights live in suites named "...AsUser": root, who may write everywhere, skips them,
 // and CTest runs them again as an unprivileged person (tests/as-user).
@@ -51,6 +53,15 @@ inline std::string Contents(std::FILE* file) {
     for (int c; (c = std::fgetc(file)) != EOF;)
         text += static_cast<char>(c);
     return text;
+}
+
+// Every name in the folder, hidden ones included (a temporary file left behind shows), sorted.
+inline std::vector<std::string> FileNames(const std::filesystem::path& folder) {
+    std::vector<std::string> names;
+    for (const auto& entry : std::filesystem::directory_iterator(folder))
+        names.push_back(entry.path().filename().string());
+    std::sort(names.begin(), names.end());
+    return names;
 }
 
 inline std::string ReadBytes(const std::string& path) {

@@ -8,13 +8,9 @@
 #include "ui/ScriptedFrontEnd.h"
 
 #include <algorithm>
-#include <csignal>
 #include <filesystem>
-#include <functional>
 #include <gtest/gtest.h>
-#include <sys/resource.h>
 #include <sys/stat.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 using namespace pyr;
@@ -31,49 +27,6 @@ std::string RefusedForeign(const std::string& path) {
            " !\nCe fichier n'est pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase sous "
            "un "
            "autre nom.";
-}
-
-// Every name in the folder, hidden ones included, sorted.
-std::vector<std::string> Names(const std::filesystem::path& folder) {
-    std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::directory_iterator(folder))
-        names.push_back(entry.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
-
-// What a child process said and how it ended: `action` runs there, with no file to be written past
-// `limit` bytes, as a disk that fills up would stop it; it returns its status and writes what it says to
-// the given stream.
-struct ChildOutcome {
-    int status = -1;
-    std::string said;
-};
-
-ChildOutcome UnderSizeLimit(rlim_t limit, const std::function<int(std::FILE*)>& action) {
-    int channel[2];
-    if (pipe(channel) != 0) return {};
-    const pid_t child = fork();
-    if (child == 0) {
-        close(channel[0]);
-        std::signal(SIGXFSZ, SIG_IGN); // as pyralis does: a write past the limit fails with EFBIG
-        const rlimit bytes{limit, limit};
-        setrlimit(RLIMIT_FSIZE, &bytes);
-        std::FILE* said = fdopen(channel[1], "w");
-        const int status = action(said);
-        std::fclose(said);
-        _exit(status);
-    }
-    close(channel[1]);
-    ChildOutcome outcome;
-    char buffer[512];
-    for (ssize_t n; (n = read(channel[0], buffer, sizeof buffer)) > 0;)
-        outcome.said.append(buffer, static_cast<size_t>(n));
-    close(channel[0]);
-    int raw = 0;
-    waitpid(child, &raw, 0);
-    outcome.status = WIFEXITED(raw) ? WEXITSTATUS(raw) : -1;
-    return outcome;
 }
 
 // A job of `count` known points, about 40 bytes a line.
@@ -139,7 +92,7 @@ TEST_F(GeoSave, AFileIsForeignWhenWithoutHeaderMoreThanHalfOfItsLinesAreUnreadab
 TEST_F(GeoSave, AFileThatIsNotAGeoBaseIsShownButNeitherItNorItsBackupIsWritten) {
     WriteBytes(path, kRawBook);
     WriteBytes(backup, "copie d'avant\n");
-    const std::vector<std::string> before = Names(dir.Root());
+    const std::vector<std::string> before = FileNames(dir.Root());
 
     CCarnet c;
     ASSERT_EQ(c.Load(&txt, path), 1);
@@ -160,7 +113,7 @@ TEST_F(GeoSave, AFileThatIsNotAGeoBaseIsShownButNeitherItNorItsBackupIsWritten) 
     EXPECT_EQ(fe.Failures(), 2);
     EXPECT_EQ(ReadBytes(path), kRawBook);
     EXPECT_EQ(ReadBytes(backup), "copie d'avant\n");
-    EXPECT_EQ(Names(dir.Root()), before);
+    EXPECT_EQ(FileNames(dir.Root()), before);
 
     // Under another name it is a GéoBase like any other, saved again and again.
     const std::string other = dir / "leve.geo";
@@ -170,32 +123,6 @@ TEST_F(GeoSave, AFileThatIsNotAGeoBaseIsShownButNeitherItNorItsBackupIsWritten) 
     ASSERT_EQ(c.Save(other, &fe), 1);
     EXPECT_EQ(ReadBytes(dir / "leve.bak"), ReadBytes(other));
     EXPECT_EQ(ReadBytes(path), kRawBook);
-}
-
-TEST_F(GeoSave, AReadOnlyGeoBaseIsReadAndComputedButNeitherSavedOverNorBackedUp) {
-    WriteBytes(path, kGeo);
-    // No write bit at all: refused to root as well, who could write it.
-    ASSERT_EQ(chmod(path.c_str(), 0444), 0);
-    CCarnet c;
-    ASSERT_EQ(c.Load(&txt, path), 1);
-    EXPECT_EQ(fe.lines,
-              std::vector<std::string>{"GéoBase <" + path +
-                                       "> en lecture seule : elle peut être lue et calculée, mais ses "
-                                       "résultats ne pourront pas y être enregistrés."});
-    c.As<CPointGen>(0)->setPt(651000.5, 6862000.5, 52.3, false);
-
-    EXPECT_EQ(c.BackUp(&fe), 0);
-    EXPECT_FALSE(std::filesystem::exists(backup));
-    EXPECT_EQ(c.Save(path, &fe), 0);
-    ASSERT_EQ(fe.messages.size(), 2u);
-    EXPECT_EQ(fe.messages[1].text, "Impossible d'enregistrer la GéoBase sous\n" + path +
-                                       " !\nCe fichier est en lecture seule : il est laissé tel qu'il est.\n"
-                                       "Enregistrez la GéoBase sous un autre nom, ou retirez d'abord la "
-                                       "protection du fichier.");
-    EXPECT_EQ(fe.messages[0].text, fe.messages[1].text);
-    EXPECT_EQ(ReadBytes(path), kGeo);
-    EXPECT_EQ(Names(dir.Root()), std::vector<std::string>{"chantier.geo"});
-    EXPECT_EQ(c.Save(dir / "copie.geo", &fe), 1);
 }
 
 TEST_F(GeoSave, TextsThatAreNotUtf8AreSavedAsTheirWindows1252ReadingAndLoadBackEqual) {
@@ -228,46 +155,6 @@ TEST_F(GeoSave, TextsThatAreNotUtf8AreSavedAsTheirWindows1252ReadingAndLoadBackE
     EXPECT_EQ(ReadBytes(path), bytes);
 }
 
-TEST_F(GeoSave, TheBackUpReplacesTheFormerCopyWholeOrNotAtAll) {
-    const std::string former(3000, 'a'); // an older copy, bigger than what may be written below
-    CCarnet job = Points(200);
-    ASSERT_EQ(job.Save(path), 1);
-    const std::string geo = ReadBytes(path);
-    ASSERT_GT(geo.size(), 6000u);
-
-    // A former copy that its owner protected stops the save and is named.
-    WriteBytes(backup, former);
-    ASSERT_EQ(chmod(backup.c_str(), 0444), 0);
-    EXPECT_EQ(job.BackUp(&fe), 0);
-    ASSERT_EQ(fe.messages.size(), 1u);
-    EXPECT_EQ(fe.messages[0].text,
-              "Impossible de faire la copie de sauvegarde de la GéoBase\n" + path + "\ndans\n" + backup +
-                  "\n(accès refusé).\nLa GéoBase n'est pas enregistrée ; l'ancienne copie de "
-                  "sauvegarde, s'il y en a une, est restée telle qu'elle était.");
-    EXPECT_EQ(fe.Failures(), 1);
-    EXPECT_EQ(ReadBytes(backup), former);
-    ASSERT_EQ(chmod(backup.c_str(), 0644), 0);
-
-    // A disk that fills up in the middle of the copy: the former copy is not cut short.
-    const ChildOutcome full = UnderSizeLimit(4096, [&](std::FILE* said) {
-        ui::ScriptedFrontEnd child;
-        const int done = job.BackUp(&child);
-        for (const auto& message : child.messages)
-            std::fputs(message.text.c_str(), said);
-        return done;
-    });
-    EXPECT_EQ(full.status, 0);
-    EXPECT_NE(full.said.find("dans\n" + backup + "\n(fichier trop grand pour la limite de taille permise)."),
-              std::string::npos)
-        << full.said;
-    EXPECT_EQ(ReadBytes(backup), former);
-    EXPECT_EQ(ReadBytes(path), geo);
-    EXPECT_EQ(Names(dir.Root()), (std::vector<std::string>{"chantier.bak", "chantier.geo"}));
-
-    EXPECT_EQ(job.BackUp(&fe), 1);
-    EXPECT_EQ(ReadBytes(backup), geo);
-}
-
 TEST(GeoSaveAsUser, AFolderThatMayNotBeWrittenKeepsTheGeoBaseAndItsBackupAsTheyWere) {
     SKIP_WHEN_ROOT();
     TempDir dir;
@@ -295,6 +182,6 @@ TEST(GeoSaveAsUser, AFolderThatMayNotBeWrittenKeepsTheGeoBaseAndItsBackupAsTheyW
     EXPECT_EQ(fe.Failures(), 2);
     EXPECT_EQ(ReadBytes(path), kGeo);
     EXPECT_EQ(ReadBytes(backup), "copie d'avant\n");
-    EXPECT_EQ(Names(folder), (std::vector<std::string>{"chantier.bak", "chantier.geo"}));
+    EXPECT_EQ(FileNames(folder), (std::vector<std::string>{"chantier.bak", "chantier.geo"}));
     chmod(folder.c_str(), 0755);
 }

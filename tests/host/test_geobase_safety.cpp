@@ -4,7 +4,6 @@
 #include "HostTestSupport.h"
 #include "calc/test_v0_geometry.h"
 
-#include <algorithm>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
@@ -27,14 +26,6 @@ constexpr const char* kQuendalBook = "QUENDAL-PC;1\n"
 constexpr const char* kQuendalLines = "1001\tS1\t1.562\t-999999\n"
                                       "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
                                       "1003\t102\t1.8\t388.64623\t99.18242\t111.5994\tPOTEAU\n";
-
-std::vector<std::string> Names(const std::filesystem::path& folder) {
-    std::vector<std::string> names;
-    for (const auto& entry : std::filesystem::directory_iterator(folder))
-        names.push_back(entry.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
 
 class GeoBaseSafety : public ::testing::Test {
 protected:
@@ -121,7 +112,7 @@ TEST_F(GeoBaseUnderSizeLimit, ASaveThatDoesNotFitLeavesTheGeoBaseItsBackupAndNoT
     const std::string job = Job();
     WriteBytes(Geo(), job);
     WriteBytes(Bak(), job);
-    const auto names = Names(dir.Root() / "travail");
+    const auto names = FileNames(dir.Root() / "travail");
 
     const Outcome outcome = Read(job.size() + std::string(kQuendalLines).size() - 1);
     EXPECT_EQ(outcome.status, 1) << outcome.err;
@@ -131,7 +122,7 @@ TEST_F(GeoBaseUnderSizeLimit, ASaveThatDoesNotFitLeavesTheGeoBaseItsBackupAndNoT
         << outcome.err;
     EXPECT_EQ(ReadBytes(Geo()), job);
     EXPECT_EQ(ReadBytes(Bak()), job);
-    EXPECT_EQ(Names(dir.Root() / "travail"), names);
+    EXPECT_EQ(FileNames(dir.Root() / "travail"), names);
 
     // Without the limit, the very same command saves: the limit was all that stopped it.
     const Outcome saved = Read(RLIM_INFINITY);
@@ -144,7 +135,7 @@ TEST_F(GeoBaseUnderSizeLimit, ABackupThatDoesNotFitLeavesTheFormerBackupWholeAnd
     const std::string former(4000, '#'); // an older backup, bigger than the limit below
     WriteBytes(Geo(), job);
     WriteBytes(Bak(), former);
-    const auto names = Names(dir.Root() / "travail");
+    const auto names = FileNames(dir.Root() / "travail");
 
     const Outcome outcome = Read(2048);
     EXPECT_EQ(outcome.status, 1) << outcome.err;
@@ -154,7 +145,7 @@ TEST_F(GeoBaseUnderSizeLimit, ABackupThatDoesNotFitLeavesTheFormerBackupWholeAnd
         << outcome.err;
     EXPECT_EQ(ReadBytes(Geo()), job);
     EXPECT_EQ(ReadBytes(Bak()), former);
-    EXPECT_EQ(Names(dir.Root() / "travail"), names);
+    EXPECT_EQ(FileNames(dir.Root() / "travail"), names);
 }
 
 TEST_F(GeoBaseSafety, AFileOfTheSurveyorsNamedLikeTheGeoBaseSurvivesASave) {
