@@ -257,42 +257,6 @@ TEST_F(Prompt, EscapeCancelsAQuestionAndCtrlDTakesItsDefault) {
     EXPECT_EQ(terminal.Status(), 0) << terminal.Screen();
 }
 
-TEST_F(Prompt, AtAYesNoQuestionEscapeSaysNonAndCtrlDTakesTheDefaultAsAtAFileChoice) {
-    Terminal terminal(dir, {});
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
-    // The V0 are written, then a listing is offered (Oui by default).
-    terminal.Type(std::string("CalculV0 --geobase demo.geo --type toutes --enregistrer") + kEnter);
-    ASSERT_TRUE(terminal.WaitFor("(o)ui / (n)on [Oui] ? ")) << terminal.Screen();
-    terminal.Type(kEscape);
-    ASSERT_TRUE(terminal.WaitFor("Réponse : Non")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
-    EXPECT_FALSE(fs::exists(dir / "demo.cv0"));
-
-    // Again: Ctrl-D takes Oui, then the listing file offered.
-    terminal.Type(kEnter);
-    ASSERT_TRUE(terminal.WaitFor("(o)ui / (n)on [Oui] ? ")) << terminal.Screen();
-    terminal.Type(kCtrlD);
-    ASSERT_TRUE(terminal.WaitFor("Réponse : Oui")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor("Choix du fichier listing [demo.cv0] ")) << terminal.Screen();
-    terminal.Type(kCtrlD);
-    ASSERT_TRUE(terminal.WaitFor("Réponse : demo.cv0")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
-    EXPECT_TRUE(fs::exists(dir / "demo.cv0"));
-
-    // Without --geobase the last GéoBase is offered; Escape chooses none and the command ends at once.
-    const std::string written = ReadBytes(Geo());
-    terminal.Type(std::string("CalculV0 --type toutes --enregistrer") + kEnter);
-    ASSERT_TRUE(terminal.WaitFor("Sélectionnez la GéoBase à traiter : [")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor("demo.geo] ")) << terminal.Screen();
-    terminal.Type(kEscape);
-    ASSERT_TRUE(terminal.WaitFor("Réponse : aucun fichier")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
-    EXPECT_EQ(terminal.Count("V0 de station(s) écrit(s)"), 2) << terminal.Screen();
-    EXPECT_EQ(ReadBytes(Geo()), written);
-    terminal.Type(std::string("FIN") + kEnter);
-    EXPECT_EQ(terminal.Status(), 0) << terminal.Screen();
-}
-
 // Without the prompt, an interrupted command ends pyralis with the status of its signal, and what it was
 // writing stays as it was.
 TEST_F(Prompt, WithoutThePromptCtrlCAndSigtermEndTheProgram) {
