@@ -271,14 +271,15 @@ void CLectGeodim::ReadRecord(int number, int label, std::string_view value) {
     case kHeightDifference:
         length = &b.heightDifference;
         break;
+    // After label 62, a station block's coordinates are those of its orientation point.
     case kNorth:
-        length = &b.north;
+        length = b.afterOrientation ? &b.orientationNorth : &b.north;
         break;
     case kEast:
-        length = &b.east;
+        length = b.afterOrientation ? &b.orientationEast : &b.east;
         break;
     case kElevation:
-        length = &b.elevation;
+        length = b.afterOrientation ? &b.orientationElevation : &b.elevation;
         break;
     case kInstrumentHeight: {
         double hi = kUndefined;
@@ -303,9 +304,10 @@ void CLectGeodim::ReadRecord(int number, int label, std::string_view value) {
         b.code = value;
         return;
     case kReferenceObject:
-        if (b.label == gdm::kLabelStation)
+        if (b.label == gdm::kLabelStation) {
             b.orientedOn = value;
-        else
+            b.afterOrientation = true;
+        } else
             m_orientedOn.assign(FormMatView(value));
         return;
     case kUnits:
@@ -318,6 +320,9 @@ void CLectGeodim::ReadRecord(int number, int label, std::string_view value) {
         Header(m_scale, fb::kLabelScale, value);
         return;
     case kReferenceAngle:
+        if (b.label != gdm::kLabelStation) return;
+        angle = &b.readingOnOrientation;
+        break;
     case kCompensator:
     case kDeltaNorth:
     case kDeltaEast:
@@ -338,6 +343,9 @@ void CLectGeodim::ReadRecord(int number, int label, std::string_view value) {
     if (b.label < 0) return LineError(gdm::msg::kOutsideBlock, number);
     if (angle) ReadAngle(number, label, value, *angle);
     if (length) ReadLength(number, label, value, *length);
+    // The instruments write a distance of 0 for a sighting on which none was measured (the orientation
+    // point, an angle-only shot): no sighting has a length of zero.
+    if ((label == kSlopeDistance || label == kHorizontalDistance) && *length == 0.0) *length = kUndefined;
 }
 
 // ---- Writing a block -------------------------------------------------------------------------------------
@@ -354,18 +362,39 @@ void CLectGeodim::WriteStation() {
     if (name.empty()) return; // said in the first pass: the record ended early
     AddCode(b.code, name);
     WritePosition(true);
+    WriteOrientationPoint();
     CStation* station = AddStation(std::string(name), b.hi);
     if (!station) return LineError(fb::kRefused, b.number);
     m_station = station;
     m_orientedOn.assign(FormMatView(b.orientedOn));
     m_firstSighting = true;
-    // A backsight measured within the station's own block is a sighting of the point it is oriented on.
-    if (!b.HasObservation()) return;
+    // A backsight within the station's own block is a sighting of the point it is oriented on; without
+    // a horizontal angle measured on it, the circle reading set on it (21) is its angle.
+    Block& backsight = m_block;
+    if (IsUndefined(backsight.ahGeneric) && IsUndefined(backsight.ahFaceI) && IsUndefined(backsight.ahFaceII))
+        backsight.ahGeneric = backsight.readingOnOrientation;
+    if (!backsight.HasObservation()) return;
     if (m_orientedOn.empty()) return LineMissing(b.number, fb::kDatumPoint);
-    m_block.name = m_orientedOn;
-    m_block.code = {};
-    m_block.east = m_block.north = m_block.elevation = kUndefined;
+    backsight.name = m_orientedOn;
+    backsight.code = {};
+    backsight.east = backsight.north = backsight.elevation = kUndefined;
     WritePoint();
+}
+
+// The coordinates a station block gives after label 62: its orientation point, known.
+void CLectGeodim::WriteOrientationPoint() {
+    Block& b = m_block;
+    if (IsUndefined(b.orientationEast) && IsUndefined(b.orientationNorth) && IsUndefined(b.orientationElevation))
+        return;
+    const std::string_view name = FormMatView(b.orientedOn);
+    if (name.empty()) return LineMissing(b.number, fb::kDatumPoint);
+    const Block station = b;
+    b.name = b.orientedOn;
+    b.east = b.orientationEast;
+    b.north = b.orientationNorth;
+    b.elevation = b.orientationElevation;
+    WritePosition(true);
+    b = station;
 }
 
 void CLectGeodim::WritePoint() {

@@ -17,7 +17,8 @@ namespace pyr {
 // The reader of Trimble GDM (Geodimeter) label files (docs/format-gdm.md): job files of observations and
 // area files of coordinates, one "label=value" a line, told apart block by block by what they hold.
 //  - a station block opens at label 2 (3 its instrument height, 37/38/39 its coordinates, 62 the point it
-//    is oriented on); a point block at label 5 (4 its code, 6 the signal height, then its observations
+//    is oriented on, 37/38/39 after it being that point's coordinates and 21 the circle reading on it);
+//    a point block at label 5 (4 its code, 6 the signal height, then its observations
 //    or its coordinates); a block ends where the next one opens, and a label repeated in a block keeps
 //    its last value;
 //  - observations: 7/8 the horizontal and vertical angles, 24/25 the same in face I, 17/18 in face II
@@ -47,6 +48,11 @@ private:
         double ahFaceII = kUndefined, avFaceII = kUndefined;   // 17, 18
         double slope = kUndefined, horizontal = kUndefined, heightDifference = kUndefined;
         double north = kUndefined, east = kUndefined, elevation = kUndefined;
+        // A station block names its orientation point (62) and may give that point's coordinates after
+        // it, then the circle reading on it (21).
+        bool afterOrientation = false;
+        double orientationNorth = kUndefined, orientationEast = kUndefined, orientationElevation = kUndefined;
+        double readingOnOrientation = kUndefined;
         bool HasObservation() const;
     };
 
@@ -63,6 +69,7 @@ private:
     void WritePoint();
     void WriteSighting(double ah, double av, bool withDistances);
     bool WritePosition(bool known);
+    void WriteOrientationPoint();
     bool IsReference(std::string_view point) const;
 
     // ---- Settings of the format ("Geodim.ini"), then what the field book declares

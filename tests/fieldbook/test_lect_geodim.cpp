@@ -3,6 +3,7 @@
 // (123°45'30" = 123.758333° = 137.50926 gr; 89°18'05" = 99.22377 gr; a face II circle reading is half a
 // turn from face I and its zenith angle the complement to 400 gr).
 #include "FieldBookTestSupport.h"
+#include "RadiationCheck.h"
 #include "fieldbook/LectGeodim.h"
 
 #include <filesystem>
@@ -18,7 +19,7 @@ using GeodimRun = DriverRun<CLectGeodim, FieldBookFormat::Geotronics>;
 } // namespace
 
 // The job file: header labels, the units of label 23 (DMS, metres), a station with its coordinates
-// oriented on A1 (62), both faces of A1, a value repeated in a block (the last counts), a signal height
+// oriented on A1 (62) with its circle reading on A1 (21), both faces of A1 measured again, a value repeated in a block (the last counts), a signal height
 // (its block's, holding until the next one), and a face II sighting alone.
 TEST(LectGeodim, AJobFileGivesItsStationFacesAndSightingsInGradsAndMetres) {
     GeodimRun run;
@@ -27,14 +28,46 @@ TEST(LectGeodim, AJobFileGivesItsStationFacesAndSightingsInGradsAndMetres) {
     ASSERT_EQ(ElementsSummary(read),
               "1000 Chantier             = CHANTIER TEST; 1000 Date                 = 12.06.2024; "
               "1000 Appareil             = GDM 640; 1000 Unités               = 3111; 1006 S1; 1001 S1; "
-              "1009 REF; 1002 A1; 1002 A1; 1003 104; 1003 105; 1003 106; ");
+              "1002 A1; 1009 REF; 1002 A1; 1002 A1; 1003 104; 1003 105; 1003 106; ");
     ExpectValues(read, 4, {1000.0, 2000.0, 100.0}); // 38 is X (east), 37 is Y (north)
     EXPECT_NEAR(read.hiAt(5), 1.55, 1e-4);
-    ExpectValues(read, 7, {1.3, 100.0, 100.0, 100.0});      // face I from 24/25, not the mean 7
-    ExpectValues(read, 8, {1.3, 100.0, 100.0, kUndefined}); // face II turned; the distance went with face I
-    ExpectValues(read, 9, {1.3, 0.0, 99.2237654, 10.0007434});       // DI = DH / sin V
-    ExpectValues(read, 10, {0.0, 137.5092593, 102.7777778, 25.125}); // its own 6, after its angles
-    ExpectValues(read, 11, {0.0, 0.0, 100.0, 12.5}); // face II alone, horizontal distance alone
+    ExpectValues(read, 6, {kUndefined, 100.0, kUndefined, kUndefined}); // 21: 90°
+    ExpectValues(read, 8, {1.3, 100.0, 100.0, 100.0});      // face I from 24/25, not the mean 7
+    ExpectValues(read, 9, {1.3, 100.0, 100.0, kUndefined}); // face II turned; the distance went with face I
+    ExpectValues(read, 10, {1.3, 0.0, 99.2237654, 10.0007434});       // DI = DH / sin V
+    ExpectValues(read, 11, {0.0, 137.5092593, 102.7777778, 25.125}); // its own 6, after its angles
+    ExpectValues(read, 12, {0.0, 0.0, 100.0, 12.5}); // face II alone, horizontal distance alone
+}
+
+// A station block as the instruments write it: the station's coordinates, its orientation point (62)
+// followed by that point's coordinates, the circle reading set on it (21) and a distance of 0 (none
+// measured). Each point block carries the instrument's own coordinates of the point (37/38/39). The
+// geometry is constructed: S1 (1000, 2000, 100), HI 1.550, oriented on B1 (1180, 2075, 103.5) with V0 =
+// 37.1234 gr; from S1 the points 101, 102 and S2 (1060, 1950, 98.4); S2, HI 1.420, oriented back on S1
+// with V0 = 312.0457 gr, then 201 and 202. The recorded coordinates were computed from the angles and
+// distances as written (4 decimals in grads, mm), so that each sighting radiated from the GéoBase finds
+// its point within the rounding of the book.
+TEST(LectGeodim, StationBlocksOrientedAsTheInstrumentDidGiveItsOwnCoordinates) {
+    GeodimRun run;
+    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("gdm-station-orientee.job");
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read), "1000 Chantier             = CONTROLE RAYONNEMENT; "
+                                     "1000 Unités               = 1111; 1006 S1; 1006 B1; 1001 S1; 1002 B1; "
+                                     "1003 101; 1006 101; 1003 102; 1006 102; 1003 S2; 1006 S2; 1006 S2; "
+                                     "1001 S2; 1002 S1; 1003 201; 1006 201; 1003 202; 1006 202; ");
+    ExpectValues(read, 2, {1000.0, 2000.0, 100.0}); // the station's, not its orientation point's
+    ExpectValues(read, 3, {1180.0, 2075.0, 103.5});
+    ExpectValues(read, 5, {kUndefined, 37.7434, kUndefined, kUndefined}); // 21, and no distance of 0
+    const RadiationCheck check = CheckAgainstRecorded(read);
+    EXPECT_EQ(check.faults, std::vector<std::string>{});
+    EXPECT_EQ(check.compared, 5); // 101, 102, S2 from S1; 201, 202 from S2
+    EXPECT_LT(check.worstPlan, 0.001);
+    EXPECT_LT(check.worstHeight, 0.001);
+
+    // A distance of 0 alone is no sighting: without 21, the orientation point is not sighted.
+    GeodimRun bare;
+    EXPECT_EQ(ElementsSummary(bare.Read("2=S\n62=R\n11=0.000\n5=P\n7=1\n9=0\n")), "1001 S; 1003 P; ");
+    ExpectValues(bare.result, 1, {kUndefined, 1.0, kUndefined, kUndefined});
 }
 
 // Angle units from label 23 (first digit) or, without it, from "UniteAngles"; distances from its second
