@@ -119,7 +119,8 @@ bool IsLengthUnit(char unit) {
 }
 
 // The grads of the digits of an angle word in the unit of that digit; false for a DDD.MMSSs whose
-// minutes or seconds reach 60.
+// minutes reach 60 or seconds pass 60. The instruments round 59.96" up to 60.0" without carrying it into
+// the minutes: that reading is the next minute, as the instrument means it.
 bool DigitsToGrads(long long n, char unit, double& grads) {
     switch (unit) {
     case '3': // 1e-5 degree = 1 / 90 000 grad
@@ -128,7 +129,7 @@ bool DigitsToGrads(long long n, char unit, double& grads) {
     case '4': { // DDD.MMSSs: tenths of a second, 32 400 to the grad
         const long long tenths = n % 1000;
         const long long minutes = n / 1000 % 100;
-        if (minutes >= 60 || tenths >= 600) return false;
+        if (minutes >= 60 || tenths > 600) return false;
         grads = static_cast<double>(((n / 100000) * 60 + minutes) * 600 + tenths) / 32400.0;
         return true;
     }

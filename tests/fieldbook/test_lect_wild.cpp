@@ -4,6 +4,7 @@
 // V0 = 0), point 104 10 m to the north, level, sighted with a reflector at 1.300 (so at 100.250). Every
 // value below is worked out by hand from the words as written.
 #include "FieldBookTestSupport.h"
+#include "RadiationCheck.h"
 #include "core/Angles.h"
 #include "core/Strings.h"
 #include "fieldbook/LectWild.h"
@@ -84,6 +85,26 @@ TEST(LectWild, TheInstrumentsCoordinatesOfAMeasuredPointAreKeptWhenAsked) {
     EXPECT_TRUE(
         ElementsSummary(read).ends_with("1003 103; 1003 104; 1006 104; ")); // the sighting, then its point
     ExpectValues(read, 17, {1000.0, 2010.0, 100.0 + 1.55 - 1.3});
+}
+
+// A GSI-16 book in degrees-minutes-seconds, as the instruments write it with their own coordinates of each
+// point (81/82/83) beside the observations. Constructed: ST1 (1000, 2000, 100), HI 1.550, its Hz oriented
+// (bearings), the backsight on K1 (1150, 2080, 102), then 101 (1020, 2030, 99.2) and 102 (985, 2044,
+// 101.7); 103 is read at 281°04'59.97", which the instrument rounds and writes 281°04'60.0". The
+// recorded coordinates were computed from the words as written (0.1", mm): radiated from the GéoBase,
+// every sighting finds its point within the rounding of the book.
+TEST(LectWild, RadiatedObservationsFindTheInstrumentsOwnCoordinates) {
+    WildRun run;
+    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("wild-gsi16-calcule.gsi");
+    EXPECT_EQ(ReportText(run), "");
+    ASSERT_EQ(ElementsSummary(read), "1000 Format               = GSI-16; 1006 K1; 1006 ST1; 1001 ST1; 1002 K1; "
+                                     "1003 101; 1006 101; 1003 102; 1006 102; 1003 103; 1006 103; ");
+    EXPECT_NEAR(read.ahAt(9), (281.0 + 5.0 / 60.0) / 0.9, 1e-7); // 60.0" is the next minute
+    const RadiationCheck check = CheckAgainstRecorded(read);
+    EXPECT_EQ(check.faults, std::vector<std::string>{});
+    EXPECT_EQ(check.compared, 4); // K1, 101, 102, 103
+    EXPECT_LT(check.worstPlan, 0.001);
+    EXPECT_LT(check.worstHeight, 0.001);
 }
 
 // Its first line ends in CR only. Word 43 is typed "1.55"; STA2 gives no height in its code block, the 88

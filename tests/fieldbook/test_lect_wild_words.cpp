@@ -94,6 +94,8 @@ TEST(GsiValues, EveryUnitDigitGivesGradsAndMetres) {
         {"21.102+11545200", true, 115.452}, {"21.103+04512345", true, 45.12345 * dms},
         {"22.104+09117510", true, (91.0 + 17.0 / 60.0 + 51.0 / 3600.0) * dms},
         {"22.104+03545105", true, (35.0 + 45.0 / 60.0 + 10.5 / 3600.0) * dms},
+        // 60.0" is what the instruments write for a reading rounded up to the next minute
+        {"21.104+28104600", true, (281.0 + 5.0 / 60.0) * dms}, {"21.104+35959600", true, 400.0},
         {"21.105+01000000", true, 100.0 * 400.0 / 6400.0}, {"*21.102+0000000039999999", true, 399.99999},
         {"31..00+00012345", false, 12.345}, {"31..01+00010000", false, 3.048}, {"31..06+00012345", false, 1.2345},
         {"31..07+00010000", false, 0.3048}, {"31..08+00012345", false, 0.12345},
@@ -112,15 +114,15 @@ TEST(GsiValues, EveryUnitDigitGivesGradsAndMetres) {
     }
 }
 
-// Dashes and blanks are missing values, zero is a value, other characters and 60 minutes or seconds are no
-// number; word 51 holds the ppm and the prism constant.
+// Dashes and blanks are missing values, zero is a value, other characters, 60 minutes and seconds past 60.0
+// are no number; word 51 holds the ppm and the prism constant.
 TEST(GsiValues, MissingValuesAreToldFromZeroAndFromBadNumbers) {
     // clang-format off
     const std::pair<const char*, Value> cases[] = {
         {"*31..00+00000000000-----", Value::Missing}, {"31..00+0000----", Value::Missing},
         {"31..00+--------", Value::Missing}, {"31..00+        ", Value::Missing}, {"31..00+0000000", Value::Read},
         {"31..00+00000000", Value::Read}, {"31..00+0001234X", Value::Bad}, {"31..00+00.12.34", Value::Bad},
-        {"22.104+09160000", Value::Bad}, {"22.104+09100600", Value::Bad}};
+        {"22.104+09160000", Value::Bad}, {"22.104+09100610", Value::Bad}, {"22.104+09100601", Value::Bad}};
     // clang-format on
     for (const auto& [text, expected] : cases) {
         double value = -1.0;
