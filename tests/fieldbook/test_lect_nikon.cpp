@@ -5,6 +5,7 @@
 // out by hand from the record as written: 123°45'30" = 123.758333° = 137.509259 gr, 91°23'45" = 101.550926
 // gr, 89°52'43" = 99.865123 gr, 10 ft = 3.048 m.
 #include "FieldBookTestSupport.h"
+#include "RadiationCheck.h"
 #include "fieldbook/LectNikon.h"
 
 #include <gtest/gtest.h>
@@ -51,6 +52,23 @@ TEST(LectNikon, ARawFieldBookGivesItsPointsStationBacksightsAndShots) {
     const CCarnet& withComputed = computed.Set(kKeyPointsCalcules, "1").ReadFile("nikon-raw-gons.raw");
     ASSERT_EQ(read.GetSize() + 1, withComputed.GetSize());
     ExpectValues(withComputed, Last(withComputed), {1000.0, 2010.0, 100.25});
+}
+
+// A raw V2.00 book in ddd.mmss, northing first, with the coordinates that the instrument computed (CC)
+// after each side shot. Constructed: K1 (1250, 2180, 102.4) and S1 (1000, 2000, 100) uploaded; S1, HI
+// 1.562, its circle 37.4150 gr off the bearings, backsight on K1, then 101, 102, S2 and 103 (face II,
+// target 1.800); S2 (1080, 1940, 97.5), HI 1.485, circle 312.6600 gr off, backsight on S1 in both faces,
+// then 201 and 202 (face II, target 2.000). The observations were rounded as written (1", mm) and the
+// recorded coordinates computed from them, the instrument oriented on its backsight's coordinates.
+TEST(LectNikon, RadiatedShotsFindTheInstrumentsOwnCoordinates) {
+    NikonRun run;
+    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("nikon-raw-calcule.raw");
+    EXPECT_EQ(ReportText(run), "");
+    const RadiationCheck check = CheckAgainstRecorded(read);
+    EXPECT_EQ(check.faults, std::vector<std::string>{});
+    EXPECT_EQ(check.compared, 9); // K1, 101, 102, S2, 103; S1 in both faces, 201, 202
+    EXPECT_LT(check.worstPlan, 0.001);
+    EXPECT_LT(check.worstHeight, 0.001);
 }
 
 TEST(LectNikon, ADtmFieldBookGivesStationsFromTheirHeightAndUnitsPerRecord) {
