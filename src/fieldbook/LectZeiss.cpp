@@ -5,6 +5,7 @@
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "fieldbook/FieldBookTexts.h"
+#include "fieldbook/LectZeissPlaces.h"
 #include "fieldbook/LectZeissTexts.h"
 #include "geobase/Carnet.h"
 #include "geobase/Matricule.h"
@@ -14,6 +15,7 @@
 #include <cctype>
 #include <cmath>
 #include <filesystem>
+#include <utility>
 
 namespace pyr {
 
@@ -32,6 +34,10 @@ constexpr char kSTX = '\x02';
 
 // The marker that the code field of a point line holds for the instrument's station.
 constexpr std::string_view kStationMarker = "S";
+
+// The point lines of an M5 book without the places of its fields in a header that are looked at before
+// those places are chosen: enough for a few codes and pieces of information to show where they lie.
+constexpr int kPointLinesForPlaces = 50;
 
 enum class Unit { None, Metres, Feet, Grads, Degrees, Dms, Mils, Percent, Unknown };
 
@@ -173,19 +179,6 @@ std::string WithUnit(std::string_view number, std::string_view unit) {
 
 } // namespace
 
-// The values of one line in grads and metres, kUndefined where the line gives none.
-struct CLectZeiss::Values {
-    double hz = kUndefined, zenith = kUndefined;
-    double slope = kUndefined, horizontal = kUndefined, heightDifference = kUndefined;
-    double east = kUndefined, north = kUndefined, elevation = kUndefined;
-    double reflector = kUndefined, instrument = kUndefined;
-
-    bool HasObservation() const {
-        return IsKnown(hz) || IsKnown(zenith) || IsKnown(slope) || IsKnown(horizontal);
-    }
-    bool HasPosition() const { return IsKnown(east) || IsKnown(north) || IsKnown(elevation); }
-};
-
 // ---- Settings and state ----------------------------------------------------------------------------------
 
 void CLectZeiss::ReadSettings() {
@@ -198,9 +191,16 @@ void CLectZeiss::BeginReading() {
     ReadSettings();
     m_layout = Layout::Unknown;
     m_places = {};
+    m_placesKnown = false;
+    m_heldLines.clear();
+    m_heldPoints = 0;
     m_station = nullptr;
-    m_sighted = m_settingUp = m_setUp = m_knownStation = false;
+    m_sighted = m_measured = m_settingUp = m_setUp = m_programStation = m_knownStation = false;
     m_hi = m_reflector = kUndefined;
+    m_heightPending = false;
+    m_held.clear();
+    m_lineSighted.clear();
+    m_sightedBefore.clear();
     m_typesSaid.clear();
     m_unitsSaid.clear();
     for (std::string* last : {&m_instrument, &m_serial, &m_version, &m_axes, &m_scale, &m_orientation,
@@ -214,8 +214,55 @@ void CLectZeiss::BeginReading() {
 void CLectZeiss::ReadLine(std::string_view line, int number) {
     if (!line.empty() && line.front() == kSTX) line.remove_prefix(1);
     line = line.substr(0, line.find_first_of(kEndControls));
+    if (HoldForPlaces(line, number)) return;
+    ReadRecordLine(line, number);
+}
+
+void CLectZeiss::EndReading() {
+    if (!m_heldLines.empty()) FindPlaces();
+    WriteHeldSightings();
+    SettleInstrumentHeight();
+}
+
+// An M5 book that does not say in its header where the point id and the code lie: its lines are held from
+// its first point line until enough point lines are seen, or the book ends.
+bool CLectZeiss::HoldForPlaces(std::string_view line, int number) {
+    if (m_placesKnown) return false;
+    const bool pointLine = zeiss::M5InfoOccupancy(line).has_value();
+    if (m_heldLines.empty() && !pointLine) return false;
+    m_heldLines.push_back({std::string(line), number});
+    if (pointLine && ++m_heldPoints >= kPointLinesForPlaces) FindPlaces();
+    return true;
+}
+
+// The layout that explains the most held point lines is kept, the surveyor told when it is not the
+// default; then the held lines are read in their order.
+void CLectZeiss::FindPlaces() {
+    std::vector<std::string> occupancies;
+    int firstPoint = 0;
+    for (const HeldLine& held : m_heldLines)
+        if (auto occupancy = zeiss::M5InfoOccupancy(held.text)) {
+            if (firstPoint == 0) firstPoint = held.number;
+            occupancies.push_back(std::move(*occupancy));
+        }
+    const zeiss::FoundPlaces found = zeiss::FindPlaces(occupancies);
+    m_places = found.places;
+    m_placesKnown = true;
+    const zeiss::InfoPlaces usual;
+    const bool moved = m_places.point != usual.point || m_places.code != usual.code;
+    if (TextWindow() && (found.explained == 0 || moved))
+        TextWindow()->Print(found.explained == 0 ? text::kPlacesUnexplained : text::kPlacesFound, firstPoint,
+                            m_places.point, m_places.point + zeiss::kPointWidth - 1, m_places.code,
+                            m_places.code + zeiss::kCodeWidth - 1);
+    const std::vector<HeldLine> lines = std::exchange(m_heldLines, {});
+    for (const HeldLine& held : lines)
+        ReadRecordLine(held.text, held.number);
+}
+
+void CLectZeiss::ReadRecordLine(std::string_view line, int number) {
     const std::string_view words = Trimmed(line);
     if (words.empty() || words == "END") return;
+    m_sightedBefore = std::exchange(m_lineSighted, {});
     if (!Split(line, number)) {
         LineUnrecognised(number);
         if (TextWindow()) TextWindow()->Print(fb::kStringRead, std::string(words).c_str());
@@ -413,21 +460,24 @@ void CLectZeiss::ReadHeaderWord(std::string_view type, std::string_view value) {
     if (type == "03") return Header(m_version, text::kLabelVersion, value);
     const int number = LenientAtoi(value);
     if (type == "05") {
-        // The axes of the coordinates: 1 X east and Y north, 2 X north and Y east, 3 N and E.
-        if (number == 1) m_xNorth = false;
-        if (number == 2) m_xNorth = true;
+        // The coordinate system. Whatever the order of writing (word 06), the instrument writes the easting
+        // first: in system 1 (XY) that is Y, so its X is the northing; in system 2 (YX) that is X, the
+        // easting; system 3 names them N and E.
+        if (number == 1) m_xNorth = true;
+        if (number == 2) m_xNorth = false;
         if (number >= 1 && number <= 3)
             Header(m_axes, text::kLabelAxes,
-                   number == 1   ? text::kAxesXEast
-                   : number == 2 ? text::kAxesXNorth
+                   number == 1   ? text::kAxesXNorth
+                   : number == 2 ? text::kAxesXEast
                                  : text::kAxesNorthEast);
         return;
     }
     // The places of the information, the code and the point id in the information block.
-    if (number < 1 || number > 27) return;
+    if (number < 1 || number > zeiss::kInfoWidth) return;
     if (type == "20") m_places.information = number;
     if (type == "21") m_places.code = number;
     if (type == "22") m_places.point = number;
+    if (type == "20" || type == "21" || type == "22") m_placesKnown = true;
 }
 
 // ---- Texts -----------------------------------------------------------------------------------------------
@@ -435,8 +485,11 @@ void CLectZeiss::ReadHeaderWord(std::string_view type, std::string_view value) {
 void CLectZeiss::ReadTextRecord(const Values& values) {
     const std::string_view words = m_record.words;
     if (!IsWithinProgram(words)) {
+        // Sightings of the set-up that no station line claimed stay before the next program.
+        WriteHeldSightings();
         m_settingUp = false;
         m_setUp = IsSetUpProgram(words);
+        m_programStation = false;
         m_knownStation = words.starts_with("KN STAT");
         AddComment(std::string(words));
     }
@@ -455,6 +508,7 @@ void CLectZeiss::ReadPoint(const Values& values, int number) {
     }
     if (m_record.code == kStationMarker) return ReadStation(values, number);
     if (values.HasObservation()) return ReadSighting(values, number);
+    if (values.HasPosition() && m_record.point == m_sightedBefore) return ReadComputed(values, number);
     if (values.HasPosition()) {
         AddPosition(m_record.point, values, true, number);
         return;
@@ -467,11 +521,21 @@ void CLectZeiss::ReadStation(const Values& values, int number) {
     const std::string_view name = FormMatView(m_record.point);
     // The lines of one set-up (its coordinates, then its height) name the same station.
     const bool same = m_station && m_settingUp && m_station->mat() == name;
-    if (!same && !OpenStation(name, number)) return;
-    if (IsKnown(values.instrument)) SetInstrumentHeight(values.instrument);
+    if (same)
+        SettleInstrumentHeight();
+    else if (!OpenStation(name, number))
+        return;
+    m_programStation = true;
+    if (IsKnown(values.instrument)) {
+        m_station->setHI(values.instrument);
+        m_heightPending = false;
+    }
     if (values.HasPosition()) AddPosition(name, values, false, number);
+    WriteHeldSightings();
 }
 
+// A new station takes the last instrument height given, even one given before the previous station
+// measured anything: that height was set for this one.
 bool CLectZeiss::OpenStation(std::string_view name, int number) {
     CStation* station = AddStation(std::string(name), m_hi, m_knownStation ? 0.0 : kUndefined);
     if (!station) {
@@ -479,40 +543,86 @@ bool CLectZeiss::OpenStation(std::string_view name, int number) {
         return false;
     }
     m_station = station;
-    m_sighted = false;
+    m_sighted = m_measured = false;
+    m_heightPending = false;
     m_settingUp = true;
     return true;
 }
 
-// An instrument height given within a set-up is that of its station; given once the station measures
-// or another program has begun, it waits for the next station.
+// An instrument height given after the station measured waits for the next station. Given before, it is
+// the station's if a sighting comes next, the next station's if a station line comes first: the
+// instrument asks for it at the start of the measurements as well as at the set-up of the next station.
 void CLectZeiss::SetInstrumentHeight(double hi) {
     m_hi = hi;
-    if (m_station && m_settingUp) m_station->setHI(hi);
+    m_heightPending = m_station && !m_measured;
 }
 
-bool CLectZeiss::IsReference() const {
+// The pending instrument height goes to the station in force.
+void CLectZeiss::SettleInstrumentHeight() {
+    if (m_heightPending && m_station) m_station->setHI(m_hi);
+    m_heightPending = false;
+}
+
+bool CLectZeiss::IsReference(std::string_view code) const {
     if (m_setUp) return true;
-    return m_settings.MarksReference(!m_sighted, m_record.code);
+    return m_settings.MarksReference(!m_sighted, code);
 }
 
+// A sighting of a set-up program read before the program's station line waits for it: the instrument
+// writes the station once its backsights are measured.
 void CLectZeiss::ReadSighting(const Values& values, int number) {
+    Sighting sighting{
+        std::string(m_record.point), std::string(m_record.code), PointCode(), values, m_reflector, number};
+    m_lineSighted = sighting.point;
+    if (m_setUp && !m_programStation) {
+        m_held.push_back(std::move(sighting));
+        return;
+    }
+    SettleInstrumentHeight();
+    m_measured = true;
+    m_settingUp = false;
+    WriteSighting(sighting);
+}
+
+// The coordinates that the instrument computed for the sighting on the line before, written on a line of
+// their own: the sighting's line holds three values only.
+void CLectZeiss::ReadComputed(const Values& values, int number) {
+    if (!m_held.empty() && m_held.back().point == m_sightedBefore) {
+        Values& held = m_held.back().values;
+        if (!held.HasPosition()) {
+            held.east = values.east;
+            held.north = values.north;
+            held.elevation = values.elevation;
+        }
+        return;
+    }
+    if (m_settings.keepComputed) AddPosition(m_sightedBefore, values, false, number);
+}
+
+void CLectZeiss::WriteHeldSightings() {
+    const std::vector<Sighting> held = std::exchange(m_held, {});
+    for (const Sighting& sighting : held)
+        WriteSighting(sighting);
+}
+
+void CLectZeiss::WriteSighting(const Sighting& sighting) {
+    const int number = sighting.number;
     if (!m_station) {
         if (!OpenStation(fb::kUnknownStation, number)) return;
         LineUnknownStation(number);
     }
+    const Values& values = sighting.values;
     double av = values.zenith, di = values.slope;
     SlopeFromHorizontal(values.horizontal, values.heightDifference, av, di);
-    const std::string point(m_record.point);
-    AddCode(PointCode(), point);
-    const bool reference = IsReference();
-    CVisee* sighting = reference ? static_cast<CVisee*>(AddReference(point, m_reflector, values.hz, av, di))
-                                 : static_cast<CVisee*>(AddMesure(point, m_reflector, values.hz, av, di));
+    AddCode(sighting.label, sighting.point);
+    const double hp = sighting.reflector;
+    CVisee* added = IsReference(sighting.code)
+                        ? static_cast<CVisee*>(AddReference(sighting.point, hp, values.hz, av, di))
+                        : static_cast<CVisee*>(AddMesure(sighting.point, hp, values.hz, av, di));
     m_sighted = true;
-    m_settingUp = false;
-    if (!sighting) return LineError(fb::kRefused, number);
+    if (!added) return LineError(fb::kRefused, number);
     if (m_settings.keepComputed && IsKnown(values.east) && IsKnown(values.north))
-        AddPosition(point, values, false, number);
+        AddPosition(sighting.point, values, false, number);
 }
 
 // The code of the point line, followed by its information.

@@ -10,7 +10,7 @@ namespace {
 // The columns of an M5 line, counted from 0.
 constexpr std::size_t kM5Kind = 17; // "PI1", "TI ", "TO "
 constexpr std::size_t kM5Info = 21; // the 27-character information block
-constexpr std::size_t kM5InfoWidth = 27;
+constexpr std::size_t kM5InfoWidth = kInfoWidth;
 constexpr std::size_t kM5FirstBlock = 49; // a block: type 2, blank, value 14, blank, unit 4, separator
 constexpr std::size_t kM5BlockWidth = 23;
 constexpr std::size_t kM5ErrorFlag = 118;
@@ -106,9 +106,9 @@ bool SplitM5(std::string_view line, const InfoPlaces& places, Record& record) {
         record.text = true;
         record.words = Trimmed(info);
     } else if (kind.size() == 3 && kind.starts_with("PI") && IsDigit(kind[2])) {
-        record.point = InfoPart(info, places.point, 12);
-        record.code = InfoPart(info, places.code, 5);
-        record.information = InfoPart(info, places.information, 7);
+        record.point = InfoPart(info, places.point, kPointWidth);
+        record.code = InfoPart(info, places.code, kCodeWidth);
+        record.information = InfoPart(info, places.information, kInformationWidth);
     } else {
         return false;
     }
@@ -118,6 +118,20 @@ bool SplitM5(std::string_view line, const InfoPlaces& places, Record& record) {
     }
     record.errorFlag = !cut.Field(kM5ErrorFlag, 1).empty();
     return true;
+}
+
+std::optional<std::string> M5InfoOccupancy(std::string_view line) {
+    if (LayoutOf(line) != Layout::M5) return std::nullopt;
+    const Line cut(line);
+    const std::string_view kind = cut.Columns(kM5Kind, 3);
+    if (kind.size() != 3 || !kind.starts_with("PI") || !IsDigit(kind[2])) return std::nullopt;
+    std::string occupied;
+    const std::string_view info = cut.Columns(kM5Info, kM5InfoWidth);
+    for (std::size_t at = 0; at < info.size(); ++at) {
+        if ((static_cast<unsigned char>(info[at]) & 0xC0) == 0x80) continue; // the rest of a letter
+        occupied += info[at] == ' ' ? ' ' : 'x';
+    }
+    return occupied;
 }
 
 bool SplitR4R5(std::string_view line, bool withAddress, Record& record) {

@@ -2,6 +2,8 @@
 
 #include <array>
 #include <cstddef>
+#include <optional>
+#include <string>
 #include <string_view>
 
 // The lines of Trimble (Zeiss) field books cut into their fields, before any interpretation. Four
@@ -21,13 +23,24 @@ enum class Layout { Unknown, M5, R4, R5, Rec500 };
 inline constexpr int kM5Width = 119;
 inline constexpr int kRec500Width = 79;
 
-// The places, counted from 1 in the 27-character information block of an M5 line, of the information
-// (I, 7 characters), the code (C, 5) and the point id (P, 12). An instrument's header may move them
-// (words 20, 21, 22); these are those of the instruments that write no header.
+// The information block of an M5 point line and its three fields: the point id (right-aligned), the code
+// (right-aligned) and the information (left-aligned). The three fill 24 of the 27 columns; the surveyor
+// may set the instrument to swap the point id and the code and to move the information.
+inline constexpr int kInfoWidth = 27;
+inline constexpr int kPointWidth = 12;
+inline constexpr int kCodeWidth = 5;
+inline constexpr int kInformationWidth = 7;
+
+// The places, counted from 1 in the information block, of the information (I), the code (C) and the
+// point id (P). An instrument's header gives them (words 20, 21, 22); without them, the reader finds them
+// from the point lines (LectZeissPlaces.h). The default is the point id ending in column 19 followed by
+// its code.
 struct InfoPlaces {
     int information = 25;
     int code = 20;
     int point = 8;
+
+    bool operator==(const InfoPlaces&) const = default;
 };
 
 struct Value {
@@ -57,5 +70,10 @@ Layout LayoutOf(std::string_view line);
 bool SplitM5(std::string_view line, const InfoPlaces& places, Record& record);
 bool SplitR4R5(std::string_view line, bool withAddress, Record& record);
 bool SplitRec500(std::string_view line, Record& record);
+
+// What an M5 point line writes in its information block, a column a character: 'x' where something is
+// written, a blank where nothing is; shorter than the block when the line is cut. Nothing when the line is
+// not an M5 point line.
+std::optional<std::string> M5InfoOccupancy(std::string_view line);
 
 } // namespace pyr::zeiss

@@ -96,11 +96,12 @@ TEST(LectZeiss, ARec500FieldBookTakesItsUnitsFromTheSettings) {
     }
 }
 
-// The settings say which axis X is; the header of the instrument (word 05) wins over them.
+// The settings say which axis X is; the header of the instrument (word 05, its coordinate system) wins
+// over them: in system 1 (XY) X is the northing, in system 2 (YX) the easting.
 TEST(LectZeiss, TheAxesFollowTheHeaderThenTheSettings) {
     const std::string point = M5(2, "PI1", Pi("7"), {{"X", "100.000", "m"}, {"Y", "200.000", "m"}}) + "\r\n";
-    const std::string xEast = M5(1, "TI", "", {{"05", "1", ""}}) + "\r\n";
-    const std::string xNorth = M5(1, "TI", "", {{"05", "2", ""}}) + "\r\n";
+    const std::string xEast = M5(1, "TI", "", {{"05", "2", ""}}) + "\r\n";
+    const std::string xNorth = M5(1, "TI", "", {{"05", "1", ""}}) + "\r\n";
     const std::tuple<const char*, std::string, double, double> cases[] = {
         {"YX", point, 200.0, 100.0},
         {"XY", point, 100.0, 200.0},
