@@ -103,6 +103,7 @@ void CLectNikon::BeginReading() {
     m_hasStation = false;
     m_station.clear();
     m_backsight.clear();
+    m_onAzimuth = false;
     m_firstSighting = false;
     m_known.clear();
     m_started = m_rawStarted = m_dtmStarted = false;
@@ -274,8 +275,12 @@ void CLectNikon::ReadStation(int number) {
         !Angle(f[hiAt + 1], m_settings.angles, azimuth, number) ||
         !Angle(f[hiAt + 2], m_settings.angles, reading, number))
         return;
-    if (!OpenStation(name, hi, number)) return;
+    // Set up on an azimuth alone, without a backsight point that a reference could name, the station keeps
+    // the orientation that the instrument computed with: the bearing of its circle's zero.
+    const bool onAzimuth = backsight.empty() && IsKnown(azimuth) && IsKnown(reading);
+    if (!OpenStation(name, hi, number, onAzimuth ? WrapGrads(azimuth - reading) : kUndefined)) return;
     m_backsight.assign(backsight);
+    m_onAzimuth = onAzimuth;
     // The orientation that the instrument was given is kept for the surveyor to see: the V0 itself is
     // computed from the reference sightings.
     if (backsight.empty() && IsUndefined(azimuth) && IsUndefined(reading)) return;
@@ -305,6 +310,8 @@ void CLectNikon::ReadShot(int number, bool backsight) {
     const std::size_t first = idPlace ? 3 : 2;
     std::string_view point = PointOf(f[1], idPlace ? f[2] : std::string_view());
     if (point.empty() && backsight) point = m_backsight;
+    // The shot on the azimuth of a station oriented on it: its reading is the one the V0 was set with.
+    if (point.empty() && backsight && m_onAzimuth) return;
     if (point.empty()) return LineMissing(number, fb::kDatumPoint);
     if (!StationInForce(number)) return;
     double hp = kUndefined, di = kUndefined, ah = kUndefined, av = kUndefined;
@@ -430,12 +437,12 @@ bool CLectNikon::StationInForce(int number) {
     return true;
 }
 
-bool CLectNikon::OpenStation(std::string_view name, double hi, int number) {
+bool CLectNikon::OpenStation(std::string_view name, double hi, int number, double v0) {
     if (name.empty()) {
         LineMissing(number, fb::kDatumStation);
         return false;
     }
-    CStation* station = AddStation(std::string(name), hi);
+    CStation* station = AddStation(std::string(name), hi, v0);
     if (!station) {
         LineError(fb::kRefused, number);
         return false;
@@ -443,6 +450,7 @@ bool CLectNikon::OpenStation(std::string_view name, double hi, int number) {
     m_hasStation = true;
     m_station = station->mat();
     m_backsight.clear();
+    m_onAzimuth = false;
     m_firstSighting = true;
     return true;
 }

@@ -58,7 +58,7 @@ private:
     bool Length(std::string_view text, DistanceUnit unit, double& metres, int number) const;
     bool Angle(std::string_view text, AngleUnit unit, double& grads, int number) const;
     bool Zenith(std::string_view text, AngleUnit unit, bool fromZenith, double& grads, int number) const;
-    bool OpenStation(std::string_view name, double hi, int number);
+    bool OpenStation(std::string_view name, double hi, int number, double v0 = kUndefined);
     bool StationInForce(int number);
     bool AddPosition(std::string_view name, double first, double second, double elevation,
                      std::string_view code, int number);
@@ -75,8 +75,9 @@ private:
 
     // ---- What holds from one line to the next
     bool m_hasStation = false;
-    std::string m_station;   // the station in force
-    std::string m_backsight; // its backsight point, as the station record names it
+    std::string m_station;    // the station in force
+    std::string m_backsight;  // its backsight point, as the station record names it
+    bool m_onAzimuth = false; // it names none but gives the azimuth and reading: its V0 is known
     bool m_firstSighting = false;
     TextSet m_known; // points given with their planimetry
     bool m_started = false;

@@ -71,6 +71,40 @@ TEST(LectNikon, RadiatedShotsFindTheInstrumentsOwnCoordinates) {
     EXPECT_LT(check.worstHeight, 0.001);
 }
 
+// The same survey in grads, easting first, S1 oriented on an azimuth alone: its station record names no
+// backsight point, gives the azimuth 60.2735 gr told to the instrument and the reading 22.8585 gr set on
+// it, and its backsight shot names no point and measures no distance. The instrument computed with V0 =
+// 60.2735 - 22.8585 = 37.4150 gr: the station keeps that orientation, since no reference can give it.
+TEST(LectNikon, AStationOrientedOnAnAzimuthAloneKeepsItsOrientation) {
+    NikonRun run;
+    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("nikon-raw-gisement.raw");
+    EXPECT_EQ(ReportText(run), "");
+    const RadiationCheck check = CheckAgainstRecorded(read);
+    EXPECT_EQ(check.faults, std::vector<std::string>{});
+    EXPECT_EQ(check.compared, 8); // 101, 102, S2, 103; S1 in both faces, 201, 202
+    EXPECT_LT(check.worstPlan, 0.001);
+    EXPECT_LT(check.worstHeight, 0.001);
+    const int s1 = read.Find(kKindStation, "S1", 0, 0), s2 = read.Find(kKindStation, "S2", 0, 0);
+    EXPECT_NEAR(read.v0At(s1), 37.415, 1e-9);
+    EXPECT_EQ(read.v0At(s2), kUndefined); // oriented on S1: left to the V0 computation
+
+    // A V0 of 0 is one; below 0 it comes round; without the azimuth or the reading, or with a backsight
+    // point, there is none, and a backsight shot without a point is reported.
+    const std::tuple<const char*, double, const char*> cases[] = {
+        {"ST,S1,,,,1.500,0.0000,0.0000", 0.0, ""},
+        {"ST,S1,,,,1.500,10.0000,30.0000", 380.0, ""},
+        {"ST,S1,,,,1.500,,30.0000", kUndefined, "Erreur ligne 2\n"},
+        {"ST,S1,,A1,,1.500,10.0000,30.0000", kUndefined, ""},
+    };
+    for (const auto& [station, v0, heads] : cases) {
+        NikonRun one;
+        const CCarnet& oriented = one.Read(std::string(station) + "\nF1,,1.500,,30.0000,100.0000,10:00:00\n");
+        SCOPED_TRACE(station);
+        EXPECT_EQ(ReportHeads(one), heads);
+        EXPECT_NEAR(oriented.v0At(oriented.Find(kKindStation, "S1", 0, 0)), v0, 1e-9);
+    }
+}
+
 TEST(LectNikon, ADtmFieldBookGivesStationsFromTheirHeightAndUnitsPerRecord) {
     NikonRun run;
     const CCarnet& read = run.ReadFile("nikon-dtm.nik");
