@@ -200,22 +200,26 @@ TEST(LectSokkia, ReferenceSightings) {
     ExpectValues(read, 4, {U, U, 100.0});
 }
 
-// An SDR33 book in grads, east before north, as a collector writes it when it also stores the coordinates
-// that it computed (08TP) after each observation. Constructed: K1 (1250, 2180, 102.4) known; S1 (1000, 2000,
-// 100), HI 1.562, its circle 37.4150 gr off the bearings, backsight on K1, then 101, 102, S2 and 103 (face
-// II, target 1.800); S2 (1080, 1940, 97.5), HI 1.485, circle 312.6600 gr off, backsight on S1 in both
-// faces, then 201 and 202 (face II, target 2.000). The observations were rounded as written (0.1 mgon,
-// mm), and the recorded coordinates computed from them as written, the instrument oriented on its
-// backsight's coordinates: radiated from the GéoBase, every point falls within the mm of the book.
+// Books as a collector writes them when it also stores the coordinates that it computed (08TP) after each
+// observation: SDR33 in grads, east before north, and SDR2x in decimal degrees, north first, its reals
+// touching. Constructed: K1 (1250, 2180, 102.4) known; S1 (1000, 2000, 100), HI 1.562, its circle 37.4150
+// gr off the bearings, backsight on K1, then 101, 102, S2 and 103 (face II, target 1.800); S2 (1080, 1940,
+// 97.5), HI 1.485, circle 312.6600 gr off, backsight on S1 in both faces, then 201 and 202 (face II,
+// target 2.000). The observations were rounded as written (0.1 mgon or what the 10 characters hold, mm),
+// and the recorded coordinates computed from them as written, the instrument oriented on its backsight's
+// coordinates: radiated from the GéoBase, every point falls within the mm of the book.
 TEST(LectSokkia, RadiatedObservationsFindTheCollectorsOwnCoordinates) {
-    SokkiaRun run;
-    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("sokkia-sdr33-calcule.sdr");
-    EXPECT_EQ(ReportText(run), "");
-    const RadiationCheck check = CheckAgainstRecorded(read);
-    EXPECT_EQ(check.faults, std::vector<std::string>{});
-    EXPECT_EQ(check.compared, 9); // K1, 101, 102, S2, 103; S1 in both faces, 201, 202
-    EXPECT_LT(check.worstPlan, 0.001);
-    EXPECT_LT(check.worstHeight, 0.001);
+    for (const char* book : {"sokkia-sdr33-calcule.sdr", "sokkia-sdr2x-calcule.sdr"}) {
+        SCOPED_TRACE(book);
+        SokkiaRun run;
+        const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile(book);
+        EXPECT_EQ(ReportText(run), "");
+        const RadiationCheck check = CheckAgainstRecorded(read);
+        EXPECT_EQ(check.faults, std::vector<std::string>{});
+        EXPECT_EQ(check.compared, 9); // K1, 101, 102, S2, 103; S1 in both faces, 201, 202
+        EXPECT_LT(check.worstPlan, 0.001);
+        EXPECT_LT(check.worstHeight, 0.001);
+    }
 }
 
 // Blanks are values the instrument did not record: they stay missing, never 0. The point computed after an
