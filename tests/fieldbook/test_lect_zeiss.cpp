@@ -138,24 +138,179 @@ TEST(LectZeiss, ReferencesComeFromSetUpProgramsOrTheSettings) {
     }
 }
 
-// An instrument height given after the station's program waits for the next station; a reflector height
+// An instrument height given before the station's first sighting is the station's when a sighting comes
+// next (the instrument asks for it again at the start of the polar measurements), the next station's when
+// a station line comes first; given after sightings, it waits for the next station. A reflector height
 // holds until the next one.
 TEST(LectZeiss, HeightsGoToTheStationOfTheirSetUp) {
-    const std::string text = M5(1, "PI1", Pi("A", "S"), {{"Z", "10.000", "m"}}) + "\n" +
-                             M5(2, "TI", "INPUT", {{"ih", "1.400", "m"}, {"th", "1.100", "m"}}) + "\n" +
-                             M5(3, "PI1", Pi("1"), {{"Hz", "1.0000", "gon"}}) + "\n" + M5(4, "TI", "POLAR") +
-                             "\n" + M5(5, "TI", "INPUT", {{"ih", "1.700", "m"}}) + "\n" +
-                             M5(6, "PI1", Pi("B", "S")) + "\n" +
-                             M5(7, "PI1", Pi("2"), {{"Hz", "2.0000", "gon"}}) + "\n";
+    const std::string a = M5(1, "PI1", Pi("A", "S"), {{"Z", "10.000", "m"}});
+    const std::string aAgain = M5(1, "PI1", Pi("A", "S"), {{"X", "5.000", "m"}, {"Y", "6.000", "m"}});
+    const std::string b = M5(9, "PI1", Pi("B", "S"));
+    const std::string polar = M5(3, "TI", "POLAR");
+    const auto Input = [](const char* hi) {
+        return M5(2, "TI", "INPUT", {{"ih", hi, "m"}, {"th", "1.100", "m"}});
+    };
+    const auto Sight = [](const char* point) { return M5(5, "PI1", Pi(point), {{"Hz", "1.0000", "gon"}}); };
+    const struct {
+        std::vector<std::string> lines;
+        double hiA, hiB;
+    } cases[] = {
+        {{a, Input("1.400"), Sight("1"), polar, Input("1.700"), b, Sight("2")}, 1.4, 1.7},
+        {{a, polar, Input("1.400"), Sight("1"), b, Sight("2")}, 1.4, 1.4}, // B: the last one given
+        {{a, polar, Input("1.400"), b, Sight("2")}, kUndefined, 1.4},
+        {{a, Input("1.400"), aAgain, Sight("1")}, 1.4, kUndefined},
+        {{a, Sight("1"), Input("1.400"), Sight("2"), b}, kUndefined, 1.4},
+        {{a, Input("1.400")}, 1.4, kUndefined}, // the book ends: nothing else to take it
+    };
+    for (const auto& c : cases) {
+        std::string text;
+        for (const std::string& line : c.lines)
+            text += line + "\n";
+        ZeissRun run;
+        const CCarnet& read = run.Read(text);
+        EXPECT_EQ(ReportText(run), "");
+        for (const auto& [station, hi] : {std::pair{"A", c.hiA}, std::pair{"B", c.hiB}}) {
+            const int at = read.Find(kKindStation, station);
+            if (at < 0) {
+                EXPECT_EQ(hi, kUndefined) << text;
+                continue;
+            }
+            EXPECT_NEAR(read.hiAt(at), hi, 1e-4) << station << " in\n" << text;
+        }
+        const int last = read.GetSize() - 1;
+        if (IsSightingKind(read.GetType(last))) {
+            EXPECT_NEAR(read.hpAt(last), 1.1, 1e-4);
+        }
+    }
+}
+
+// A set-up program writes the station once its backsights are measured: those backsights are the station's
+// references, each with its own reflector height and the instrument's coordinates on the line after it.
+// Backsights that no station line follows stay where they were read.
+TEST(LectZeiss, BacksightsWrittenBeforeTheirStationLineAreItsReferences) {
+    const std::string knStat = M5(1, "TI", "KN STAT") + "\n";
+    const std::string backsight =
+        M5(2, "PI1", Pi("R"), {{"SD", "20.000", "m"}, {"Hz", "50.0000", "gon"}, {"V1", "100.0000", "gon"}}) +
+        "\n" + M5(3, "PI1", Pi("R"), {{"X", "14.142", "m"}, {"Y", "14.142", "m"}}) + "\n";
+    const std::string th = M5(4, "TI", "INPUT", {{"th", "1.600", "m"}}) + "\n";
+    const std::string station =
+        M5(5, "PI1", Pi("ST", "S"), {{"X", "0.000", "m"}, {"Y", "0.000", "m"}}) + "\n";
+    const std::string polar = M5(6, "TI", "POLAR") + "\n";
+    const std::string sighting = M5(7, "PI1", Pi("1"), {{"Hz", "1.0000", "gon"}}) + "\n";
+    const std::string reflector = M5(1, "TI", "INPUT", {{"th", "1.300", "m"}}) + "\n";
+    const struct {
+        std::string text;
+        const char* elements;
+        const char* reports;
+    } cases[] = {
+        {reflector + knStat + backsight + th + station + polar + sighting,
+         "1000 KN STAT; 1001 ST; 1006 ST; 1002 R; 1006 R; 1000 POLAR; 1003 1; ", ""},
+        {station + sighting + knStat + backsight + polar + sighting,
+         "1001 ST; 1006 ST; 1003 1; 1000 KN STAT; 1002 R; 1006 R; 1000 POLAR; 1003 1; ", ""},
+        {reflector + knStat + backsight, "1000 KN STAT; 1001 INCONNUE; 1002 R; 1006 R; ",
+         "Attention : ligne 3 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n"},
+    };
+    for (const auto& c : cases) {
+        ZeissRun run;
+        const CCarnet& read = run.Set(kKeyPointsCalcules, "1").Read(c.text);
+        EXPECT_EQ(ReportText(run), c.reports) << c.text;
+        ASSERT_EQ(ElementsSummary(read), std::string("1000 Format               = M5; ") + c.elements)
+            << c.text;
+        const int at = read.Find(kKindReference, "R");
+        ASSERT_GE(at, 0);
+        if (std::string_view(c.elements).starts_with("1000 KN STAT; 1001 ST")) {
+            EXPECT_NEAR(read.hpAt(at), 1.3, 1e-4) << "the reflector height of its own line";
+        }
+        ExpectValues(read, at + 1, {14.142, 14.142, kUndefined});
+    }
+}
+
+// A sighting line holds three values: the instrument writes the coordinates that it computed for the point
+// on the next line, under the same point id. They give the point with "PointsCalcules" only, and its code
+// once; coordinates of a point that was not just sighted are a known point.
+TEST(LectZeiss, TheInstrumentsCoordinatesFollowTheirSightingLine) {
+    const std::string text =
+        M5(1, "PI1", Pi("ST", "S"), {{"X", "0.000", "m"}, {"Y", "0.000", "m"}}) + "\n" +
+        M5(2, "PI1", Pi("1", "MUR"),
+           {{"SD", "10.000", "m"}, {"Hz", "0.0000", "gon"}, {"V1", "100.0000", "gon"}}) +
+        "\n" +
+        M5(3, "PI1", Pi("1", "MUR"), {{"X", "10.000", "m"}, {"Y", "0.000", "m"}, {"Z", "1.000", "m"}}) +
+        "\n" + M5(4, "PI1", Pi("2", "MUR"), {{"Hz", "20.0000", "gon"}}) + "\n" + M5(5, "TI", "INPUT") + "\n" +
+        M5(6, "PI1", Pi("2", "MUR"), {{"X", "20.000", "m"}, {"Y", "7.000", "m"}}) + "\n" +
+        M5(7, "PI1", Pi("3", "ARB"), {{"X", "30.000", "m"}, {"Y", "8.000", "m"}}) + "\n";
+    const std::pair<const char*, const char*> cases[] = {
+        {"0", "1001 ST; 1006 ST; 1009 MUR; 1003 1; 1009 MUR; 1003 2; 1009 MUR; 1006 2; 1009 ARB; 1006 3; "},
+        {"1", "1001 ST; 1006 ST; 1009 MUR; 1003 1; 1006 1; 1009 MUR; 1003 2; 1009 MUR; 1006 2; 1009 ARB; "
+              "1006 3; "},
+    };
+    for (const auto& [keep, elements] : cases) {
+        ZeissRun run;
+        const CCarnet& read = run.Set(kKeyPointsCalcules, keep).Read(text);
+        EXPECT_EQ(ReportText(run), "");
+        ASSERT_EQ(ElementsSummary(read), std::string("1000 Format               = M5; ") + elements) << keep;
+        if (*keep == '1') ExpectValues(read, 5, {0.0, 10.0, 1.0}); // X the northing
+    }
+}
+
+// Without the places in a header, the point id and the code are read where the point lines put them; the
+// surveyor is told when they are not the usual ones. Lines after the first fifty point lines are read as
+// they come, and every report keeps its line and its order.
+TEST(LectZeiss, AnM5BookWithoutHeaderHasItsFieldsFoundFromItsPointLines) {
+    using Info = std::string (*)(const char* point, const char* code, const char* information);
+    const Info usual = [](const char* point, const char* code, const char* information) {
+        return Pi(point, code) + information;
+    };
+    const Info m3 = [](const char* point, const char* code, const char* information) {
+        return Sprintf("%-7s   %5s%12s", information, code, point);
+    };
+    const Info pointFirst = [](const char* point, const char* code, const char* information) {
+        return Sprintf("%12s%5s%-7s", point, code, information);
+    };
+    const std::tuple<Info, const char*> cases[] = {
+        {usual, ""},
+        {m3, "Attention : ligne 1 : places du matricule et du code non données par l'en-tête ; d'après les "
+             "lignes de points, matricule lu en colonnes 16 à 27 et code en colonnes 11 à 15 du bloc "
+             "d'information.\n"},
+        {pointFirst,
+         "Attention : ligne 1 : places du matricule et du code non données par l'en-tête ; d'après "
+         "les lignes de points, matricule lu en colonnes 1 à 12 et code en colonnes 13 à 17 du "
+         "bloc d'information.\n"},
+    };
+    for (const auto& [info, message] : cases) {
+        std::string text =
+            M5(1, "PI1", info("ST", "S", ""), {{"X", "0.000", "m"}, {"Y", "0.000", "m"}}) + "\n";
+        std::string expected = "1000 Format               = M5; 1001 ST; 1006 ST; ";
+        for (int i = 2; i <= 60; ++i) {
+            const std::string point = std::to_string(1000 + i);
+            const char* code = i % 3 == 0 ? "MUR" : "";
+            if (i == 55) {
+                text += "bonjour\n"; // read after the places are found
+                continue;
+            }
+            text +=
+                M5(i, "PI1", info(point.c_str(), code, i % 4 == 0 ? "H2" : ""), {{"Hz", "10.0000", "gon"}}) +
+                "\n";
+            const std::string label =
+                std::string(code) + (*code && i % 4 == 0 ? " " : "") + (i % 4 == 0 ? "H2" : "");
+            expected += (label.empty() ? "" : "1009 " + label + "; ") + "1003 " + point + "; ";
+        }
+        ZeissRun run;
+        const CCarnet& read = run.Read(text);
+        EXPECT_EQ(ReportText(run), std::string(message) + "Erreur ligne 55 : donnée non reconnue !\n"
+                                                          " -> Chaîne lue = <bonjour>\n");
+        EXPECT_EQ(ElementsSummary(read), expected);
+    }
+
+    // Nothing that the instrument could write: the surveyor is told where the point ids are read.
     ZeissRun run;
-    const CCarnet& read = run.Read(text);
-    EXPECT_EQ(ReportText(run), "");
-    ASSERT_EQ(ElementsSummary(read),
-              "1000 Format               = M5; 1001 A; 1006 A; 1003 1; 1000 POLAR; 1001 B; 1003 2; ");
-    EXPECT_NEAR(read.hiAt(1), 1.4, 1e-4);
-    ExpectValues(read, 2, {kUndefined, kUndefined, 10.0});
-    EXPECT_NEAR(read.hiAt(5), 1.7, 1e-4);
-    ExpectValues(read, 6, {1.1, 2.0, kUndefined, kUndefined});
+    const CCarnet& read = run.Read(M5(1, "PI1", std::string(27, 'x'), {{"Hz", "10.0000", "gon"}}) + "\n");
+    EXPECT_EQ(
+        ReportText(run),
+        "Attention : ligne 1 : aucune disposition connue du bloc d'information n'explique les lignes de "
+        "points ; matricule lu en colonnes 8 à 19 et code en colonnes 20 à 24.\n"
+        "Attention : ligne 1 : visées sans station, rattachées à la station <INCONNUE> (à renommer).\n");
+    EXPECT_EQ(ElementsSummary(read), "1000 Format               = M5; 1001 INCONNUE; 1009 xxxxx xxx; 1003 "
+                                     "xxxxxxxxxxxx; ");
 }
 
 TEST(LectZeiss, EveryLineIsReadOrReportedWithItsNumber) {
