@@ -53,6 +53,9 @@ TEST(LectZeissInstrument, AnM3BookRadiatesOntoTheInstrumentsCoordinates) {
         const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile(c.file);
         EXPECT_EQ(ReportText(run), c.reports) << c.file;
         ASSERT_EQ(ElementsSummary(read), std::string(c.header) + kElements) << c.file;
+        // The radiation compares heights only where the station has one: its own check first.
+        EXPECT_NEAR(read.hiAt(read.Find(kKindStation, "S1")), 1.55, 1e-4) << c.file;
+        EXPECT_NEAR(read.hiAt(read.Find(kKindStation, "S2")), 1.62, 1e-4) << c.file;
         const RadiationCheck check = CheckAgainstRecorded(read);
         EXPECT_EQ(check.faults, std::vector<std::string>{}) << c.file;
         EXPECT_EQ(check.compared, 7) << c.file; // R1, 101, 102, 103 from S1; R2, 201, 202 from S2
