@@ -58,7 +58,8 @@ inline std::vector<Station> Stations(const pyr::CCarnet& carnet) {
     std::vector<Station> stations;
     for (int i = 0; i < carnet.GetSize(); ++i) {
         const int kind = carnet.GetType(i);
-        if (kind == pyr::kKindStation) stations.push_back({carnet.matAt(i), carnet.hiAt(i), carnet.v0At(i), {}});
+        if (kind == pyr::kKindStation)
+            stations.push_back({carnet.matAt(i), carnet.hiAt(i), carnet.v0At(i), {}});
         if ((kind == pyr::kKindReference || kind == pyr::kKindMesure) && !stations.empty()) {
             double ah = carnet.ahAt(i), av = carnet.avAt(i);
             if (Known(av) && av > 200.0) { // face II: the circle read half a turn round
@@ -110,6 +111,7 @@ inline RadiationCheck CheckAgainstRecorded(const pyr::CCarnet& carnet, double to
             continue;
         }
         const bool heights = carnet.hasZ(station.name, zs) && Known(station.hi);
+        bool heightLost = false; // a station with an altitude but no HI, whose points have recorded heights
         for (const Sighting& s : station.sightings) {
             double x = 0.0, y = 0.0, z = 0.0;
             if (!Known(s.ah) || !Known(s.av) || !Known(s.di) || s.di <= 0.0 || !carnet.hasXY(s.name, x, y))
@@ -121,6 +123,7 @@ inline RadiationCheck CheckAgainstRecorded(const pyr::CCarnet& carnet, double to
             double dz = 0.0;
             const bool withHeight = heights && Known(s.hp) && carnet.hasZ(s.name, z);
             if (withHeight) dz = zs + station.hi + s.di * std::cos(Rad(s.av)) - s.hp - z;
+            if (!heights && carnet.hasZ(station.name, zs) && carnet.hasZ(s.name, z)) heightLost = true;
             ++check.compared;
             const double plan = std::hypot(dx, dy);
             check.worstPlan = std::max(check.worstPlan, plan);
@@ -129,6 +132,7 @@ inline RadiationCheck CheckAgainstRecorded(const pyr::CCarnet& carnet, double to
                 check.faults.push_back(s.name + " depuis " + station.name + " : dX " + std::to_string(dx) +
                                        " dY " + std::to_string(dy) + " dZ " + std::to_string(dz));
         }
+        if (heightLost) check.faults.push_back("station " + station.name + " sans hauteur d'instrument");
     }
     return check;
 }
