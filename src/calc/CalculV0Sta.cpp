@@ -1,6 +1,7 @@
 #include "calc/CalculV0Sta.h"
 
 #include "calc/CalculV0Texts.h"
+#include "core/Files.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/GeoBaseMessages.h"
@@ -13,7 +14,6 @@
 #include "ui/PyrTxtWnd.h"
 
 #include <algorithm>
-#include <filesystem>
 
 namespace pyr {
 
@@ -358,10 +358,7 @@ bool CCalculV0Sta::Enregistrer() {
     const std::string& path = GeoBase();
     if (!m_carnet.BackUp(m_frontEnd) || !m_carnet.Save(path, m_frontEnd, false)) return false;
     m_written = true;
-    // Recorded whole, so that the next command finds it from whatever folder it is run.
-    std::error_code error;
-    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
-    WriteLastGeoBase(Inputs().paramPath, error ? path : absolute.lexically_normal().string());
+    WriteLastGeoBase(Inputs().paramPath, WholePath(path));
     txt.Print(v0::kLineWritten, written);
     txt.Print(msg::kSaved, path.c_str());
     return true;

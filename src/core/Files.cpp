@@ -5,6 +5,7 @@
 #include <cstdio>
 #include <cstring>
 #include <fcntl.h>
+#include <filesystem>
 #include <sys/mman.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -140,6 +141,12 @@ std::string ReplaceExtension(const std::string& path, const std::string& extensi
     size_t dot = path.rfind('.');
     std::string stem = (dot != std::string::npos && dot > nameStart) ? path.substr(0, dot) : path;
     return stem + "." + extension;
+}
+
+std::string WholePath(const std::string& path) {
+    std::error_code error;
+    const std::filesystem::path whole = std::filesystem::absolute(path, error);
+    return error ? path : whole.lexically_normal().string();
 }
 
 } // namespace pyr

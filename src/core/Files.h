@@ -16,4 +16,9 @@ std::string SystemErrorText(int errnum);
 // without its dot; added when the name has none. "C:/job/chantier.geo", "bak" gives ".../chantier.bak".
 std::string ReplaceExtension(const std::string& path, const std::string& extension);
 
+// The path whole and without "." or ".." steps, as a file is recorded in the settings (the last GéoBase,
+// the last parameter file): the next command finds it from whatever folder it is run. The path as given
+// when the current folder cannot be known.
+std::string WholePath(const std::string& path);
+
 } // namespace pyr

@@ -14,8 +14,6 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
-#include <filesystem>
-
 namespace pyr {
 
 namespace {
@@ -30,14 +28,6 @@ constexpr const char* kGeoBaseHelp = "la GéoBase à éditer (au lieu de la dern
 constexpr const char* kReadingOption = "lecture";
 constexpr const char* kReadingHelp = "lit un carnet de ce format, l'ajoute à la GéoBase et l'enregistre";
 constexpr const char* kReadingDone = "GéoBase <%s> : %d élément(s), dont %d lu(s) dans le carnet.";
-
-// A GéoBase is recorded as the last one whole, so that the next command finds it from whatever folder it
-// is run.
-std::string WholePath(const std::string& path) {
-    std::error_code error;
-    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
-    return error ? path : absolute.lexically_normal().string();
-}
 
 // The code table the editor holds for a GéoBase: the one it goes with, else the job's table of the
 // settings; none when neither can be read.

@@ -16,7 +16,6 @@
 
 #include <cerrno>
 #include <cstdio>
-#include <filesystem>
 
 namespace pyr {
 
@@ -56,14 +55,7 @@ void KeepCodeTable(FieldBookConverter& c, const CLectCarnet& dialog) {
     const std::string resolved = dialog.ResolvedCodeTable();
     if (c.codeTable && !EqualIgnoringCase(c.codeTable->FileName(), resolved))
         c.codeTable->Init(resolved, c.txt);
-    c.params.WriteString(kSectionGeocodification, kKeyTableDeCode, dialog.CodeTablePath());
-}
-
-// The path recorded as the last file: whole, so that the next command finds it from any folder.
-std::string Recorded(const std::string& path) {
-    std::error_code error;
-    const std::filesystem::path absolute = std::filesystem::absolute(path, error);
-    return error ? path : absolute.lexically_normal().string();
+    c.params.WriteString(kSectionGeocodification, kKeyTableDeCode, WholePath(resolved));
 }
 
 // What the reader took from the field book: the instrument that the conversion writes at the head when
@@ -148,7 +140,8 @@ ui::DialogResult RunConversion(FieldBookConverter& c, CCarnet* target) {
     // 8, 9: the dialog, then its values kept.
     const ui::DialogResult shown = c.showDialog ? c.showDialog(*dialog) : frontEnd.DoModal(*dialog);
     if (shown != ui::DialogResult::Ok) return shown;
-    if (dialog->HasParamFile()) c.params.WriteString(section, kKeyParametrage, dialog->ParamFile());
+    if (dialog->HasParamFile())
+        c.params.WriteString(section, kKeyParametrage, WholePath(dialog->ParamFile()));
     c.params.WriteString(section, kKeyCarnet, dialog->Carnet());
     c.params.WriteInt(section, kKeyInterpretation, dialog->Interpret() ? 1 : 0);
     c.params.WriteString(section, kKeyAppareilTerrain, dialog->InstrumentName());
@@ -195,7 +188,7 @@ ui::DialogResult RunConversion(FieldBookConverter& c, CCarnet* target) {
         if (c.txt) c.txt->Print(msg::kCreated, path.c_str());
         c.m_written = path;
         if (!record) return true;
-        const std::string recorded = Recorded(path);
+        const std::string recorded = WholePath(path);
         c.registry.WriteString(kSectionPyralis, kKeyDernierFichier, recorded);
         WriteLastGeoBase(c.params.Path(), recorded);
         return true;

@@ -134,9 +134,9 @@ bool CLectCarnet::OnEditParams(ui::FrontEnd& frontEnd) {
     }
     // The delimited and columnar layouts serve the loading of points too: it finds them there.
     if (m_format == FieldBookFormat::Colonne)
-        m_params.WriteString(kSectionChargementDeSemis, kKeyParametresColonne, ParamFile());
+        m_params.WriteString(kSectionChargementDeSemis, kKeyParametresColonne, WholePath(ParamFile()));
     else if (m_format == FieldBookFormat::Separateur)
-        m_params.WriteString(kSectionChargementDeSemis, kKeyParametresSeparateur, ParamFile());
+        m_params.WriteString(kSectionChargementDeSemis, kKeyParametresSeparateur, WholePath(ParamFile()));
     m_driver.Edit(frontEnd);
     return true;
 }

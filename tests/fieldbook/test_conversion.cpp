@@ -390,6 +390,21 @@ TEST_F(Conversion, AWildFieldBookIsReadByItsOwnReader) {
     EXPECT_EQ(written.GetType(10), kKindReference);
 }
 
+// Files named from the folder the command runs in are recorded whole: the next reading finds them from any
+// other folder.
+TEST_F(Conversion, AParameterFileNamedFromTheCurrentFolderIsRecordedWhole) {
+    fs::copy_file(install + "Config/Wild.ini", dir / "chantier-wild.ini");
+    fs::copy_file(FieldBookData("wild-gsi16-84.gsi"), dir / "levé.gsi");
+    const fs::path before = fs::current_path();
+    fs::current_path(dir.Root());
+    frontEnd.dialogArguments = {"levé.gsi", "--parametrage", "chantier-wild.ini"};
+    const DialogResult result = RunConversion(*Make(FieldBookFormat::Wild), nullptr);
+    fs::current_path(before);
+    EXPECT_EQ(result, DialogResult::Ok);
+    EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), dir / "chantier-wild.ini");
+    EXPECT_EQ(ReadLastGeoBase(Params()), dir / "levé.geo");
+}
+
 // A delimited field book goes through a Quendal-Pc file beside it, read with the same choices and the
 // editor's code table, then deleted.
 TEST_F(Conversion, ADelimitedFieldBookIsReadThroughAQuendalFile) {
