@@ -15,6 +15,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <gtest/gtest.h>
 #include <string>
 #include <vector>
 
@@ -135,4 +136,15 @@ inline RadiationCheck CheckAgainstRecorded(const pyr::CCarnet& carnet, double to
         if (heightLost) check.faults.push_back("station " + station.name + " sans hauteur d'instrument");
     }
     return check;
+}
+
+// The book agrees with its instrument: `compared` sightings radiated, each within a millimetre of the
+// coordinates recorded for its point, and no station left without place, orientation or height.
+inline ::testing::AssertionResult AgreesWithInstrument(const pyr::CCarnet& carnet, int compared) {
+    const RadiationCheck check = CheckAgainstRecorded(carnet);
+    if (check.faults.empty() && check.compared == compared) return ::testing::AssertionSuccess();
+    auto failure = ::testing::AssertionFailure() << check.compared << " visées comparées sur " << compared;
+    for (const std::string& fault : check.faults)
+        failure << "\n  " << fault;
+    return failure;
 }
