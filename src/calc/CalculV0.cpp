@@ -23,19 +23,12 @@ std::string AngleText(double grads) {
     return FormatFixed(grads, CStation::DeciAng());
 }
 
-// The trigonometric height difference from the station's ground to the reference's, measured: the
-// difference of the line of sight over the corrected horizontal distance, the instrument and target
-// heights, curvature and refraction.
-double MeasuredHeightDifference(double horizontal, double zenith, double hi, double hp) {
-    return horizontal * CosGrads(zenith) / SinGrads(zenith) + hi - hp + CurvatureRefraction(horizontal);
-}
-
-void CheckReference(const V0Station& station, const V0Reference& ref, double zenith, double hp,
+void CheckReference(const StationPlace& station, const V0Reference& ref, double zenith, double hp,
                     const V0Settings& settings, std::vector<std::string>& warnings) {
     const double dh = ref.measuredDistance;
     if (IsKnown(station.z) && IsKnown(ref.z) && IsKnown(station.hi) && IsKnown(hp)) {
         const double computed = ref.z - station.z;
-        const double measured = MeasuredHeightDifference(dh, zenith, station.hi, hp);
+        const double measured = TrigonometricHeightDifference(dh, zenith, station.hi, hp);
         if (std::fabs(computed - measured) > settings.tolerances.HeightDifference(dh, zenith, kHeightTermsV0))
             warnings.push_back(Sprintf(v0::kMsgHeightOutOfTolerance, ref.mat.c_str(), computed, measured,
                                        computed - measured));
@@ -43,24 +36,6 @@ void CheckReference(const V0Station& station, const V0Reference& ref, double zen
     if (std::fabs(dh - ref.distance) > settings.tolerances.Distance(dh))
         warnings.push_back(
             Sprintf(v0::kMsgDistanceOutOfTolerance, ref.mat.c_str(), ref.distance, dh, ref.distance - dh));
-}
-
-// The planimetry and altitude of a point, each from the first of its elements that holds it: one look-up
-// when its first element holds both, as it mostly does. False when its planimetry is unknown.
-bool PlaceOf(const CCarnet& carnet, std::string_view mat, double& x, double& y, double& z) {
-    const int first = carnet.findMat(mat);
-    if (first < 0) {
-        x = y = z = kUndefined;
-        return false;
-    }
-    const auto* point = static_cast<const CPointGen*>(carnet.GetAt(first));
-    if (point->hasXY() && point->hasZ()) {
-        x = point->x(), y = point->y(), z = point->z();
-        return true;
-    }
-    if (!carnet.hasXY(mat, x, y)) x = y = kUndefined;
-    if (!carnet.hasZ(mat, z)) z = kUndefined;
-    return IsKnown(x);
 }
 
 // The sightings of a kind (or of both kinds, for 0) of the station that aim at points with known planimetry.
@@ -78,22 +53,6 @@ std::vector<int> SightingsOfKnownPoints(const CCarnet& carnet, int stationIndex,
 
 } // namespace
 
-std::string V0Station::Designation() const {
-    return Sprintf("%s(%d)", name.c_str(), reprise);
-}
-
-V0Station StationAt(const CCarnet& carnet, int stationIndex) {
-    V0Station station;
-    station.index = stationIndex;
-    station.name = carnet.matAt(stationIndex);
-    station.reprise = carnet.RepriseAt(stationIndex);
-    PlaceOf(carnet, station.name, station.x, station.y, station.z);
-    station.hi = carnet.hiAt(stationIndex);
-    if (IsKnown(station.hi)) station.hi += carnet.findEV(stationIndex, -1);
-    station.previousV0 = carnet.v0At(stationIndex);
-    return station;
-}
-
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex) {
     return SightingsOfKnownPoints(carnet, stationIndex, 0);
 }
@@ -103,7 +62,7 @@ std::vector<int> DefaultReferences(const CCarnet& carnet, int stationIndex) {
     return references.empty() ? OfferedReferences(carnet, stationIndex) : references;
 }
 
-V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, int sighting,
+V0Reference PrepareReference(const CCarnet& carnet, const StationPlace& station, int sighting,
                              const V0Settings& settings, std::vector<std::string>& warnings) {
     V0Reference ref;
     ref.index = sighting;
@@ -113,29 +72,23 @@ V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, in
         return ref;
     }
     ref.mat = visee->mat();
-    if (!PlaceOf(carnet, ref.mat, ref.x, ref.y, ref.z) || !station.HasPlace()) {
+    if (!PointPlace(carnet, ref.mat, ref.x, ref.y, ref.z) || !station.HasPlace()) {
         ref.valid = false;
         return ref;
     }
 
-    double ah = visee->ah(), av = visee->av(), di = visee->di(), hp = visee->hp();
-    ReduceToFaceLeft(ah, av);
-    ReduceEccentricSighting(ah, av, di, hp, carnet.findER(sighting, station.index),
-                            carnet.findET(sighting, station.index), carnet.findEV(sighting, station.index),
-                            false);
-    ref.ah = ah;
+    const ReducedSighting reduced = ReduceSighting(carnet, station, sighting, settings.reduction);
+    ref.ah = reduced.ah;
     ref.distance = std::hypot(ref.x - station.x, ref.y - station.y);
     ref.bearing = Bearing(station.x, station.y, ref.x, ref.y);
-
     // A distance and a zenith angle give the horizontal distance to check against the coordinates.
-    const double horizontal = di > 0.0 && IsKnown(av) ? di * SinGrads(av) : 0.0;
-    if (horizontal > 0.0) {
-        ref.measuredDistance = horizontal;
-        CorrectHorizontalDistance(ref.measuredDistance, station.x, station.y, station.z, settings.correction);
-        CheckReference(station, ref, av, hp, settings, warnings);
+    if (IsKnown(reduced.dh)) {
+        ref.measuredDistance = reduced.dh;
+        CheckReference(station, ref, reduced.av, reduced.hp, settings, warnings);
     }
 
-    if (IsKnown(ah)) ref.partialV0 = WrapGrads(ref.bearing - ah); // else dropped, with its remark
+    if (IsKnown(reduced.ah))
+        ref.partialV0 = WrapGrads(ref.bearing - reduced.ah); // else dropped, with its remark
     return ref;
 }
 
@@ -209,8 +162,8 @@ void SolveV0(V0Result& result, const V0Settings& settings) {
     result.computed = true;
 }
 
-V0Result ComputeStationV0(const CCarnet& carnet, const V0Station& station, const std::vector<int>& sightings,
-                          const V0Settings& settings) {
+V0Result ComputeStationV0(const CCarnet& carnet, const StationPlace& station,
+                          const std::vector<int>& sightings, const V0Settings& settings) {
     V0Result result;
     result.station = station;
     result.references.reserve(sightings.size());

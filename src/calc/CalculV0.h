@@ -1,6 +1,7 @@
 #pragma once
 
 #include "calc/Corrections.h"
+#include "calc/SightingReduction.h"
 #include "calc/Tolerances.h"
 #include "core/Undefined.h"
 
@@ -33,32 +34,18 @@ struct V0Reference {
     double residual = kUndefined;         // ei = V0 - V0i
 };
 
-// A station occurrence and its place. The instrument height includes the station's own vertical
-// eccentric offset.
-struct V0Station {
-    int index = -1;
-    std::string name;
-    int reprise = 1;
-    double x = kUndefined;
-    double y = kUndefined;
-    double z = kUndefined;
-    double hi = kUndefined;
-    double previousV0 = kUndefined; // the V0 the GéoBase held before the computation
-
-    bool HasPlace() const { return IsKnown(x) && IsKnown(y); }
-    std::string Designation() const; // "S1(2)"
-};
-
 struct V0Settings {
     bool weighted = true; // "Ponderation": the mean weighted by the distances
     bool forced = false;  // "Forcer l'utilisation des réf. choisies": no reference is dropped
     Tolerances tolerances;
-    DistanceCorrection correction;
+    // Sightings are taken with their target heights and without instrument constants: the orientation
+    // needs only directions, and its checks compare what was measured.
+    SightingReductionOptions reduction;
 };
 
 // The orientation of one station: computed from its references or fixed by hand.
 struct V0Result {
-    V0Station station;
+    StationPlace station; // its V0 is the one the GéoBase held before the computation
     std::vector<V0Reference> references;
     bool computed = false; // a V0 was found (or fixed)
     bool byHand = false;   // fixed by hand: no reference was used
@@ -71,8 +58,6 @@ struct V0Result {
     bool written = false;              // written into the GéoBase's station
 };
 
-// The station occurrence at that index, with its coordinates (unknown when the GéoBase has none).
-V0Station StationAt(const CCarnet& carnet, int stationIndex);
 // The sightings of a station occurrence that can orient it: its references and measured sightings of
 // points whose planimetry is known, in GéoBase order.
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex);
@@ -83,7 +68,7 @@ std::vector<int> DefaultReferences(const CCarnet& carnet, int stationIndex);
 // for its eccentric offsets, its horizontal distance corrected for scale and checked, with the
 // reference's coordinates, against the tolerances of distances and height differences. The warnings of
 // those checks are appended to `warnings`; the reference stays in the computation all the same.
-V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, int sighting,
+V0Reference PrepareReference(const CCarnet& carnet, const StationPlace& station, int sighting,
                              const V0Settings& settings, std::vector<std::string>& warnings);
 
 // The mean of the valid references of `result`, dropping the worst out of tolerance one at a time
@@ -91,8 +76,8 @@ V0Reference PrepareReference(const CCarnet& carnet, const V0Station& station, in
 void SolveV0(V0Result& result, const V0Settings& settings);
 
 // The whole computation of a station from the chosen sightings.
-V0Result ComputeStationV0(const CCarnet& carnet, const V0Station& station, const std::vector<int>& sightings,
-                          const V0Settings& settings);
+V0Result ComputeStationV0(const CCarnet& carnet, const StationPlace& station,
+                          const std::vector<int>& sightings, const V0Settings& settings);
 
 // A V0 brought into [0, 400) and rounded to 6 decimals; a full turn is 0.
 double RoundV0(double v0);

@@ -62,7 +62,7 @@ void WriteSupportPoints(CDlgCfgListing& listing, const V0Result& result) {
                    listing.FormatAlti(z)};
     };
     std::vector<Row> rows{{"", v0::kListMatricule, swap ? "Y" : "X", swap ? "X" : "Y", "Z"}};
-    const V0Station& station = result.station;
+    const StationPlace& station = result.station;
     rows.push_back(row(v0::kListStationRole, station.name, station.x, station.y, station.z));
     std::vector<std::string> listed;
     for (const V0Reference& ref : result.references) {
@@ -88,13 +88,13 @@ void WriteReferences(CDlgCfgListing& listing, const V0Result& result) {
 } // namespace
 
 void WriteV0Result(CDlgCfgListing& listing, const V0Result& result) {
-    const V0Station& station = result.station;
+    const StationPlace& station = result.station;
     DrawFrame(listing, {Sprintf(v0::kListStation, station.name.c_str(), station.reprise)}, true);
     Blank(listing);
     WriteSupportPoints(listing, result);
     Blank(listing);
 
-    const std::string previous = listing.FormatAngl(station.previousV0, -1, true);
+    const std::string previous = listing.FormatAngl(station.v0, -1, true);
     const std::string v0 = listing.FormatAngl(result.v0, -1, true);
     DrawFrame(listing,
               {result.byHand ? Sprintf(v0::kListFixedV0, v0.c_str())

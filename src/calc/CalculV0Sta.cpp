@@ -44,7 +44,7 @@ void CCalculV0Sta::LoadSettings() {
     m_type = static_cast<V0CalculationType>(type);
     m_settings.weighted = weighted != 0;
     m_settings.tolerances = Tolerances::FromOptions(path);
-    m_settings.correction = DistanceCorrection::FromOptions(path);
+    m_settings.reduction.correction = DistanceCorrection::FromOptions(path);
 }
 
 void CCalculV0Sta::WriteSettings() {
@@ -105,7 +105,7 @@ bool CCalculV0Sta::Open(ui::FrontEnd& frontEnd) {
         frontEnd.MessageBox(Sprintf(v0::kMsgNoStation, path.c_str()), ui::kCaption, ui::kIconWarning);
         return false;
     }
-    if (const std::string why = m_settings.correction.ProjectionError(); !why.empty())
+    if (const std::string why = m_settings.reduction.correction.ProjectionError(); !why.empty())
         frontEnd.MessageBox(why, ui::kCaption, ui::kIconWarning);
     m_journal = std::make_unique<CJournal>(path, kJournalStationV0);
     return ChooseStationAt(first);
@@ -129,7 +129,7 @@ bool CCalculV0Sta::ChooseStation(std::string_view designation) {
 
 bool CCalculV0Sta::ChooseStationAt(int stationIndex) {
     if (m_carnet.GetType(stationIndex) != kKindStation) return false;
-    m_station = StationAt(m_carnet, stationIndex);
+    m_station = StationPlaceAt(m_carnet, stationIndex);
     m_typedPlace = false;
     m_offered.clear();
     for (int i : OfferedReferences(m_carnet, stationIndex)) {
@@ -251,7 +251,7 @@ int CCalculV0Sta::CalculateList() {
     for (int i = m_carnet.Find(kKindStation, ""); i >= 0; i = m_carnet.Find(kKindStation, "", i + 1)) {
         if (selection && !selection->Contains(m_carnet.GetAt(i)->mat())) continue;
         ++named;
-        const V0Station station = StationAt(m_carnet, i);
+        const StationPlace station = StationPlaceAt(m_carnet, i);
         if (!station.HasPlace()) {
             ++m_notComputable;
             txt.Print(v0::kLineNotComputed, station.Designation().c_str(),
@@ -312,7 +312,7 @@ const V0Result* CCalculV0Sta::StationResult() const {
 
 double CCalculV0Sta::V0() const {
     const V0Result* result = StationResult();
-    return result ? result->v0 : m_station.previousV0;
+    return result ? result->v0 : m_station.v0;
 }
 
 // ---- Writing -------------------------------------------------------------------------------------------

@@ -69,7 +69,7 @@ public:
     // references, the reference sightings chosen. False, with a message, for a station not in the GéoBase.
     bool ChooseStation(std::string_view designation);
     bool ChooseStationAt(int stationIndex);
-    const V0Station& Station() const { return m_station; }
+    const StationPlace& Station() const { return m_station; }
     // Coordinates typed for a station that the GéoBase does not place (Z may be kUndefined). False, with
     // a message, when the GéoBase already places it.
     bool SetStationCoordinates(double x, double y, double z);
@@ -122,7 +122,7 @@ private:
     bool m_settingsLoaded = false;
     V0CalculationType m_type = V0CalculationType::Unique;
 
-    V0Station m_station;
+    StationPlace m_station;
     bool m_typedPlace = false;
     std::vector<Offered> m_offered;
     std::string m_list;

@@ -11,7 +11,7 @@ namespace pyr {
 bool ReduceToFaceLeft(double& ah, double& av) {
     if (av < 200.0 || av > 400.0) return false;
     av = 400.0 - av;
-    if (ah != kUndefined) ah = std::fmod(ah + 200.0, 400.0);
+    if (ah != kUndefined) ah = WrapGrads(ah + 200.0);
     return true;
 }
 
@@ -27,7 +27,7 @@ void ReduceEccentricSighting(double& ah, double& av, double& di, double& hp, dou
             di = std::hypot(horizontal, v);
             // A target exactly over the station (h = 0) is seen across: a quarter turn aside.
             if (ah != kUndefined && (h != 0.0 || et != 0.0))
-                ah = std::fmod(RadiansToGrads(std::atan(et / h)) + ah + 400.0, 400.0);
+                ah = WrapGrads(RadiansToGrads(std::atan(et / h)) + ah);
         }
     }
     if (ev == 0.0) return;

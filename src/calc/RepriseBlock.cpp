@@ -83,9 +83,7 @@ void CRepetitionMean::Add(const CVisee& repetition) {
 
 void CRepetitionMean::WriteInto(CVisee& first) const {
     if (m_ahCount > 0) {
-        double ah = std::fmod(m_ahSum / m_ahCount, 400.0);
-        if (ah < 0.0) ah += 400.0;
-        first.setAH(ah);
+        first.setAH(WrapGrads(m_ahSum / m_ahCount));
     }
     if (m_avCount > 0) {
         first.setHP(m_hp);

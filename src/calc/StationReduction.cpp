@@ -1,6 +1,7 @@
 #include "calc/StationReduction.h"
 
 #include "calc/Corrections.h"
+#include "calc/SightingReduction.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -75,10 +76,7 @@ void CReduction_Station::OnInitDialog() {
     }
     ApplyStoreOptions(path); // the decimals the values computed are kept to
     m_foldVertical = ReadOptionSwitch(path, kSectionCalculations, kKeyFoldVertical);
-    const std::vector<InstrumentOptions> instruments = ReadInstruments(path);
-    const auto number =
-        static_cast<std::size_t>(ReadOptionInt(path, kSectionCalculations, kKeyDefaultInstrument));
-    m_defaultInstrument = instruments[number < instruments.size() ? number : 0];
+    m_defaultInstrument = DefaultInstrument(path);
     m_changed = false;
 }
 
@@ -191,17 +189,14 @@ void CReduction_Station::IntegrateInstrumentCorrections() {
     if (!m_carnet) return;
     for (int station = NextStation(0); station >= 0;) {
         const int next = NextStation(station + 1);
-        const CAppareil* instrument = m_carnet->findAppAt(station);
-        const double collimation =
-            instrument ? instrument->collVerticale() : m_defaultInstrument.verticalCollimation;
-        const double prism = instrument ? instrument->constPrisme() : m_defaultInstrument.prismConstant;
+        const InstrumentConstants constants = InstrumentConstantsAt(*m_carnet, station, m_defaultInstrument);
         const int end = next < 0 ? m_carnet->GetSize() : next;
         for (int i = station + 1; i < end; ++i) {
             if (!IsSightingAt(i)) continue;
             CVisee& sighting = SightingAt(i);
-            StoreSighting(sighting, sighting.ah(),
-                          IsKnown(sighting.av()) ? sighting.av() + collimation : kUndefined,
-                          sighting.di() > 0.0 ? sighting.di() + prism : sighting.di(), sighting.hp());
+            double av = sighting.av(), di = sighting.di();
+            ApplyInstrumentConstants(av, di, constants);
+            StoreSighting(sighting, sighting.ah(), av, di, sighting.hp());
         }
         station = next;
     }

@@ -27,7 +27,6 @@ inline constexpr const char* kReductionWarning =
 inline constexpr const char* kSectionReduction = "Reduction_des_Stations";
 // The calculation options the reduction reads ("Options_Calculs").
 inline constexpr const char* kKeyFoldVertical = "ExcentVertDansAngles";
-inline constexpr const char* kKeyDefaultInstrument = "AppareilParDefaut";
 
 // The seven switches of the dialog, kept in the section "Reduction_des_Stations".
 struct ReductionOptions {

@@ -2,6 +2,7 @@
 // GéoBase was built from (a point at a known horizontal distance and height difference, a second
 // set-up turned by a known angle, raised by a known height) or from a count worked out by hand.
 #include "TestSupport.h"
+#include "calc/GeoLines.h"
 #include "calc/StationReduction.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
@@ -22,29 +23,6 @@ constexpr double kTenthMm = 1e-4; // 0.1 mm
 double Zenith(double h, double v) {
     return RadiansToGrads(std::atan2(h, v));
 }
-
-// A GéoBase written line by line, in field order.
-struct Geo : CCarnet {
-    Geo& Put(std::unique_ptr<CElement> element, int kind) {
-        Add(std::move(element), kind);
-        return *this;
-    }
-    Geo& Sta(const std::string& name, double hi, double v0 = kUndefined) {
-        return Put(std::make_unique<CStation>(name, hi, v0), kKindStation);
-    }
-    Geo& Ref(const std::string& point, double hp, double ah, double av, double di, const char* code = "") {
-        return Put(std::make_unique<CReference>(point, hp, ah, av, di, code), kKindReference);
-    }
-    Geo& Mes(const std::string& point, double hp, double ah, double av, double di, const char* code = "") {
-        return Put(std::make_unique<CMesure>(point, hp, ah, av, di, code), kKindMesure);
-    }
-    Geo& Pt(const std::string& point, double x, double y, double z) {
-        return Put(std::make_unique<CPointGen>(point, x, y, z), kKindPoint);
-    }
-    Geo& Exc(std::string_view word, double metres) {
-        return Put(std::make_unique<CCommande>(std::string(word), FormatShortest(metres)), kKindExcentrement);
-    }
-};
 
 // The sighting at `i`: its point, its direction and zenith angle to 0.1 mgon, its distance to 0.1 mm and
 // its target height.

@@ -38,8 +38,8 @@ struct Job {
         V0Settings settings;
         settings.weighted = weighted;
         settings.forced = forced;
-        settings.correction.linearAlteration = scalePpm;
-        return ComputeStationV0(carnet, StationAt(carnet, station), sightings, settings);
+        settings.reduction.correction.linearAlteration = scalePpm;
+        return ComputeStationV0(carnet, StationPlaceAt(carnet, station), sightings, settings);
     }
     CVisee& Sighting(std::size_t rank) { return *carnet.As<CVisee>(sightings[rank]); }
 };
@@ -171,7 +171,7 @@ TEST(StationV0, ReferencesOfferedAndChosenAtFirst) {
     EXPECT_EQ(OfferedReferences(carnet, s1), (std::vector<int>{a, b}));
     EXPECT_EQ(DefaultReferences(carnet, s1), std::vector<int>{a});
     EXPECT_EQ(DefaultReferences(carnet, s2), std::vector<int>{b2});
-    EXPECT_EQ(StationAt(carnet, s2).Designation(), "S1(2)");
+    EXPECT_EQ(StationPlaceAt(carnet, s2).Designation(), "S1(2)");
 }
 
 } // namespace
