@@ -1,8 +1,8 @@
 #include "calc/CalculV0Listing.h"
 
 #include "calc/CalculV0Texts.h"
+#include "calc/ListingTables.h"
 #include "core/Strings.h"
-#include "core/TextEncoding.h"
 #include "geobase/Elements.h"
 #include "settings/ListingObject.h"
 
@@ -14,45 +14,7 @@ namespace pyr {
 
 namespace {
 
-using Row = std::vector<std::string>;
-
-// A table whose columns are as wide as their widest text; the first row, when `heading`, is the
-// columns' titles. Texts are left-aligned in the first `textColumns` columns, numbers on the right.
-void DrawTable(CDlgCfgListing& listing, const std::vector<Row>& rows, bool heading, std::size_t textColumns,
-               bool bold = false) {
-    if (rows.empty()) return;
-    const std::size_t columns = rows.front().size();
-    listing.rtfInitTab(static_cast<int>(rows.size()), static_cast<int>(columns));
-    for (std::size_t c = 0; c < columns; ++c) {
-        std::size_t width = 1;
-        for (const Row& row : rows)
-            width = std::max(width, Utf8Length(row[c]));
-        listing.rtfSetColWidth(static_cast<int>(c), static_cast<int>(width));
-        if (c >= textColumns) listing.rtfSetCellAlign(-1, static_cast<int>(c), RtfAlign::Right);
-    }
-    for (std::size_t r = 0; r < rows.size(); ++r)
-        for (std::size_t c = 0; c < columns; ++c)
-            listing.rtfSetCellValue(static_cast<int>(r), static_cast<int>(c), rows[r][c]);
-    if (heading) {
-        listing.rtfSetCellStyle(0, -1, kRtfBold);
-        listing.rtfSetCellShading(0, -1, 10);
-        listing.rtfSetCellAlign(0, -1, RtfAlign::Center);
-    }
-    if (bold) listing.rtfSetCellStyle(-1, -1, kRtfBold);
-    listing.rtfDrawTab();
-}
-
-// Lines framed as one column: "| Remarques |".
-void DrawFrame(CDlgCfgListing& listing, const Row& lines, bool bold) {
-    std::vector<Row> rows;
-    for (const std::string& line : lines)
-        rows.push_back({line});
-    DrawTable(listing, rows, false, 1, bold);
-}
-
-void Blank(CDlgCfgListing& listing) {
-    listing.WriteLine("\n");
-}
+using Row = ListingRow;
 
 // The station and each reference point once, X and Y in the surveyor's order.
 void WriteSupportPoints(CDlgCfgListing& listing, const V0Result& result) {

@@ -21,6 +21,7 @@ struct InterSighting {
     // Inputs.
     int index = -1;         // the sighting element in the GéoBase
     std::string station;    // station name; two sightings from one station never make the pair
+    int reprise = 0;        // the station's occurrence (reprise), shown by the listing; 0 when not given
     std::string reference;  // the sighted point's name as the list line shows it
     double xs = kUndefined; // the station point, m
     double ys = kUndefined;
