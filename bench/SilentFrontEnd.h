@@ -18,7 +18,7 @@ public:
     }
     std::optional<std::string> ChooseFile(const ui::FileChoice& choice) override { return choice.startPath; }
     void TextLine(std::string_view) override {}
-    ui::DialogResult DoModal(ui::DialogModel&) override { return ui::DialogResult::Cancel; }
+    ui::DialogResult DoModal(ui::Dialog&) override { return ui::DialogResult::Cancel; }
     void ShowFile(const std::string&) override {}
 
     int messages = 0;

@@ -1,6 +1,8 @@
 #include "calc/CalculV0Sta.h"
 
+#include "calc/CalculV0Listing.h"
 #include "calc/CalculV0Texts.h"
+#include "calc/SessionTexts.h"
 #include "core/Files.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -25,7 +27,8 @@ std::string AngleText(double grads) {
 
 } // namespace
 
-CCalculV0Sta::CCalculV0Sta() = default;
+CCalculV0Sta::CCalculV0Sta()
+    : m_session({kJournalStationV0, session::kQuestionInvariantXY, session::kQuestionInvariantZ}) {}
 CCalculV0Sta::~CCalculV0Sta() = default;
 
 std::string CCalculV0Sta::Caption() const {
@@ -43,8 +46,6 @@ void CCalculV0Sta::LoadSettings() {
     ReadParamInt(path, v0::kSection, v0::kKeyWeighting, 1, 0, 1, weighted);
     m_type = static_cast<V0CalculationType>(type);
     m_settings.weighted = weighted != 0;
-    m_settings.tolerances = Tolerances::FromOptions(path);
-    m_settings.reduction.correction = DistanceCorrection::FromOptions(path);
 }
 
 void CCalculV0Sta::WriteSettings() {
@@ -78,36 +79,18 @@ void CCalculV0Sta::SetWeighted(bool weighted) {
 bool CCalculV0Sta::Open(ui::FrontEnd& frontEnd) {
     m_frontEnd = &frontEnd;
     LoadSettings();
-    ApplyStoreOptions(Inputs().paramPath);
-    // The last GéoBase is offered first; the person may take another.
-    if (!GeoBaseNamed() && !GeoBase().empty()) {
-        auto chosen =
-            frontEnd.ChooseFile({false, v0::kChooseGeoBase, kGeoFileFilter, kGeoFileExtension, GeoBase()});
-        if (!chosen) {
-            m_cancelled = true;
-            return false;
-        }
-        SetGeoBase(*chosen);
-    }
-    const std::string& path = GeoBase();
-    if (path.empty()) {
-        frontEnd.MessageBox(v0::kMsgNoGeoBase, ui::kCaption, ui::kIconWarning);
+    if (!m_session.Open(frontEnd, *this)) {
+        m_cancelled = m_session.Cancelled();
         return false;
     }
-    CPyrTxtWnd txt(frontEnd);
-    if (!m_carnet.Load(&txt, path, {}, 0, &frontEnd)) return false;
-    if (m_carnet.IsEmpty()) {
-        frontEnd.MessageBox(Sprintf(v0::kMsgEmptyGeoBase, path.c_str()), ui::kCaption, ui::kIconWarning);
-        return false;
-    }
-    const int first = m_carnet.Find(kKindStation, "");
+    m_settings.tolerances = m_session.Tolerance();
+    m_settings.reduction.correction = m_session.Reduction().correction;
+    const int first = Carnet().Find(kKindStation, "");
     if (first < 0) {
-        frontEnd.MessageBox(Sprintf(v0::kMsgNoStation, path.c_str()), ui::kCaption, ui::kIconWarning);
+        frontEnd.MessageBox(Sprintf(v0::kMsgNoStation, m_session.Path().c_str()), ui::kCaption,
+                            ui::kIconWarning);
         return false;
     }
-    if (const std::string why = m_settings.reduction.correction.ProjectionError(); !why.empty())
-        frontEnd.MessageBox(why, ui::kCaption, ui::kIconWarning);
-    m_journal = std::make_unique<CJournal>(path, kJournalStationV0);
     return ChooseStationAt(first);
 }
 
@@ -117,7 +100,7 @@ bool CCalculV0Sta::ChooseStation(std::string_view designation) {
     std::string name;
     int reprise = 1;
     const int index =
-        CCarnet::extrStaRep(designation, name, reprise) ? m_carnet.findStaRep(name, reprise) : -1;
+        CCarnet::extrStaRep(designation, name, reprise) ? Carnet().findStaRep(name, reprise) : -1;
     if (index < 0) {
         if (m_frontEnd)
             m_frontEnd->MessageBox(Sprintf(v0::kMsgStationUnknown, std::string(designation).c_str()),
@@ -128,13 +111,13 @@ bool CCalculV0Sta::ChooseStation(std::string_view designation) {
 }
 
 bool CCalculV0Sta::ChooseStationAt(int stationIndex) {
-    if (m_carnet.GetType(stationIndex) != kKindStation) return false;
-    m_station = StationPlaceAt(m_carnet, stationIndex);
+    if (Carnet().GetType(stationIndex) != kKindStation) return false;
+    m_station = StationPlaceAt(Carnet(), stationIndex);
     m_typedPlace = false;
     m_offered.clear();
-    for (int i : OfferedReferences(m_carnet, stationIndex)) {
-        const bool reference = m_carnet.GetType(i) == kKindReference;
-        m_offered.push_back({i, m_carnet.GetAt(i)->mat(), reference, reference});
+    for (int i : OfferedReferences(Carnet(), stationIndex)) {
+        const bool reference = Carnet().GetType(i) == kKindReference;
+        m_offered.push_back({i, Carnet().GetAt(i)->mat(), reference, reference});
     }
     // Without reference sightings, every sighting of a known point is chosen.
     if (std::none_of(m_offered.begin(), m_offered.end(), [](const Offered& o) { return o.reference; }))
@@ -145,7 +128,7 @@ bool CCalculV0Sta::ChooseStationAt(int stationIndex) {
 
 bool CCalculV0Sta::SetStationCoordinates(double x, double y, double z) {
     if (m_station.index < 0) return false;
-    if (m_carnet.hasXY(m_station.name)) {
+    if (Carnet().hasXY(m_station.name)) {
         m_frontEnd->MessageBox(Sprintf(v0::kMsgStationCoordinatesKnown, m_station.name.c_str()), ui::kCaption,
                                ui::kIconWarning);
         return false;
@@ -223,7 +206,7 @@ bool CCalculV0Sta::CalculateStation() {
     std::vector<int> chosen;
     for (const Offered& offered : m_offered)
         if (offered.chosen) chosen.push_back(offered.index);
-    V0Result result = ComputeStationV0(m_carnet, m_station, chosen, m_settings);
+    V0Result result = ComputeStationV0(Carnet(), m_station, chosen, m_settings);
     for (const std::string& warning : result.warnings)
         m_frontEnd->MessageBox(warning, ui::kCaption, ui::kIconWarning);
     if (!result.computed) return false;
@@ -248,17 +231,17 @@ int CCalculV0Sta::CalculateList() {
     CPyrTxtWnd txt(*m_frontEnd);
     int computed = 0, named = 0;
     m_notComputable = 0;
-    for (int i = m_carnet.Find(kKindStation, ""); i >= 0; i = m_carnet.Find(kKindStation, "", i + 1)) {
-        if (selection && !selection->Contains(m_carnet.GetAt(i)->mat())) continue;
+    for (int i = Carnet().Find(kKindStation, ""); i >= 0; i = Carnet().Find(kKindStation, "", i + 1)) {
+        if (selection && !selection->Contains(Carnet().GetAt(i)->mat())) continue;
         ++named;
-        const StationPlace station = StationPlaceAt(m_carnet, i);
+        const StationPlace station = StationPlaceAt(Carnet(), i);
         if (!station.HasPlace()) {
             ++m_notComputable;
             txt.Print(v0::kLineNotComputed, station.Designation().c_str(),
                       Sprintf(v0::kMsgStationWithoutCoordinates, station.name.c_str()).c_str());
             continue;
         }
-        V0Result result = ComputeStationV0(m_carnet, station, DefaultReferences(m_carnet, i), m_settings);
+        V0Result result = ComputeStationV0(Carnet(), station, DefaultReferences(Carnet(), i), m_settings);
         // One station without references does not stop the others: it is counted and named.
         for (const std::string& warning : result.warnings)
             if (warning != v0::kMsgNoValidReference)
@@ -320,33 +303,22 @@ double CCalculV0Sta::V0() const {
 // The coordinates typed for the station become a point of the GéoBase when the person agrees.
 bool CCalculV0Sta::AddTypedStationPoint() {
     const V0Result* result = StationResult();
-    if (!m_typedPlace || !result || !result->written || m_carnet.hasXY(m_station.name)) return false;
+    if (!m_typedPlace || !result || !result->written || Carnet().hasXY(m_station.name)) return false;
     const bool withZ = IsKnown(m_station.z);
     if (m_frontEnd->Ask(Sprintf(v0::kQuestionAddStationPoint, withZ ? 3 : 2), ui::kCaption,
                         ui::Buttons::YesNo, ui::Answer::Yes) != ui::Answer::Yes)
         return false;
-    auto point = std::make_unique<CPointGen>(m_station.name, kUndefined, kUndefined, kUndefined);
-    if (withZ)
-        point->setPt(m_station.x, m_station.y, m_station.z);
-    else
-        point->setPt(m_station.x, m_station.y);
-    const CPointGen kept = *point;
-    if (m_carnet.Add(std::move(point), kKindPoint) < 0) return false;
-    CPyrTxtWnd(*m_frontEnd).Print(v0::kLinePointAdded, m_station.name.c_str());
-    m_journal->AddPoint(kept.mat(), kept.x(), kept.y(), kept.z(), CPointGen::SwapXY());
-    return true;
+    return m_session.WritePoint(m_station.name, m_station.x, m_station.y, m_station.z);
 }
 
 bool CCalculV0Sta::Enregistrer() {
-    if (!m_frontEnd) return false;
+    if (!m_frontEnd || !m_session.IsOpen()) return false;
     int written = 0;
     for (V0Result& result : m_results) {
         if (!result.computed || result.written) continue;
-        auto* station = m_carnet.As<CStation>(result.station.index);
-        if (!station) continue;
-        station->setV0(result.v0);
+        if (!m_session.WriteStationV0(result.station.index, result.station.Designation(), result.v0))
+            continue;
         result.written = true;
-        m_journal->AddStation(result.station.Designation(), result.v0);
         ++written;
     }
     const bool pointAdded = AddTypedStationPoint();
@@ -355,23 +327,28 @@ bool CCalculV0Sta::Enregistrer() {
         txt.PrintText(msg::kNoChange);
         return true;
     }
-    const std::string& path = GeoBase();
-    if (!m_carnet.BackUp(m_frontEnd) || !m_carnet.Save(path, m_frontEnd, false)) return false;
-    m_written = true;
-    WriteLastGeoBase(Inputs().paramPath, WholePath(path));
+    if (!m_session.Save()) return false;
     txt.Print(v0::kLineWritten, written);
-    txt.Print(msg::kSaved, path.c_str());
     return true;
 }
 
-std::string CCalculV0Sta::Close(bool saved) {
+std::string CCalculV0Sta::Close(bool saved, bool listingAsked, std::string listingPath) {
     if (saved) WriteSettings();
-    std::string listing = WriteListing();
-    // A journal that cannot be completed is told to the front end as a failure of the command; the
-    // GéoBase, already saved, stands.
-    if (m_written && m_journal && m_frontEnd && JournalWanted(Inputs().paramPath))
-        m_journal->Append(*m_frontEnd);
-    return listing;
+    std::vector<const V0Result*> results;
+    for (const V0Result& result : m_results)
+        if (result.computed) results.push_back(&result);
+    ListingRequest request;
+    request.kind = ListingKind::StationV0;
+    request.resultCount = results.size();
+    request.writeResult = [&results](CDlgCfgListing& listing, std::size_t i) {
+        WriteV0Result(listing, *results[i]);
+    };
+    request.writeTolerances = [this](CDlgCfgListing& listing) {
+        WriteV0Tolerances(listing, m_settings.tolerances, m_settings.weighted, m_settings.forced);
+    };
+    request.ask = !listingAsked;
+    request.path = std::move(listingPath);
+    return m_session.Close(std::move(request));
 }
 
 } // namespace pyr

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "calc/CalculV0.h"
+#include "calc/ComputationSession.h"
 #include "geobase/Carnet.h"
 #include "settings/Journal.h"
 #include "ui/DialogModel.h"
@@ -41,20 +42,21 @@ public:
     ~CCalculV0Sta() override;
 
     std::string Caption() const override;
-    void DeclareOptions(ui::DialogOptions& options) override;
-    ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
 
     // ---- Opening and closing
     // Offers the GéoBase (the last one used) to be confirmed or changed, loads it, reads the options and
     // shows the first station. False, a message having said why, when there is nothing to orient, or when
     // the person chose no GéoBase.
     bool Open(ui::FrontEnd& frontEnd);
+    // Whether the person chose no GéoBase at Open.
+    bool Cancelled() const { return m_cancelled; }
     // Closes the dialog, after "&Enregistrer" (`saved`) or "Annuler": with results, the listing is
-    // offered (or written at once when it was asked for); after "&Enregistrer", the settings of the
-    // dialog are kept and the journal receives the stations written. A listing, a journal or settings
-    // that cannot be written are told to the front end (the file and why) as failures of the command;
-    // the GéoBase saved stands. Returns the listing's path, or "".
-    std::string Close(bool saved);
+    // offered, or written at once when the person asked for it (`listingAsked`, in `listingPath` when
+    // named in advance); after "&Enregistrer", the settings of the dialog are kept and the journal
+    // receives the stations written. A listing, a journal or settings that cannot be written are told to
+    // the front end (the file and why) as failures of the command; the GéoBase saved stands. Returns the
+    // listing's path, or "".
+    std::string Close(bool saved, bool listingAsked = false, std::string listingPath = {});
 
     // ---- Settings of the dialog ("Calcul_V0"), read when it opens
     V0CalculationType Type();
@@ -102,7 +104,7 @@ public:
     double V0() const;
     // Stations of the last computation of a list (or of all) that could not be oriented.
     int NotComputable() const { return m_notComputable; }
-    const CCarnet& Carnet() const { return m_carnet; }
+    const CCarnet& Carnet() const { return m_session.Carnet(); }
 
 private:
     void LoadSettings();
@@ -111,13 +113,12 @@ private:
     void Keep(V0Result result);
     bool CalculateStation();
     int CalculateList();
-    bool ApplyRequests();
     bool AddTypedStationPoint();
-    std::string WriteListing();
+    CCarnet& Carnet() { return m_session.Carnet(); }
 
     ui::FrontEnd* m_frontEnd = nullptr;
     bool m_cancelled = false; // the person did not choose a GéoBase
-    CCarnet m_carnet;
+    CComputationSession m_session;
     V0Settings m_settings;
     bool m_settingsLoaded = false;
     V0CalculationType m_type = V0CalculationType::Unique;
@@ -130,19 +131,6 @@ private:
     std::vector<V0Result> m_results;
     std::unordered_map<int, std::size_t> m_resultOf; // station index to its result
     int m_notComputable = 0;
-    std::unique_ptr<CJournal> m_journal;
-    bool m_written = false;
-
-    // What the command line asked for, applied once the GéoBase is open.
-    struct Requests {
-        std::optional<std::string> station;
-        std::optional<std::string> references;
-        std::optional<double> x, y, z;
-        std::optional<double> v0;
-        bool save = false;
-        bool listing = false;
-        std::string listingPath;
-    } m_requests;
 };
 
 } // namespace pyr

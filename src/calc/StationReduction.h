@@ -3,7 +3,7 @@
 #include "calc/RepriseBlock.h"
 #include "settings/CalcOptions.h"
 #include "settings/OptionInstruments.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <array>
 #include <optional>
@@ -50,7 +50,7 @@ struct ReductionSwitch {
 std::span<const ReductionSwitch> ReductionSwitches();
 
 // The dialog "Réduction des stations", opened by the GéoBase editor on the GéoBase it holds.
-class CReduction_Station : public ui::DialogModel {
+class CReduction_Station : public ui::Dialog {
 public:
     explicit CReduction_Station(CCarnet* carnet = nullptr) : m_carnet(carnet) {}
     void SetCarnet(CCarnet* carnet) { m_carnet = carnet; }

@@ -3,7 +3,7 @@
 #include "calc/StationReduction.h"
 #include "fieldbook/FieldBookFormats.h"
 #include "fieldbook/LectCarnet.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <optional>
 #include <string>
@@ -19,7 +19,7 @@ class CPyrTxtWnd;
 // reprises" (here "--reduction") reduces the stations first, and the GéoBase is saved when that changed
 // it. Its menu "&Lecture" (here "--lecture FORMAT CARNET") reads a field book into the open GéoBase, which
 // is then saved; a GéoBase named that does not exist yet is created by the reading.
-class CGeoEditor : public ui::DialogModel {
+class CGeoEditor : public ui::Dialog {
 public:
     void DeclareOptions(ui::DialogOptions& options) override;
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;

@@ -4,7 +4,7 @@
 #include "geobase/Carnet.h"
 #include "settings/OptionInstruments.h"
 #include "settings/ParamStore.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <functional>
 #include <memory>

@@ -5,7 +5,7 @@
 #include "fieldbook/ParamDriver.h"
 #include "settings/OptionInstruments.h"
 #include "settings/ParamStore.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <optional>
 #include <string>
@@ -38,7 +38,7 @@ void DeclareReadingOptions(ui::DialogOptions& options, ReadingRequests& requests
 // GéoBase open in the editor), the format's parameter file, the code table and its interpretation, the
 // field instrument. Its OK checks the choices in their order, each failure naming the field the person is
 // sent back to.
-class CLectCarnet : public ui::DialogModel {
+class CLectCarnet : public ui::Dialog {
 public:
     // The fields a failed check sends the person back to.
     enum class Field { None, Carnet, GeoBase, ParamFile, CodeTable };

@@ -2,7 +2,7 @@
 
 #include "fieldbook/FieldBookFormats.h"
 #include "fieldbook/LectCarnet.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 namespace pyr {
 
@@ -10,7 +10,7 @@ namespace pyr {
 // field book of its format into a new GéoBase. On a command line the field book is the positional word,
 // "--geobase" the GéoBase to create, and the other options are those of the reading dialog, applied once
 // the dialog holds the values of the settings.
-class CFieldBookCommand : public ui::DialogModel {
+class CFieldBookCommand : public ui::Dialog {
 public:
     explicit CFieldBookCommand(FieldBookFormat format) : m_format(format) {}
 

@@ -20,7 +20,7 @@ ui::DialogResult RunCommandDialog(const char* title, const DialogFactory& makeDi
     ui::SetApplicationFrontEnd(parent);
     ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
 
-    std::unique_ptr<ui::DialogModel> dialog = makeDialog();
+    std::unique_ptr<ui::Dialog> dialog = makeDialog();
     const std::string paramPath = services->GetParamFilePath();
     dialog->SetInputs({ReadLastGeoBase(paramPath), paramPath, services->GetConfigFolder(), caption});
     const ui::DialogResult result = frontEnd.DoModal(*dialog);

@@ -1,13 +1,13 @@
 #pragma once
 
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <functional>
 #include <memory>
 
 namespace pyr::host {
 
-using DialogFactory = std::function<std::unique_ptr<ui::DialogModel>()>;
+using DialogFactory = std::function<std::unique_ptr<ui::Dialog>()>;
 
 // The flow that every command follows around its dialog: the title goes to the main services, the
 // command context is opened, the dialog is built and handed the last GéoBase, the current parameter

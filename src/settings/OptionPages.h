@@ -2,7 +2,7 @@
 
 #include "settings/CalcOptions.h"
 #include "settings/OptionInstruments.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <array>
 #include <string>
@@ -152,7 +152,7 @@ public:
 // from a person; a refused value stops the command before anything is written. Run writes only the keys
 // so set, each as OK writes it, and says so in the text window; "--afficher", or no option at all, lists
 // every section and key with its value in the text window.
-class COptionPSheet : public ui::DialogModel {
+class COptionPSheet : public ui::Dialog {
 public:
     std::string Caption() const override;
     void DeclareOptions(ui::DialogOptions& options) override;

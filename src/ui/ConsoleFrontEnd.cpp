@@ -228,7 +228,7 @@ void ConsoleFrontEnd::SetCommand(std::string name, std::vector<std::string> argu
     ResetFailures();
 }
 
-DialogResult ConsoleFrontEnd::DoModal(DialogModel& dialog) {
+DialogResult ConsoleFrontEnd::DoModal(Dialog& dialog) {
     CommandLineOutcome outcome = ApplyCommandLine(dialog, m_command, m_arguments);
     DialogResult result = DialogResult::Failed;
     int status = 0;

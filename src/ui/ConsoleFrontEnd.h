@@ -60,7 +60,7 @@ public:
                int icon = kIconQuestion) override;
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override;
-    DialogResult DoModal(DialogModel& dialog) override;
+    DialogResult DoModal(Dialog& dialog) override;
     void ShowFile(const std::string& path) override;
 
 private:

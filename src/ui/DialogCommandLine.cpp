@@ -39,7 +39,7 @@ bool IsSwitch(const Option& option) {
 }
 
 // The options of a dialog: the common ones first, then its own.
-DialogOptions AllOptions(DialogModel& dialog) {
+DialogOptions AllOptions(Dialog& dialog) {
     DialogOptions options;
     const std::string help = dialog.GeoBaseHelp();
     options.Value(std::string(kGeoBaseName), std::string(kGeoBaseValue),
@@ -118,7 +118,7 @@ std::optional<CommandLineOutcome> CheckValues(const DialogOptions& options, std:
 
 } // namespace
 
-CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view command,
+CommandLineOutcome ApplyCommandLine(Dialog& dialog, std::string_view command,
                                     const std::vector<std::string>& arguments) {
     if (std::any_of(arguments.begin(), std::find(arguments.begin(), arguments.end(), "--"), IsHelpWord))
         return {CommandLineOutcome::Kind::Help, DialogHelp(dialog, command)};
@@ -209,7 +209,7 @@ CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view comman
     return {};
 }
 
-std::string DialogHelp(DialogModel& dialog, std::string_view command) {
+std::string DialogHelp(Dialog& dialog, std::string_view command) {
     const DialogOptions options = AllOptions(dialog);
 
     std::vector<std::pair<std::string, std::string>> entries;

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <string>
 #include <string_view>
@@ -25,10 +25,10 @@ struct CommandLineOutcome {
 
 // `command` is the name the command was called by (for the help and the messages); `arguments` the
 // words after it.
-CommandLineOutcome ApplyCommandLine(DialogModel& dialog, std::string_view command,
+CommandLineOutcome ApplyCommandLine(Dialog& dialog, std::string_view command,
                                     const std::vector<std::string>& arguments);
 
 // The French help of a command: its name, the dialog's title, every option with its value and its line.
-std::string DialogHelp(DialogModel& dialog, std::string_view command);
+std::string DialogHelp(Dialog& dialog, std::string_view command);
 
 } // namespace pyr::ui

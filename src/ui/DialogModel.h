@@ -2,73 +2,19 @@
 
 #include <functional>
 #include <string>
-#include <string_view>
+#include <utility>
 #include <vector>
 
-// A dialog as a model: its state, its rules and its actions, without any widget. A front end shows it
-// and forwards a person's actions; a front end without widgets (the command line, the tests) drives it
-// through the options it declares.
+// A dialog as a model: its state, its rules and its actions, without any widget and without any command
+// line. A front end shows it and forwards a person's actions; it listens to the model's change notices to
+// show again what changed.
 namespace pyr::ui {
-
-class FrontEnd;
 
 // How a modal dialog ended.
 enum class DialogResult {
     Ok,     // closed with OK: the work is done
     Cancel, // closed without change
     Failed  // refused or failed; a message has said why
-};
-
-// The options by which a dialog's values are set and its actions run from a command line. Each dialog
-// only declares them; one mechanism (DialogCommandLine.h) parses them, applies them in the order they
-// were given and writes the help.
-class DialogOptions {
-public:
-    // Applies an option: an empty text when accepted, else the French reason of the refusal (shown
-    // to the person, and the dialog is not run).
-    using Apply = std::function<std::string(const std::string& value)>;
-    // The same for an option that takes several values, given in their order.
-    using ApplyValues = std::function<std::string(const std::vector<std::string>& values)>;
-
-    struct Option {
-        std::string name;      // long name without its dashes: "geobase"
-        std::string valueName; // the value's name in the help ("FICHIER"); empty for a switch
-        std::string help;      // one line of French
-        bool repeatable = false;
-        Apply apply;             // a switch, and an optional value not given, get an empty value
-        bool optional = false;   // the value may be left out: "--listing" or "--listing FICHIER"
-        int count = 1;           // the number of values of a value option: "--lecture FORMAT CARNET" has 2
-        ApplyValues applyValues; // for an option of several values, instead of `apply`
-    };
-
-    // A word of the command line that is no option: "pyralis LecWild CARNET". Words are given to the
-    // positional arguments in the order they are declared; each may be left out.
-    struct PositionalArgument {
-        std::string valueName; // "CARNET"
-        std::string help;
-        Apply apply;
-    };
-
-    // "--name VALUE".
-    void Value(std::string name, std::string valueName, std::string help, Apply apply,
-               bool repeatable = false);
-    // "--name": a switch or an action.
-    void Switch(std::string name, std::string help, std::function<std::string()> action);
-    // "--name [VALUE]": an action that may be given a value (the value is empty when it is left out).
-    void OptionalValue(std::string name, std::string valueName, std::string help, Apply apply);
-    // "--name 0|1": a check box of the dialog; any other value is refused.
-    void ZeroOrOne(std::string name, std::string help, std::function<void(bool)> set);
-    // "--name VALUE1 VALUE2 ...": an option that takes several values, one name for each.
-    void Values(std::string name, std::vector<std::string> valueNames, std::string help, ApplyValues apply);
-    // "VALUE": the next word of the command line that is no option.
-    void Positional(std::string valueName, std::string help, Apply apply);
-
-    const std::vector<Option>& Options() const { return m_options; }
-    const std::vector<PositionalArgument>& Positionals() const { return m_positionals; }
-
-private:
-    std::vector<Option> m_options;
-    std::vector<PositionalArgument> m_positionals;
 };
 
 // What every command hands to its dialog before it opens (the last GéoBase, the current parameter
@@ -82,6 +28,9 @@ struct CommandInputs {
 
 class DialogModel {
 public:
+    // A change notice: the parts of the dialog that changed, as bits the model defines.
+    using Listener = std::function<void(int parts)>;
+
     virtual ~DialogModel() = default;
 
     void SetInputs(CommandInputs inputs) { m_inputs = std::move(inputs); }
@@ -98,18 +47,27 @@ public:
 
     // The caption of the dialog's window.
     virtual std::string Caption() const { return m_inputs.title; }
-    // The help line of "--geobase" when the GéoBase means something else to the dialog (one to create);
-    // "" for the common one.
-    virtual std::string GeoBaseHelp() const { return {}; }
-    // The dialog's own options; "--geobase" is common to every dialog and declared by the mechanism.
-    virtual void DeclareOptions(DialogOptions&) {}
-    // Runs the dialog with the person at the front end, after the options were applied: what the dialog
-    // does until it is closed.
-    virtual DialogResult Run(FrontEnd& frontEnd) = 0;
+
+    // Calls `listener` after every change of the model, with the parts changed. Returns its number.
+    int Listen(Listener listener) {
+        m_listeners.emplace_back(++m_lastListener, std::move(listener));
+        return m_lastListener;
+    }
+    void StopListening(int number) {
+        std::erase_if(m_listeners, [number](const auto& entry) { return entry.first == number; });
+    }
+
+protected:
+    void Notify(int parts) const {
+        for (const auto& [number, listener] : m_listeners)
+            listener(parts);
+    }
 
 private:
     CommandInputs m_inputs;
     bool m_geoBaseNamed = false;
+    std::vector<std::pair<int, Listener>> m_listeners;
+    int m_lastListener = 0;
 };
 
 } // namespace pyr::ui

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include <optional>
 #include <string>
@@ -46,7 +46,7 @@ public:
     virtual void TextLine(std::string_view line) = 0;
     // Runs a dialog modally, as every command does with its dialog: the front end gives it what the
     // person asked for (its options, on a command line) and runs it until it is closed.
-    virtual DialogResult DoModal(DialogModel& dialog) = 0;
+    virtual DialogResult DoModal(Dialog& dialog) = 0;
     // Shows a file to the person (a listing once written, a file they asked to see) in the platform's
     // viewer.
     virtual void ShowFile(const std::string& path) = 0;

@@ -27,7 +27,7 @@ std::optional<std::string> ScriptedFrontEnd::ChooseFile(const FileChoice& choice
     return file;
 }
 
-DialogResult ScriptedFrontEnd::DoModal(DialogModel& dialog) {
+DialogResult ScriptedFrontEnd::DoModal(Dialog& dialog) {
     dialogs.push_back(dialog.Caption());
     // The slot is taken now so that a dialog opened from this one records its result after it.
     std::size_t slot = results.size();

@@ -42,7 +42,7 @@ public:
                int icon = kIconQuestion) override;
     std::optional<std::string> ChooseFile(const FileChoice& choice) override;
     void TextLine(std::string_view line) override { lines.emplace_back(line); }
-    DialogResult DoModal(DialogModel& dialog) override;
+    DialogResult DoModal(Dialog& dialog) override;
     void ShowFile(const std::string& path) override { shownFiles.push_back(path); }
 
     // All text-window lines joined with '\n', for searching in a test.

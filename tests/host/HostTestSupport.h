@@ -6,7 +6,7 @@
 #include "host/HostTexts.h"
 #include "host/Services.h"
 #include "hostrt/HostRuntime.h"
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 #include "ui/ScriptedFrontEnd.h"
 
 #include <filesystem>
@@ -93,7 +93,7 @@ public:
     std::vector<Seen> seen;
     std::string layerSetByDialog; // a dialog that changes the current layer, when not empty
 
-    pyr::ui::DialogResult DoModal(pyr::ui::DialogModel& dialog) override {
+    pyr::ui::DialogResult DoModal(pyr::ui::Dialog& dialog) override {
         pyr::ui::DialogResult result = ScriptedFrontEnd::DoModal(dialog);
         Seen now{dialog.Inputs().title,
                  dialog.GeoBase(),

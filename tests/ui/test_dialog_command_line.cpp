@@ -16,7 +16,7 @@ using Words = std::vector<std::string>;
 namespace {
 
 // Records each option applied with the GéoBase current at that moment; the point "P99" is refused.
-struct SightingDialog : ui::DialogModel {
+struct SightingDialog : ui::Dialog {
     Words applied;
     DialogResult runResult = DialogResult::Ok;
 

@@ -13,7 +13,7 @@ using Words = std::vector<std::string>;
 namespace {
 
 // Records what it is given; the field book "refuse.txt" is refused.
-struct ReadingDialog : ui::DialogModel {
+struct ReadingDialog : ui::Dialog {
     Words applied;
 
     ReadingDialog() { SetInputs({"derniere.geo", "p.ini", "/opt/", "lecture d'un carnet"}); }

@@ -1,7 +1,5 @@
-// The dialog of the orientation of stations run from a command line: its options, and the run that
-// opens the GéoBase, applies what was asked, computes, writes and closes.
-#include "calc/CalculV0Listing.h"
-#include "calc/CalculV0Sta.h"
+#include "calc/CalculV0Driver.h"
+
 #include "calc/CalculV0Texts.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -41,7 +39,7 @@ std::string ReadNumber(const char* option, const std::string& text, std::optiona
 
 } // namespace
 
-void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
+void CCalculV0Driver::DeclareOptions(ui::DialogOptions& options) {
     using Type = V0CalculationType;
     options.Value("type", "unique|liste|toutes", kHelpType, [this](const std::string& word) {
         const struct {
@@ -50,7 +48,7 @@ void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
         } types[] = {{"unique", Type::Unique}, {"liste", Type::Liste}, {"toutes", Type::Toutes}};
         for (const auto& [name, type] : types)
             if (EqualIgnoringCase(word, name)) {
-                SetType(type);
+                m_requests.type = type;
                 return std::string();
             }
         return Sprintf(v0::kBadType, word.c_str());
@@ -61,7 +59,7 @@ void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
         if (!CCarnet::extrStaRep(designation, name, reprise) || name.empty())
             return Sprintf(v0::kBadStation, designation.c_str());
         m_requests.station = designation;
-        SetType(Type::Unique);
+        m_requests.type = Type::Unique;
         return std::string();
     });
     options.Value("references", "SELECTION", kHelpReferences, [this](const std::string& selection) {
@@ -77,22 +75,23 @@ void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
     for (const auto& [name, valueName, value] : coordinates)
         options.Value(name, valueName, valueName + std::string(kHelpCoordinate),
                       [this, name = name, value = value](const std::string& text) {
-                          SetType(Type::Unique);
+                          m_requests.type = Type::Unique;
                           return ReadNumber(name, text, *value);
                       });
     options.Value("liste", "SELECTION", kHelpList, [this](const std::string& selection) {
         if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
-        m_list = selection;
-        SetType(Type::Liste);
+        m_requests.list = selection;
+        m_requests.type = Type::Liste;
         return std::string();
     });
-    options.ZeroOrOne("ponderation", kHelpWeighting, [this](bool weighted) { SetWeighted(weighted); });
+    options.ZeroOrOne("ponderation", kHelpWeighting,
+                      [this](bool weighted) { m_requests.weighted = weighted; });
     options.Switch("forcer", kHelpForce, [this] {
-        SetForced(true);
+        m_requests.forced = true;
         return std::string();
     });
     options.Value("v0", "VALEUR", kHelpV0, [this](const std::string& text) {
-        SetType(Type::Unique);
+        m_requests.type = Type::Unique;
         return ReadNumber("v0", text, m_requests.v0);
     });
     options.Switch("enregistrer", kHelpSave, [this] {
@@ -106,48 +105,35 @@ void CCalculV0Sta::DeclareOptions(ui::DialogOptions& options) {
     });
 }
 
-bool CCalculV0Sta::ApplyRequests() {
-    if (m_requests.station && !ChooseStation(*m_requests.station)) return false;
+bool CCalculV0Driver::ApplyRequests(ui::FrontEnd& frontEnd) {
+    CCalculV0Sta& v0 = m_model;
+    if (m_requests.station && !v0.ChooseStation(*m_requests.station)) return false;
     if ((m_requests.x || m_requests.y || m_requests.z) &&
-        !SetStationCoordinates(m_requests.x.value_or(kUndefined), m_requests.y.value_or(kUndefined),
-                               m_requests.z.value_or(kUndefined)))
+        !v0.SetStationCoordinates(m_requests.x.value_or(kUndefined), m_requests.y.value_or(kUndefined),
+                                  m_requests.z.value_or(kUndefined)))
         return false;
-    if (m_requests.references && !ChooseReferences(*m_requests.references)) return false;
-    if (m_requests.v0 && Type() != V0CalculationType::Unique) {
-        m_frontEnd->MessageBox(v0::kMsgHandV0OnlyUnique, ui::kCaption, ui::kIconWarning);
+    if (m_requests.references && !v0.ChooseReferences(*m_requests.references)) return false;
+    if (m_requests.v0 && v0.Type() != V0CalculationType::Unique) {
+        frontEnd.MessageBox(v0::kMsgHandV0OnlyUnique, ui::kCaption, ui::kIconWarning);
         return false;
     }
     return true;
 }
 
-ui::DialogResult CCalculV0Sta::Run(ui::FrontEnd& frontEnd) {
-    if (!Open(frontEnd)) return m_cancelled ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
-    if (!ApplyRequests()) return ui::DialogResult::Failed;
-    const bool done = m_requests.v0 ? EnterV0(*m_requests.v0) : Calculate();
-    const bool saved = done && m_requests.save && Enregistrer();
-    Close(saved);
+ui::DialogResult CCalculV0Driver::Run(ui::FrontEnd& frontEnd) {
+    CCalculV0Sta& v0 = m_model;
+    v0.SetInputs(Inputs());
+    if (GeoBaseNamed()) v0.SetGeoBase(GeoBase());
+    if (m_requests.type) v0.SetType(*m_requests.type);
+    if (m_requests.weighted) v0.SetWeighted(*m_requests.weighted);
+    if (m_requests.forced) v0.SetForced(true);
+    if (m_requests.list) v0.SetList(*m_requests.list);
+    if (!v0.Open(frontEnd)) return v0.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
+    if (!ApplyRequests(frontEnd)) return ui::DialogResult::Failed;
+    const bool done = m_requests.v0 ? v0.EnterV0(*m_requests.v0) : v0.Calculate();
+    const bool saved = done && m_requests.save && v0.Enregistrer();
+    v0.Close(saved, m_requests.listing, m_requests.listingPath);
     return done && (saved || !m_requests.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
-}
-
-std::string CCalculV0Sta::WriteListing() {
-    std::vector<const V0Result*> results;
-    for (const V0Result& result : m_results)
-        if (result.computed) results.push_back(&result);
-    if (results.empty() || !m_frontEnd) return {};
-    ListingRequest request;
-    request.paramPath = Inputs().paramPath;
-    request.geobasePath = GeoBase();
-    request.kind = ListingKind::StationV0;
-    request.resultCount = results.size();
-    request.writeResult = [&results](CDlgCfgListing& listing, std::size_t i) {
-        WriteV0Result(listing, *results[i]);
-    };
-    request.writeTolerances = [this](CDlgCfgListing& listing) {
-        WriteV0Tolerances(listing, m_settings.tolerances, m_settings.weighted, m_settings.forced);
-    };
-    request.ask = !m_requests.listing;
-    request.path = m_requests.listingPath;
-    return WriteComputationListing(*m_frontEnd, request);
 }
 
 } // namespace pyr

@@ -1,4 +1,4 @@
-#include "ui/DialogModel.h"
+#include "ui/Dialog.h"
 
 #include "core/Strings.h"
 
