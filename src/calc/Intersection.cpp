@@ -1,6 +1,6 @@
 #include "calc/Intersection.h"
 
-#include "calc/Corrections.h"
+#include "calc/SightingReduction.h"
 #include "calc/IntersectionTexts.h"
 #include "calc/Rays.h"
 #include "core/Angles.h"

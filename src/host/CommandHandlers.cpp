@@ -1,6 +1,7 @@
 #include "host/CommandHandlers.h"
 
-#include "calc/CalculV0Sta.h"
+#include "calc/CalcIntersDriver.h"
+#include "calc/CalculV0Driver.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
 #include "fieldbook/ReadingCommand.h"
@@ -18,7 +19,7 @@ namespace pyr::host {
 namespace {
 
 // The dialog of a command that this version does not have yet: it says so.
-class CDlgPending : public ui::DialogModel {
+class CDlgPending : public ui::Dialog {
 public:
     explicit CDlgPending(const CommandEntry& command) : m_command(command) {}
 
@@ -55,7 +56,11 @@ void OnCalcOpt(const CommandEntry& command) {
 }
 
 void OnCalculV0(const CommandEntry& command) {
-    RunCommandDialog(command.title, [] { return std::make_unique<CCalculV0Sta>(); });
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalculV0Driver>(); });
+}
+
+void OnCalInter(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcIntersDriver>(); });
 }
 
 void OnReadFieldBook(const CommandEntry& command) {

@@ -14,6 +14,8 @@ void OnGeoEdit(const CommandEntry& command);
 void OnCalcOpt(const CommandEntry& command);
 // "CalculV0": the orientation of stations.
 void OnCalculV0(const CommandEntry& command);
+// "CalInter": a point by intersection.
+void OnCalInter(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);

@@ -36,7 +36,7 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraESokkia", "ESokkia", "transformation GéoBase -> format Sokkia", OnExport},
     {"PyraGeoEdit", "GeoEdit", "éditeur de GéoBases", OnGeoEdit},
     {"PyraGeoEdit2", "GeoEdit2", "éditeur de GéoBases", OnGeoEdit},
-    {"PyraCalInter", "CalInter", "calcul d'un point par intersections de visées", OnPending},
+    {"PyraCalInter", "CalInter", "calcul d'un point par intersections de visées", OnCalInter},
     {"PyraCalRelev", "CalRelev", "calcul d'un point par relèvement", OnPending},
     {"PyraCalRecou", "CalRecou", "calcul d'un point par recoupement", OnPending},
     {"PyraCalExcen", "CalExcen", "calcul d'une station excentrée", OnPending},

@@ -1,0 +1,313 @@
+#include "calc/CalcInters.h"
+
+#include "calc/IntersectionListing.h"
+#include "calc/IntersectionTexts.h"
+#include "calc/SessionTexts.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/Selection.h"
+#include "settings/CalcOptions.h"
+#include "settings/ParamStore.h"
+#include "ui/FrontEnd.h"
+
+#include <algorithm>
+#include <unordered_set>
+
+namespace pyr {
+
+namespace {
+// The calculation option by which the intersection takes the target heights and vertical offsets.
+constexpr const char* kKeyTargetHeights = "IntersAvecHp";
+} // namespace
+
+CCalcInters::CCalcInters()
+    : m_session({kJournalIntersection, session::kQuestionInvariantXY, session::kQuestionInvariantZ}) {}
+
+std::string CCalcInters::Caption() const {
+    return m_point.empty() ? Inputs().title : Sprintf(inters::kCaption, m_point.c_str());
+}
+
+// ---- Opening and closing --------------------------------------------------------------------------------
+
+bool CCalcInters::Open(ui::FrontEnd& frontEnd) {
+    m_frontEnd = &frontEnd;
+    const std::string_view path = Inputs().paramPath;
+    int plani = 1, alti = 1;
+    ReadParamInt(path, inters::kSection, inters::kKeyPlani, 1, 0, 1, plani);
+    ReadParamInt(path, inters::kSection, inters::kKeyAlti, 1, 0, 1, alti);
+    m_plani = plani != 0, m_alti = alti != 0;
+    if (!m_session.Open(frontEnd, *this)) return false;
+    SightingReductionOptions& reduction = m_session.Reduction();
+    reduction.instrumentConstants = true;
+    reduction.targetHeights =
+        ReadOptionSwitch(m_session.ParamPath(), kSectionCalculations, kKeyTargetHeights);
+    FindPoints();
+    if (m_points.empty()) {
+        frontEnd.MessageBox(Sprintf(inters::kMsgNoPoint, m_session.Path().c_str()), ui::kCaption,
+                            ui::kIconWarning);
+        return false;
+    }
+    Notify(kPartPoints | kPartSwitches);
+    return true;
+}
+
+std::string CCalcInters::Close(bool listingAsked, std::string listingPath) {
+    if (!m_frontEnd) return {};
+    WriteParamInt(Inputs().paramPath, inters::kSection, inters::kKeyPlani, m_plani ? 1 : 0);
+    WriteParamInt(Inputs().paramPath, inters::kSection, inters::kKeyAlti, m_alti ? 1 : 0);
+    m_session.OfferSave();
+    ListingRequest request;
+    request.kind = ListingKind::Intersection;
+    request.resultCount = m_results.size();
+    request.writeResult = [this](CDlgCfgListing& listing, std::size_t i) {
+        WriteIntersectionResult(listing, m_results[i]);
+    };
+    request.ask = !listingAsked;
+    request.path = std::move(listingPath);
+    return m_session.Close(std::move(request));
+}
+
+// ---- Switches -------------------------------------------------------------------------------------------
+
+void CCalcInters::SetPlani(bool on) {
+    m_plani = on;
+    Notify(kPartSwitches);
+    Recompute();
+}
+
+void CCalcInters::SetAlti(bool on) {
+    m_alti = on;
+    Notify(kPartSwitches);
+    Recompute();
+}
+
+// ---- The combo and the lists ----------------------------------------------------------------------------
+
+const StationPlace& CCalcInters::PlaceOf(int station) {
+    auto found = m_places.find(station);
+    if (found == m_places.end())
+        found = m_places.emplace(station, StationPlaceAt(m_session.Carnet(), station)).first;
+    return found->second;
+}
+
+// Points measured from at least one station whose place and orientation are known, in the order they
+// were first sighted.
+void CCalcInters::FindPoints() {
+    const CCarnet& carnet = m_session.Carnet();
+    m_points.clear();
+    std::unordered_set<std::string> seen;
+    std::string name;
+    for (int i = carnet.Find(kKindMesure, ""); i >= 0; i = carnet.Find(kKindMesure, "", i + 1)) {
+        std::string mat = carnet.matAt(i);
+        if (mat.empty() || seen.count(mat)) continue;
+        const int station = carnet.findRepAt(i, name);
+        if (station < 0) continue;
+        const StationPlace& place = PlaceOf(station);
+        if (!place.HasPlace() || !place.IsOriented()) continue;
+        seen.insert(mat);
+        m_points.push_back(std::move(mat));
+    }
+}
+
+bool CCalcInters::ChoosePoint(std::string_view mat) {
+    if (std::find(m_points.begin(), m_points.end(), mat) == m_points.end()) {
+        if (m_frontEnd)
+            m_frontEnd->MessageBox(Sprintf(inters::kMsgPointNotOffered, std::string(mat).c_str()),
+                                   ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    const CCarnet& carnet = m_session.Carnet();
+    m_point = mat;
+    m_available.clear();
+    m_selected.clear();
+    m_highAvailable = m_highSelected = -1;
+    std::string name;
+    for (int i = carnet.Find(kKindMesure, mat); i >= 0; i = carnet.Find(kKindMesure, mat, i + 1)) {
+        const int station = carnet.findRepAt(i, name);
+        if (station < 0) continue;
+        const StationPlace& place = PlaceOf(station);
+        if (!place.HasPlace() || !place.IsOriented()) continue;
+        Line line;
+        line.index = i;
+        line.station = station;
+        line.text = Sprintf(inters::kLine, place.Designation().c_str(), m_point.c_str());
+        line.tooltip =
+            Sprintf(inters::kTooltip, carnet.cmdAt(i).c_str(), m_point.c_str(), carnet.parAt(i).c_str());
+        m_available.push_back(std::move(line));
+    }
+    Notify(kPartLists | kPartCaption);
+    Recompute();
+    return true;
+}
+
+void CCalcInters::HighlightAvailable(int rank) {
+    m_highAvailable = rank >= 0 && rank < static_cast<int>(m_available.size()) ? rank : -1;
+    Notify(kPartLists);
+}
+
+void CCalcInters::HighlightSelected(int rank) {
+    m_highSelected = rank >= 0 && rank < static_cast<int>(m_selected.size()) ? rank : -1;
+    Notify(kPartLists);
+}
+
+void CCalcInters::MoveLine(std::vector<Line>& from, std::vector<Line>& to, int rank) {
+    if (rank < 0 || rank >= static_cast<int>(from.size())) return;
+    to.push_back(std::move(from[static_cast<std::size_t>(rank)]));
+    from.erase(from.begin() + rank);
+}
+
+void CCalcInters::AddOne() {
+    if (!CanAddOne()) return;
+    MoveLine(m_available, m_selected, m_highAvailable);
+    m_highAvailable =
+        m_available.empty() ? -1 : std::min(m_highAvailable, static_cast<int>(m_available.size()) - 1);
+    Notify(kPartLists);
+    Recompute();
+}
+
+void CCalcInters::AddAll() {
+    if (!CanAddAll()) return;
+    for (Line& line : m_available)
+        m_selected.push_back(std::move(line));
+    m_available.clear();
+    m_highAvailable = -1;
+    Notify(kPartLists);
+    Recompute();
+}
+
+void CCalcInters::RemoveOne() {
+    if (!CanRemoveOne()) return;
+    MoveLine(m_selected, m_available, m_highSelected);
+    m_highSelected =
+        m_selected.empty() ? -1 : std::min(m_highSelected, static_cast<int>(m_selected.size()) - 1);
+    Notify(kPartLists);
+    Recompute();
+}
+
+void CCalcInters::RemoveAll() {
+    if (!CanRemoveAll()) return;
+    for (Line& line : m_selected)
+        m_available.push_back(std::move(line));
+    m_selected.clear();
+    m_highSelected = -1;
+    Notify(kPartLists);
+    Recompute();
+}
+
+bool CCalcInters::SelectStations(std::string_view selection) {
+    const std::optional<CSelection> parsed = CSelection::Parse(selection);
+    if (!parsed) return false;
+    const CCarnet& carnet = m_session.Carnet();
+    std::vector<Line> all = std::move(m_selected);
+    all.insert(all.end(), std::make_move_iterator(m_available.begin()),
+               std::make_move_iterator(m_available.end()));
+    std::sort(all.begin(), all.end(), [](const Line& a, const Line& b) { return a.index < b.index; });
+    m_selected.clear();
+    m_available.clear();
+    for (Line& line : all)
+        (parsed->Contains(carnet.matAt(line.station)) ? m_selected : m_available).push_back(std::move(line));
+    m_highAvailable = m_highSelected = -1;
+    Notify(kPartLists);
+    Recompute();
+    return !m_selected.empty();
+}
+
+// ---- Computing ------------------------------------------------------------------------------------------
+
+InterSighting CCalcInters::Gather(const Line& line) {
+    const StationPlace& station = PlaceOf(line.station);
+    const ReducedSighting reduced =
+        ReduceSighting(m_session.Carnet(), station, line.index, m_session.Reduction());
+    InterSighting sighting;
+    sighting.index = line.index;
+    sighting.station = station.name;
+    sighting.reprise = station.reprise;
+    sighting.reference = reduced.mat;
+    sighting.xs = station.x, sighting.ys = station.y, sighting.zs = station.z;
+    sighting.v0 = station.v0;
+    sighting.hi = station.hi;
+    sighting.hp = reduced.hp;
+    sighting.ah = reduced.ah, sighting.av = reduced.av, sighting.di = reduced.di;
+    sighting.dh = reduced.dh;
+    return sighting;
+}
+
+void CCalcInters::Clear() {
+    m_result = InterResult();
+    m_result.mat = m_point;
+}
+
+bool CCalcInters::Computed() const {
+    return (m_result.flags & kInterComputed) != 0 || IsKnown(m_result.z);
+}
+
+void CCalcInters::Recompute() {
+    Clear();
+    if (m_point.empty() || m_selected.empty()) {
+        Notify(kPartResult);
+        return;
+    }
+    for (const Line& line : m_selected)
+        m_result.sightings.push_back(Gather(line));
+    const int flags = ComputeIntersection(m_result, m_plani, m_alti);
+    if ((flags & kInterTooClose) && (flags & kInterComputed) && m_frontEnd)
+        m_frontEnd->MessageBox(inters::kMsgTooClose, ui::kCaption, ui::kIconWarning);
+    if (Computed()) {
+        Keep();
+    } else if (!(flags & (kInterTooFew | kInterParallel)) && m_frontEnd) {
+        m_frontEnd->MessageBox(inters::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
+    }
+    Notify(kPartResult);
+}
+
+// A point computed again replaces its earlier result, in its place.
+void CCalcInters::Keep() {
+    const auto [at, added] = m_resultOf.try_emplace(m_result.mat, m_results.size());
+    if (added)
+        m_results.push_back(m_result);
+    else
+        m_results[at->second] = m_result;
+}
+
+bool CCalcInters::CanWrite() const {
+    return (IsKnown(m_result.x) && IsKnown(m_result.y)) || IsKnown(m_result.z);
+}
+
+bool CCalcInters::CanFinish() const {
+    return m_available.size() + m_selected.size() >= 2;
+}
+
+std::string CCalcInters::Coordinate(double value, int decimals) const {
+    return IsKnown(value) ? Sprintf("%.*f", decimals, value) : std::string();
+}
+
+std::string CCalcInters::XText() const {
+    return Coordinate(m_result.x, CPointGen::DeciXY());
+}
+std::string CCalcInters::YText() const {
+    return Coordinate(m_result.y, CPointGen::DeciXY());
+}
+std::string CCalcInters::EmqXText() const {
+    return Coordinate(m_result.emqX, CPointGen::DeciXY());
+}
+std::string CCalcInters::EmqYText() const {
+    return Coordinate(m_result.emqY, CPointGen::DeciXY());
+}
+std::string CCalcInters::ZText() const {
+    return Coordinate(m_result.z, CPointGen::DeciZ());
+}
+std::string CCalcInters::EmqZText() const {
+    return Coordinate(m_result.emqZ, CPointGen::DeciZ());
+}
+
+// ---- Writing --------------------------------------------------------------------------------------------
+
+bool CCalcInters::WritePoint() {
+    if (!CanWrite() || !m_session.IsOpen()) return false;
+    const bool written = m_session.WritePoint(m_result.mat, m_result.x, m_result.y, m_result.z);
+    m_places.clear(); // a station on the point written is placed by it from now on
+    Notify(kPartResult);
+    return written;
+}
+
+} // namespace pyr

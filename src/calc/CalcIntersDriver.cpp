@@ -1,0 +1,143 @@
+#include "calc/CalcIntersDriver.h"
+
+#include "calc/IntersectionTexts.h"
+#include "core/Strings.h"
+#include "geobase/Elements.h"
+#include "geobase/GeoBaseMessages.h"
+#include "geobase/Selection.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+namespace pyr {
+
+namespace {
+
+constexpr const char* kHelpPoint = "le point à calculer (à répéter : chaque point est calculé à son tour)";
+constexpr const char* kHelpPoints = "tous les points calculables de la sélection (100-150, P1 P7 ...)";
+constexpr const char* kHelpStations = "les stations dont les visées sont prises (par défaut toutes les "
+                                      "stations orientées qui visent le point)";
+constexpr const char* kHelpPlani =
+    "calculer la planimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
+constexpr const char* kHelpAlti = "calculer l'altimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
+constexpr const char* kHelpSave = "écrire chaque point calculé dans la GéoBase et l'enregistrer";
+constexpr const char* kHelpListing = "écrire le listing sans le demander (« Fin + Listing »), dans FICHIER "
+                                     "s'il est donné";
+
+std::string Shown(const std::string& text) {
+    return text.empty() ? std::string("-") : text;
+}
+
+std::string Mgon(double grads) {
+    return IsKnown(grads) ? Sprintf("%.1f", grads * 1000.0) : std::string("-");
+}
+
+std::string Metres(double metres) {
+    return IsKnown(metres) ? Sprintf("%.4f", metres) : std::string("-");
+}
+
+} // namespace
+
+void CCalcIntersDriver::DeclareOptions(ui::DialogOptions& options) {
+    options.Value(
+        "point", "NOM", kHelpPoint,
+        [this](const std::string& mat) {
+            m_requests.points.push_back(mat);
+            return std::string();
+        },
+        true);
+    options.Value("points", "SELECTION", kHelpPoints, [this](const std::string& selection) {
+        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
+        m_requests.selection = selection;
+        return std::string();
+    });
+    options.Value("visees", "LISTE", kHelpStations, [this](const std::string& selection) {
+        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
+        m_requests.stations = selection;
+        return std::string();
+    });
+    options.ZeroOrOne("plani", kHelpPlani, [this](bool on) { m_requests.plani = on; });
+    options.ZeroOrOne("alti", kHelpAlti, [this](bool on) { m_requests.alti = on; });
+    options.Switch("enregistrer", kHelpSave, [this] {
+        m_requests.save = true;
+        return std::string();
+    });
+    options.OptionalValue("listing", "FICHIER", kHelpListing, [this](const std::string& path) {
+        m_requests.listing = true;
+        m_requests.listingPath = path;
+        return std::string();
+    });
+}
+
+// The result as the dialog shows it: the fields, then the residuals of each sighting taken.
+void CCalcIntersDriver::Print(ui::FrontEnd& frontEnd) {
+    CPyrTxtWnd txt(frontEnd);
+    const InterResult& result = m_model.Result();
+    const char* mat = result.mat.c_str();
+    if (!result.status.empty()) txt.Print(inters::kLineStatus, mat, result.status.c_str());
+    if (IsKnown(result.x)) {
+        const bool swap = CPointGen::SwapXY();
+        const std::string x = m_model.XText(), y = m_model.YText();
+        const std::string emqX = Shown(m_model.EmqXText()), emqY = Shown(m_model.EmqYText());
+        txt.Print(inters::kLinePoint, mat, swap ? inters::kLabelY : inters::kLabelX, (swap ? y : x).c_str(),
+                  swap ? inters::kLabelX : inters::kLabelY, (swap ? x : y).c_str(), swap ? "Y" : "X",
+                  (swap ? emqY : emqX).c_str(), swap ? "X" : "Y", (swap ? emqX : emqY).c_str());
+    }
+    if (IsKnown(result.z))
+        txt.Print(inters::kLineAltitude, mat, m_model.ZText().c_str(), Shown(m_model.EmqZText()).c_str(),
+                  result.altitudes);
+    for (const InterSighting& s : result.sightings)
+        txt.Print(inters::kLineSighting, Sprintf("%s(%d)", s.station.c_str(), s.reprise).c_str(),
+                  Mgon(s.v).c_str(), Metres(s.e).c_str(), Mgon(s.vz).c_str(), Metres(s.ez).c_str());
+}
+
+bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& mat) {
+    if (!m_model.ChoosePoint(mat)) return false;
+    if (m_requests.stations) {
+        if (!m_model.SelectStations(*m_requests.stations)) {
+            frontEnd.MessageBox(
+                Sprintf(inters::kMsgNoSightingKept, mat.c_str(), m_requests.stations->c_str()), ui::kCaption,
+                ui::kIconWarning);
+            return false;
+        }
+    } else {
+        m_model.AddAll();
+    }
+    Print(frontEnd);
+    if (!m_model.Computed()) return false;
+    return !m_requests.save || m_model.WritePoint();
+}
+
+ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
+    m_model.SetInputs(Inputs());
+    if (GeoBaseNamed()) m_model.SetGeoBase(GeoBase());
+    if (!m_model.Open(frontEnd))
+        return m_model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
+    if (m_requests.plani) m_model.SetPlani(*m_requests.plani);
+    if (m_requests.alti) m_model.SetAlti(*m_requests.alti);
+
+    std::vector<std::string> asked = m_requests.points;
+    bool ok = true;
+    if (m_requests.selection) {
+        const std::optional<CSelection> selection = CSelection::Parse(*m_requests.selection);
+        std::size_t found = 0;
+        for (const std::string& mat : m_model.Points())
+            if (selection && selection->Contains(mat)) asked.push_back(mat), ++found;
+        if (found == 0) {
+            frontEnd.MessageBox(Sprintf(inters::kMsgNoPointInSelection, m_requests.selection->c_str()),
+                                ui::kCaption, ui::kIconWarning);
+            ok = false;
+        }
+    }
+    if (asked.empty() && ok) {
+        frontEnd.MessageBox(inters::kMsgNoPointAsked, ui::kCaption, ui::kIconWarning);
+        ok = false;
+    }
+    for (const std::string& mat : asked)
+        ok = ComputePoint(frontEnd, mat) && ok;
+    // "--enregistrer" saves without the question of the closing.
+    if (m_requests.save && m_model.Modified() && !m_model.Save()) ok = false;
+    m_model.Close(m_requests.listing, m_requests.listingPath);
+    return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+} // namespace pyr
