@@ -103,7 +103,9 @@ bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& 
         m_model.AddAll();
     }
     Print(frontEnd);
-    if (!m_model.Computed()) return false;
+    // A point is computed when its planimetry is, or its altitude when only the altimetry is asked.
+    const InterResult& result = m_model.Result();
+    if (m_model.Plani() ? !(result.flags & kInterComputed) : !IsKnown(result.z)) return false;
     return !m_requests.save || m_model.WritePoint();
 }
 

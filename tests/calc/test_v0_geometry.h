@@ -27,16 +27,16 @@ inline int AddStation(CCarnet& carnet, const std::string& name, double hi, doubl
     return carnet.Add(std::make_unique<CStation>(name, hi, v0), kKindStation);
 }
 
-// The reference sighting of the target `hp` over `t` read by the instrument `hi` over `s`; the line of
-// sight bends down by curvature and refraction, 0.84 / 12 768 000 m per square metre of distance.
+// The reference (or measured) sighting of the target `hp` over `t` read by the instrument `hi` over `s`; the
+// line of sight bends down by curvature and refraction, 0.84 / 12 768 000 m per square metre of distance.
 inline int AddSighting(CCarnet& carnet, const std::string& name, Place s, double hi, Place t, double hp,
-                       double v0) {
+                       double v0, int kind = kKindReference) {
     const double dx = t.x - s.x, dy = t.y - s.y, horizontal = std::hypot(dx, dy);
     const double rise = (t.z + hp) - (s.z + hi) - 0.84 / 12768000.0 * horizontal * horizontal;
     const double ah = std::fmod(std::atan2(dx, dy) * kGonPerRadian - v0 + 800.0, 400.0); // clockwise
-    return carnet.Add(std::make_unique<CReference>(name, hp, ah, std::atan2(horizontal, rise) * kGonPerRadian,
-                                                   std::hypot(horizontal, rise)),
-                      kKindReference);
+    const double av = std::atan2(horizontal, rise) * kGonPerRadian, di = std::hypot(horizontal, rise);
+    if (kind == kKindMesure) return carnet.Add(std::make_unique<CMesure>(name, hp, ah, av, di), kKindMesure);
+    return carnet.Add(std::make_unique<CReference>(name, hp, ah, av, di), kKindReference);
 }
 
 } // namespace pyr::test
