@@ -1,6 +1,7 @@
 #include "calc/CalcIntersDriver.h"
 
 #include "calc/IntersectionTexts.h"
+#include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
 #include "geobase/GeoBaseMessages.h"
@@ -27,12 +28,17 @@ std::string Shown(const std::string& text) {
     return text.empty() ? std::string("-") : text;
 }
 
+// A residual rounded first, so that a value that rounds to zero shows no sign.
+std::string Rounded(double value, int decimals) {
+    return Sprintf("%.*f", decimals, RoundToDecimals(value, decimals) + 0.0);
+}
+
 std::string Mgon(double grads) {
-    return IsKnown(grads) ? Sprintf("%.1f", grads * 1000.0) : std::string("-");
+    return IsKnown(grads) ? Rounded(grads * 1000.0, 1) : std::string("-");
 }
 
 std::string Metres(double metres) {
-    return IsKnown(metres) ? Sprintf("%.4f", metres) : std::string("-");
+    return IsKnown(metres) ? Rounded(metres, 4) : std::string("-");
 }
 
 } // namespace
