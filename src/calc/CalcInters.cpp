@@ -118,9 +118,7 @@ bool CCalcInters::ChoosePoint(std::string_view mat) {
     }
     const CCarnet& carnet = m_session.Carnet();
     m_point = mat;
-    m_available.clear();
-    m_selected.clear();
-    m_highAvailable = m_highSelected = -1;
+    std::vector<Line> available;
     std::string name;
     for (int i = carnet.Find(kKindMesure, mat); i >= 0; i = carnet.Find(kKindMesure, mat, i + 1)) {
         const int station = carnet.findRepAt(i, name);
@@ -133,83 +131,54 @@ bool CCalcInters::ChoosePoint(std::string_view mat) {
         line.text = Sprintf(inters::kLine, place.Designation().c_str(), m_point.c_str());
         line.tooltip =
             Sprintf(inters::kTooltip, carnet.cmdAt(i).c_str(), m_point.c_str(), carnet.parAt(i).c_str());
-        m_available.push_back(std::move(line));
+        available.push_back(std::move(line));
     }
-    Notify(kPartLists | kPartCaption);
-    Recompute();
+    m_lists.Fill(std::move(available));
+    Notify(kPartCaption);
+    Moved(true);
     return true;
 }
 
 void CCalcInters::HighlightAvailable(int rank) {
-    m_highAvailable = rank >= 0 && rank < static_cast<int>(m_available.size()) ? rank : -1;
+    m_lists.HighlightAvailable(rank);
     Notify(kPartLists);
 }
 
 void CCalcInters::HighlightSelected(int rank) {
-    m_highSelected = rank >= 0 && rank < static_cast<int>(m_selected.size()) ? rank : -1;
+    m_lists.HighlightSelected(rank);
     Notify(kPartLists);
 }
 
-void CCalcInters::MoveLine(std::vector<Line>& from, std::vector<Line>& to, int rank) {
-    if (rank < 0 || rank >= static_cast<int>(from.size())) return;
-    to.push_back(std::move(from[static_cast<std::size_t>(rank)]));
-    from.erase(from.begin() + rank);
+void CCalcInters::Moved(bool moved) {
+    if (!moved) return;
+    Notify(kPartLists);
+    Recompute();
 }
 
 void CCalcInters::AddOne() {
-    if (!CanAddOne()) return;
-    MoveLine(m_available, m_selected, m_highAvailable);
-    m_highAvailable =
-        m_available.empty() ? -1 : std::min(m_highAvailable, static_cast<int>(m_available.size()) - 1);
-    Notify(kPartLists);
-    Recompute();
+    Moved(m_lists.AddOne());
 }
 
 void CCalcInters::AddAll() {
-    if (!CanAddAll()) return;
-    for (Line& line : m_available)
-        m_selected.push_back(std::move(line));
-    m_available.clear();
-    m_highAvailable = -1;
-    Notify(kPartLists);
-    Recompute();
+    Moved(m_lists.AddAll());
 }
 
 void CCalcInters::RemoveOne() {
-    if (!CanRemoveOne()) return;
-    MoveLine(m_selected, m_available, m_highSelected);
-    m_highSelected =
-        m_selected.empty() ? -1 : std::min(m_highSelected, static_cast<int>(m_selected.size()) - 1);
-    Notify(kPartLists);
-    Recompute();
+    Moved(m_lists.RemoveOne());
 }
 
 void CCalcInters::RemoveAll() {
-    if (!CanRemoveAll()) return;
-    for (Line& line : m_selected)
-        m_available.push_back(std::move(line));
-    m_selected.clear();
-    m_highSelected = -1;
-    Notify(kPartLists);
-    Recompute();
+    Moved(m_lists.RemoveAll());
 }
 
 bool CCalcInters::SelectStations(std::string_view selection) {
     const std::optional<CSelection> parsed = CSelection::Parse(selection);
     if (!parsed) return false;
     const CCarnet& carnet = m_session.Carnet();
-    std::vector<Line> all = std::move(m_selected);
-    all.insert(all.end(), std::make_move_iterator(m_available.begin()),
-               std::make_move_iterator(m_available.end()));
-    std::sort(all.begin(), all.end(), [](const Line& a, const Line& b) { return a.index < b.index; });
-    m_selected.clear();
-    m_available.clear();
-    for (Line& line : all)
-        (parsed->Contains(carnet.matAt(line.station)) ? m_selected : m_available).push_back(std::move(line));
-    m_highAvailable = m_highSelected = -1;
-    Notify(kPartLists);
-    Recompute();
-    return !m_selected.empty();
+    const bool any =
+        m_lists.SelectOnly([&](const Line& line) { return parsed->Contains(carnet.matAt(line.station)); });
+    Moved(true);
+    return any;
 }
 
 // ---- Computing ------------------------------------------------------------------------------------------
@@ -243,11 +212,11 @@ bool CCalcInters::Computed() const {
 
 void CCalcInters::Recompute() {
     Clear();
-    if (m_point.empty() || m_selected.empty()) {
+    if (m_point.empty() || m_lists.Selected().empty()) {
         Notify(kPartResult);
         return;
     }
-    for (const Line& line : m_selected)
+    for (const Line& line : m_lists.Selected())
         m_result.sightings.push_back(Gather(line));
     const int flags = ComputeIntersection(m_result, m_plani, m_alti);
     if ((flags & kInterTooClose) && (flags & kInterComputed) && m_frontEnd)
@@ -274,7 +243,7 @@ bool CCalcInters::CanWrite() const {
 }
 
 bool CCalcInters::CanFinish() const {
-    return m_available.size() + m_selected.size() >= 2;
+    return m_lists.Count() >= 2;
 }
 
 std::string CCalcInters::Coordinate(double value, int decimals) const {

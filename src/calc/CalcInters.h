@@ -2,6 +2,7 @@
 
 #include "calc/ComputationSession.h"
 #include "calc/Intersection.h"
+#include "calc/SightingLists.h"
 #include "ui/DialogModel.h"
 
 #include <string>
@@ -27,13 +28,7 @@ public:
         kPartCaption = 16,
     };
 
-    // A line of one of the two lists.
-    struct Line {
-        int index = -1;      // the sighting element
-        int station = -1;    // its station element
-        std::string text;    // "S1(2)  P": the station's designation and the point
-        std::string tooltip; // "%s %s : %s": the sighting's command, point and parameters
-    };
+    using Line = CSightingLists::Line;
 
     CCalcInters();
 
@@ -68,13 +63,13 @@ public:
     const std::string& Point() const { return m_point; }
 
     // ---- The two lists and the four arrows
-    const std::vector<Line>& Available() const { return m_available; }
-    const std::vector<Line>& Selected() const { return m_selected; }
+    const std::vector<Line>& Available() const { return m_lists.Available(); }
+    const std::vector<Line>& Selected() const { return m_lists.Selected(); }
     // The highlighted line of each list, -1 for none.
     void HighlightAvailable(int rank);
     void HighlightSelected(int rank);
-    int HighlightedAvailable() const { return m_highAvailable; }
-    int HighlightedSelected() const { return m_highSelected; }
+    int HighlightedAvailable() const { return m_lists.HighlightedAvailable(); }
+    int HighlightedSelected() const { return m_lists.HighlightedSelected(); }
     void AddOne();
     void AddAll();
     void RemoveOne();
@@ -84,10 +79,10 @@ public:
     bool SelectStations(std::string_view selection);
 
     // ---- Enabling rules
-    bool CanAddOne() const { return m_highAvailable >= 0; }
-    bool CanAddAll() const { return !m_available.empty(); }
-    bool CanRemoveOne() const { return m_highSelected >= 0; }
-    bool CanRemoveAll() const { return !m_selected.empty(); }
+    bool CanAddOne() const { return m_lists.CanAddOne(); }
+    bool CanAddAll() const { return m_lists.CanAddAll(); }
+    bool CanRemoveOne() const { return m_lists.CanRemoveOne(); }
+    bool CanRemoveAll() const { return m_lists.CanRemoveAll(); }
     bool CanWrite() const;  // the computed X and Y, or Z
     bool CanFinish() const; // two sightings at least in the two lists
 
@@ -122,7 +117,8 @@ private:
     void Keep();
     InterSighting Gather(const Line& line);
     const StationPlace& PlaceOf(int station);
-    void MoveLine(std::vector<Line>& from, std::vector<Line>& to, int rank);
+    // After a move of the lists: they are shown again and the point computed again.
+    void Moved(bool moved);
     std::string Coordinate(double value, int decimals) const;
 
     ui::FrontEnd* m_frontEnd = nullptr;
@@ -131,10 +127,7 @@ private:
     bool m_alti = true;
     std::vector<std::string> m_points;
     std::string m_point;
-    std::vector<Line> m_available;
-    std::vector<Line> m_selected;
-    int m_highAvailable = -1;
-    int m_highSelected = -1;
+    CSightingLists m_lists;
     InterResult m_result;
     std::vector<InterResult> m_results;
     std::unordered_map<std::string, std::size_t> m_resultOf;
