@@ -1,17 +1,10 @@
 #pragma once
 
-#include <string_view>
+#include "core/AngleUnits.h"
 
-// The units in which field books write their angles and lengths, and their conversion to the grads and
-// metres of a GéoBase.
+// The units in which field books write their lengths, and their conversion to the metres of a GéoBase;
+// the angle units and their conversions to grads are core/AngleUnits.h, which this header brings in.
 namespace pyr {
-
-enum class AngleUnit {
-    Grads,   // 400 to the circle
-    Degrees, // decimal degrees, 360 to the circle
-    Dms,     // sexagesimal degrees written ddd.mmss (12.3045 is 12° 30' 45")
-    Mils     // 6400 to the circle
-};
 
 enum class DistanceUnit {
     Metres,
@@ -20,14 +13,6 @@ enum class DistanceUnit {
 
 inline constexpr double kMetresPerFoot = 0.3048;
 
-// Decimal degrees of an angle written ddd.mmss (a negative one keeps its sign); the seconds may carry
-// decimals (12.304512 is 12° 30' 45.12").
-double DmsToDegrees(double dms);
-// The same from its text, digit by digit, so that no rounding of the binary value shifts a second:
-// false when the text is no number.
-bool DmsTextToDegrees(std::string_view text, double& degrees);
-
-double ToGrads(double angle, AngleUnit unit);
 double ToMetres(double length, DistanceUnit unit);
 
 // A sighting that the field book gives with its horizontal distance (m) rather than its slope distance:

@@ -1,5 +1,5 @@
-// Angles and lengths of field books brought to grads and metres. Expected values by hand: 1° = 10/9 gr,
-// 1 mil = 1/16 gr, 1 ft = 0.3048 m; a sexagesimal angle ddd.mmss is ddd + mm/60 + ss/3600 degrees.
+// Lengths of field books brought to metres (1 ft = 0.3048 m by definition of the international foot), and
+// sightings given by their horizontal distance. The angle units are tested with the core.
 #include "core/Undefined.h"
 #include "fieldbook/FieldBookUnits.h"
 
@@ -8,40 +8,12 @@
 using namespace pyr;
 
 namespace {
-constexpr double kMgon = 1e-4;      // 0.1 mgon, in grads
-constexpr double kArcSecond = 1e-7; // well under a thousandth of a second, in degrees
+constexpr double kMgon = 1e-4; // 0.1 mgon, in grads
 } // namespace
 
-TEST(FieldBookUnits, SexagesimalAnglesToDegrees) {
-    const struct {
-        const char* text;
-        double degrees;
-    } cases[] = {
-        {"12.3045", 12.0 + 30.0 / 60 + 45.0 / 3600},
-        {"0.0001", 1.0 / 3600},
-        {"359.5959", 359.0 + 59.0 / 60 + 59.0 / 3600},
-        {"12.30451", 12.0 + 30.0 / 60 + 45.1 / 3600},
-        {"-45.3", -45.5},
-        {"90", 90.0},
-        {"12.305", 12.0 + 30.0 / 60 + 50.0 / 3600},
-    };
-    for (const auto& c : cases) {
-        double degrees = 0;
-        ASSERT_TRUE(DmsTextToDegrees(c.text, degrees)) << c.text;
-        EXPECT_NEAR(degrees, c.degrees, kArcSecond) << c.text;
-        EXPECT_NEAR(DmsToDegrees(std::stod(c.text)), c.degrees, kArcSecond) << c.text;
-    }
-    double ignored = 0;
-    EXPECT_FALSE(DmsTextToDegrees("12°30", ignored));
-}
-
-TEST(FieldBookUnits, AnglesToGradsAndLengthsToMetres) {
-    EXPECT_NEAR(ToGrads(90.0, AngleUnit::Degrees), 100.0, kMgon);
-    EXPECT_NEAR(ToGrads(180.3, AngleUnit::Dms), 200.5556, kMgon); // 180° 30' = 180.5°
-    EXPECT_NEAR(ToGrads(1600.0, AngleUnit::Mils), 100.0, kMgon);
-    EXPECT_EQ(ToGrads(123.4567, AngleUnit::Grads), 123.4567);
-    EXPECT_EQ(ToGrads(kUndefined, AngleUnit::Degrees), kUndefined);
+TEST(FieldBookUnits, LengthsToMetres) {
     EXPECT_NEAR(ToMetres(100.0, DistanceUnit::Feet), 30.48, 1e-4);
+    EXPECT_EQ(ToMetres(12.345, DistanceUnit::Metres), 12.345);
     EXPECT_EQ(ToMetres(kUndefined, DistanceUnit::Feet), kUndefined);
 }
 
