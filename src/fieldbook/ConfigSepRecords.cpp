@@ -1,5 +1,6 @@
 #include "fieldbook/ConfigSepRecords.h"
 
+#include "core/AngleUnits.h"
 #include "core/Files.h"
 #include "core/Lines.h"
 #include "core/Numbers.h"
@@ -195,14 +196,12 @@ bool RecordBuilder::ReadNumber(std::string_view text, RecordField field, int lin
         number = std::string_view(buffer, text.size());
     }
     double read = 0.0;
-    const bool dms = IsAngle(field) && m_units.angles == AngleUnit::Dms;
     bool good = fits && ParseDouble(number, read) && std::isfinite(read);
-    if (good && IsKnown(read) && dms) {
+    if (good && IsKnown(read) && IsAngle(field)) {
         // Degrees, minutes and seconds are taken from the digits as written, never from a rounded double.
-        good = DmsTextToDegrees(number, read);
-        read *= 400.0 / 360.0;
+        good = AngleTextToGrads(number, m_units.angles, read);
     } else if (good && IsKnown(read)) {
-        read = IsAngle(field) ? ToGrads(read, m_units.angles) : ToMetres(read, m_units.distances);
+        read = ToMetres(read, m_units.distances);
     }
     if (!good) {
         if (m_txt) m_txt->Print(fb::kBadNumber, line, std::string(text).c_str());

@@ -29,7 +29,7 @@
 //
 // A reader is made for its format in FieldBookReaders.cpp. Its settings come from Driver() (the format's
 // parameter file, ParamDriver.h); its angles and lengths are brought to grads and metres with
-// FieldBookUnits.h.
+// core/AngleUnits.h and FieldBookUnits.h.
 namespace pyr {
 
 class CAppareil;

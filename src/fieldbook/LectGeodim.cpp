@@ -1,5 +1,6 @@
 #include "fieldbook/LectGeodim.h"
 
+#include "core/AngleUnits.h"
 #include "core/Angles.h"
 #include "core/Files.h"
 #include "core/Lines.h"
@@ -192,8 +193,7 @@ void CLectGeodim::ReadRecords(std::string_view records) {
 
 bool CLectGeodim::ReadAngle(int number, int label, std::string_view value, double& grads) {
     double angle = 0.0;
-    const bool read =
-        m_settings.angles == AngleUnit::Dms ? DmsTextToDegrees(value, angle) : ParseDouble(value, angle);
+    const bool read = AngleTextToGrads(value, m_settings.angles, angle);
     if (!read || !std::isfinite(angle)) {
         if (TextWindow())
             TextWindow()->Print(
@@ -201,8 +201,7 @@ bool CLectGeodim::ReadAngle(int number, int label, std::string_view value, doubl
                 Sprintf("%d=%.*s", label, static_cast<int>(value.size()), value.data()).c_str());
         return false;
     }
-    grads = m_settings.angles == AngleUnit::Dms ? ToGrads(angle, AngleUnit::Degrees)
-                                                : ToGrads(angle, m_settings.angles);
+    grads = angle;
     return true;
 }
 

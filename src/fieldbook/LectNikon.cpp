@@ -1,5 +1,6 @@
 #include "fieldbook/LectNikon.h"
 
+#include "core/AngleUnits.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -405,18 +406,13 @@ bool CLectNikon::Length(std::string_view text, DistanceUnit unit, double& metres
 bool CLectNikon::Angle(std::string_view text, AngleUnit unit, double& grads, int number) const {
     grads = kUndefined;
     if (text.empty()) return true;
+    // ddd.mmss read digit by digit: 123.4530 is 123° 45' 30", exactly.
     double value = 0.0;
-    bool read = ParseDouble(text, value) && std::isfinite(value);
-    if (read && unit == AngleUnit::Dms) {
-        // ddd.mmss read digit by digit: 123.4530 is 123° 45' 30", exactly.
-        read = DmsTextToDegrees(text, value);
-        unit = AngleUnit::Degrees;
-    }
-    if (!read) {
+    if (!AngleTextToGrads(text, unit, value) || !std::isfinite(value)) {
         if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(text).c_str());
         return false;
     }
-    grads = ToGrads(value, unit);
+    grads = value;
     return true;
 }
 

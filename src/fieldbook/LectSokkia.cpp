@@ -1,5 +1,6 @@
 #include "fieldbook/LectSokkia.h"
 
+#include "core/AngleUnits.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"

@@ -1,5 +1,6 @@
 #include "fieldbook/LectTopcon.h"
 
+#include "core/AngleUnits.h"
 #include "core/Angles.h"
 #include "core/Files.h"
 #include "core/Numbers.h"
@@ -23,7 +24,6 @@ namespace text = topcon::msg;
 // Beyond this a number is no measurement nor coordinate a field book holds: a wrong number, as are the
 // infinities and NaN that a number reader would otherwise let through.
 constexpr double kLargestValue = 1e9;
-constexpr double kDegreesToGrads = 400.0 / 360.0;
 
 char UpperInitial(std::string_view field) {
     const char c = field.empty() ? '\0' : field.front();
@@ -212,10 +212,8 @@ bool CLectTopcon::ReadNumber(std::string_view value, double& read, bool dms, int
 bool CLectTopcon::ReadAngle(std::string_view value, double& grads, int number) const {
     const bool dms = m_settings.angles == AngleUnit::Dms;
     if (!ReadNumber(value, grads, dms, number)) return false;
-    if (dms && IsKnown(grads))
-        grads *= kDegreesToGrads;
-    else if (!dms)
-        grads = ToGrads(grads, m_settings.angles);
+    // ReadNumber has already turned ddd.mmss into degrees.
+    grads = ToGrads(grads, dms ? AngleUnit::Degrees : m_settings.angles);
     return true;
 }
 

@@ -1,5 +1,6 @@
 #include "fieldbook/LectWildValues.h"
 
+#include "core/AngleUnits.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/Matricule.h"
@@ -120,21 +121,24 @@ bool IsLengthUnit(char unit) {
 
 // The grads of the digits of an angle word in the unit of that digit; false for a DDD.MMSSs whose
 // minutes reach 60 or seconds pass 60. The instruments round 59.96" up to 60.0" without carrying it into
-// the minutes: that reading is the next minute, as the instrument means it.
+// the minutes: that reading is the next minute, as the instrument means it. The digits are scaled to the
+// unit first, as the same word written with its decimal point is read, so that both agree to the bit.
 bool DigitsToGrads(long long n, char unit, double& grads) {
     switch (unit) {
-    case '3': // 1e-5 degree = 1 / 90 000 grad
-        grads = static_cast<double>(n) / 90000.0;
+    case '3': // 1e-5 degree
+        grads = DegreesToGrads(static_cast<double>(n) / 1e5);
         return true;
-    case '4': { // DDD.MMSSs: tenths of a second, 32 400 to the grad
+    case '4': { // DDD.MMSSs: tenths of a second
         const long long tenths = n % 1000;
         const long long minutes = n / 1000 % 100;
         if (minutes >= 60 || tenths > 600) return false;
-        grads = static_cast<double>(((n / 100000) * 60 + minutes) * 600 + tenths) / 32400.0;
+        grads =
+            DegreesToGrads(SexagesimalToDegrees(static_cast<double>(n / 100000), static_cast<double>(minutes),
+                                                static_cast<double>(tenths) / 10.0));
         return true;
     }
-    case '5': // 1e-4 mil = 1 / 160 000 grad
-        grads = static_cast<double>(n) / 160000.0;
+    case '5': // 1e-4 mil
+        grads = MilsToGrads(static_cast<double>(n) / 1e4);
         return true;
     default: // 1e-5 grad
         grads = static_cast<double>(n) / 1e5;
@@ -149,11 +153,8 @@ Value ReadAngle(const Word& word, AngleUnit fallback, double& grads) {
     double value = 0.0;
     if (!number.point) {
         if (!DigitsToGrads(number.digits, unit, value)) return Value::Bad;
-    } else if (unit == '4') {
-        if (!DmsTextToDegrees(number.text, value)) return Value::Bad;
-        value = ToGrads(value, AngleUnit::Degrees);
-    } else {
-        value = ToGrads(number.written, AngleUnitOf(unit));
+    } else if (!AngleTextToGrads(number.text, AngleUnitOf(unit), value)) {
+        return Value::Bad;
     }
     grads = Signed(word, value);
     return Value::Read;

@@ -1,5 +1,6 @@
 #include "fieldbook/LectZeiss.h"
 
+#include "core/AngleUnits.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -376,14 +377,7 @@ bool CLectZeiss::ReadValues(int number, Values& values) {
             read = kRightAngle - RadiansToGrads(std::atan(read / 100.0));
         } else {
             const AngleUnit angles = unit == Unit::None ? m_settings.angles : AngleUnitOf(unit);
-            double degrees = 0.0;
-            if (angles == AngleUnit::Dms) {
-                ok = DmsTextToDegrees(value.number, degrees);
-                read = ToGrads(degrees, AngleUnit::Degrees);
-            } else {
-                ok = ParseDouble(value.number, read);
-                read = ToGrads(read, angles);
-            }
+            ok = AngleTextToGrads(value.number, angles, read);
         }
         if (!ok || !std::isfinite(read)) {
             if (TextWindow()) TextWindow()->Print(fb::kBadNumber, number, std::string(value.number).c_str());
