@@ -27,7 +27,7 @@ void ReadReferencesFromCoordinates(CCarnet& carnet) {
             const std::string name = carnet.matAt(i);
             placed = carnet.hasXY(name, sx, sy) && carnet.hasZ(name, sz);
             hi = carnet.hiAt(i);
-            v0 = std::fmod(i * 37.123, 400.0);
+            v0 = WrapGrads(i * 37.123);
             continue;
         }
         double tx, ty, tz;
