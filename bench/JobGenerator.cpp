@@ -1,8 +1,11 @@
 #include "JobGenerator.h"
 
+#include "calc/Corrections.h"
+#include "core/Angles.h"
 #include "geobase/Elements.h"
 #include "geobase/Kinds.h"
 
+#include <array>
 #include <cmath>
 #include <memory>
 #include <unordered_map>
@@ -164,6 +167,123 @@ JobContents Contents(const CCarnet& carnet) {
         }
     }
     return contents;
+}
+
+namespace {
+
+// A point known in three dimensions.
+struct Place {
+    double x, y, z;
+};
+
+// A sighting from a station (its point, the instrument height, its V0) to a target at a target height,
+// read from their coordinates and written after the station.
+void AddMeasureFromCoordinates(CCarnet& carnet, const Place& station, double hi, double v0,
+                               const std::string& target, const Place& at, double hp) {
+    const double horizontal = std::hypot(at.x - station.x, at.y - station.y);
+    const double rise = at.z + hp - station.z - hi - CurvatureRefraction(horizontal);
+    const double ah = WrapGrads(Bearing(station.x, station.y, at.x, at.y) - v0);
+    const double av = RadiansToGrads(std::atan2(horizontal, rise));
+    const double di = std::hypot(horizontal, rise);
+    auto round = [](double value, double scale) { return std::round(value * scale) / scale; };
+    carnet.Add(std::make_unique<CMesure>(target, hp, round(ah, 1e5), round(av, 1e5), round(di, 1e4)),
+               kKindMesure);
+}
+
+// One station set-up: its point, then the station element carrying its V0.
+void AddPlacedStation(CCarnet& carnet, const std::string& name, const Place& place, double hi, double v0) {
+    carnet.Add(std::make_unique<CPointGen>(name, place.x, place.y, place.z), kKindPoint);
+    carnet.Add(std::make_unique<CStation>(name, hi, v0), kKindStation);
+}
+
+// The same deterministic draws as the job generator's, for the jobs built without it.
+class Draws {
+public:
+    double Uniform(double low, double high) {
+        m_state = m_state * 6364136223846793005ULL + 1442695040888963407ULL;
+        return low + (high - low) * (static_cast<double>(m_state >> 11) / static_cast<double>(1ULL << 53));
+    }
+    double Rounded(double low, double high, double scale) {
+        return std::round(Uniform(low, high) * scale) / scale;
+    }
+
+private:
+    std::uint64_t m_state = 20240611;
+};
+
+} // namespace
+
+CCarnet MakeIntersectionStar(int stations) {
+    CCarnet carnet;
+    Draws draws;
+    const Place point{kStarX, kStarY, kStarZ};
+    for (int s = 0; s < stations; ++s) {
+        // Spread over the whole horizon, each a little off its share of it.
+        const double bearing = (s + draws.Uniform(0.1, 0.9)) * 400.0 / stations;
+        const double distance = draws.Uniform(40, 600);
+        const Place place{std::round((kStarX + distance * SinGrads(bearing)) * 1e3) / 1e3,
+                          std::round((kStarY + distance * CosGrads(bearing)) * 1e3) / 1e3,
+                          draws.Rounded(55, 90, 1e3)};
+        const double hi = draws.Rounded(1.45, 1.70, 1e3);
+        const double v0 = draws.Rounded(0, 400, 1e5);
+        AddPlacedStation(carnet, "S" + std::to_string(s + 1), place, hi, v0);
+        AddMeasureFromCoordinates(carnet, place, hi, v0, kStarPoint, point, s % 3 == 0 ? 2.0 : 1.3);
+    }
+    return carnet;
+}
+
+IntersectionGrid MakeIntersectionGrid(int columns, int rows) {
+    constexpr double kSpacing = 100.0;
+    constexpr double kEast = 651200.0;
+    constexpr double kNorth = 6862300.0;
+    constexpr int kPointsPerSquare = 5;
+    // The side of its square from which each point is measured: bottom, right, top, left, bottom again,
+    // as the corners (column offset, row offset) at its two ends.
+    constexpr std::array<std::array<std::array<int, 2>, 2>, 4> kSides{
+        {{{{0, 0}, {1, 0}}}, {{{1, 0}, {1, 1}}}, {{{1, 1}, {0, 1}}}, {{{0, 1}, {0, 0}}}}};
+
+    IntersectionGrid grid;
+    Draws draws;
+    const int squareColumns = columns - 1, squareRows = rows - 1;
+    std::vector<Place> points;
+    points.reserve(static_cast<std::size_t>(std::max(squareColumns * squareRows, 0) * kPointsPerSquare));
+    for (int r = 0; r < squareRows; ++r)
+        for (int c = 0; c < squareColumns; ++c)
+            for (int k = 0; k < kPointsPerSquare; ++k)
+                // Away from the sides, so that the two rays always meet under a wide angle.
+                points.push_back({std::round((kEast + (c + draws.Uniform(0.2, 0.8)) * kSpacing) * 1e3) / 1e3,
+                                  std::round((kNorth + (r + draws.Uniform(0.2, 0.8)) * kSpacing) * 1e3) / 1e3,
+                                  draws.Rounded(45, 65, 1e3)});
+
+    for (int r = 0; r < rows; ++r) {
+        for (int c = 0; c < columns; ++c) {
+            const Place place{kEast + c * kSpacing, kNorth + r * kSpacing, draws.Rounded(50, 60, 1e3)};
+            const double hi = draws.Rounded(1.45, 1.70, 1e3);
+            const double v0 = draws.Rounded(0, 400, 1e5);
+            AddPlacedStation(grid.carnet, "S" + std::to_string(r * columns + c + 1), place, hi, v0);
+            ++grid.stations;
+            // The four squares this station is a corner of, and the points measured from that corner.
+            for (int dr = -1; dr <= 0; ++dr) {
+                for (int dc = -1; dc <= 0; ++dc) {
+                    const int sc = c + dc, sr = r + dr;
+                    if (sc < 0 || sr < 0 || sc >= squareColumns || sr >= squareRows) continue;
+                    for (int k = 0; k < kPointsPerSquare; ++k) {
+                        const auto& side = kSides[static_cast<std::size_t>(k) % kSides.size()];
+                        const bool fromHere = (side[0][0] == -dc && side[0][1] == -dr) ||
+                                              (side[1][0] == -dc && side[1][1] == -dr);
+                        if (!fromHere) continue;
+                        const int number = (sr * squareColumns + sc) * kPointsPerSquare + k;
+                        AddMeasureFromCoordinates(
+                            grid.carnet, place, hi, v0, "P" + std::to_string(number + 1),
+                            points[static_cast<std::size_t>(number)], k % 2 == 0 ? 1.3 : 2.0);
+                        ++grid.sightings;
+                    }
+                }
+            }
+        }
+    }
+    grid.points = static_cast<int>(points.size());
+    return grid;
 }
 
 } // namespace pyr::bench

@@ -56,4 +56,28 @@ struct JobContents {
 };
 JobContents Contents(const CCarnet& carnet);
 
+// ---- Jobs for the intersection: new points sighted from stations whose place and V0 are known. Every
+// sighting is read from the coordinates as a good instrument reads it (directions and zenith angles to
+// 0.01 mgon, distances to 0.1 mm), face left, the circle turned by the V0 written in the station element.
+
+// The new point of the star, and where it truly is.
+inline constexpr const char* kStarPoint = "P";
+inline constexpr double kStarX = 651480.0;
+inline constexpr double kStarY = 6862760.0;
+inline constexpr double kStarZ = 72.5;
+// `stations` stations "S1".."Sn" set up all around P, 40 m to 600 m from it, each point known in X, Y
+// and Z, each station oriented and measuring P once.
+CCarnet MakeIntersectionStar(int stations);
+
+// Stations "S1".."Sn" on a grid of `columns` x `rows` nodes 100 m apart, each station point known and
+// the station oriented. Every square of the grid holds five new points "P1".."Pm", each measured from
+// two corners of its square (the two ends of one side): ten sightings for each station inside the grid.
+struct IntersectionGrid {
+    CCarnet carnet;
+    int stations = 0;
+    int points = 0;
+    int sightings = 0;
+};
+IntersectionGrid MakeIntersectionGrid(int columns, int rows);
+
 } // namespace pyr::bench
