@@ -95,22 +95,22 @@ const StationPlace& CCalcInters::PlaceOf(int station) {
 void CCalcInters::FindPoints() {
     const CCarnet& carnet = m_session.Carnet();
     m_points.clear();
-    std::unordered_set<std::string> seen;
+    m_offered.clear();
     std::string name;
     for (int i = carnet.Find(kKindMesure, ""); i >= 0; i = carnet.Find(kKindMesure, "", i + 1)) {
         std::string mat = carnet.matAt(i);
-        if (mat.empty() || seen.count(mat)) continue;
+        if (mat.empty() || m_offered.count(mat)) continue;
         const int station = carnet.findRepAt(i, name);
         if (station < 0) continue;
         const StationPlace& place = PlaceOf(station);
         if (!place.HasPlace() || !place.IsOriented()) continue;
-        seen.insert(mat);
+        m_offered.insert(mat);
         m_points.push_back(std::move(mat));
     }
 }
 
 bool CCalcInters::ChoosePoint(std::string_view mat) {
-    if (std::find(m_points.begin(), m_points.end(), mat) == m_points.end()) {
+    if (!m_offered.count(std::string(mat))) {
         if (m_frontEnd)
             m_frontEnd->MessageBox(Sprintf(inters::kMsgPointNotOffered, std::string(mat).c_str()),
                                    ui::kCaption, ui::kIconWarning);

@@ -8,6 +8,7 @@
 #include <string>
 #include <string_view>
 #include <unordered_map>
+#include <unordered_set>
 #include <vector>
 
 namespace pyr {
@@ -126,6 +127,7 @@ private:
     bool m_plani = true;
     bool m_alti = true;
     std::vector<std::string> m_points;
+    std::unordered_set<std::string> m_offered; // the same points, to find one at once
     std::string m_point;
     CSightingLists m_lists;
     InterResult m_result;
