@@ -37,14 +37,7 @@ constexpr ReductionSwitch kSwitches[] = {
     {"InAppareil", &ReductionOptions::inAppareil, false,
      "Intégrer les corrections d'&appareils dans les observations", kGroupEccentrics},
 };
-
-// A check box's text as a line of help: without its shortcut mark and its trailing blank.
-std::string HelpText(std::string_view checkBox) {
-    std::string text;
-    for (char c : checkBox)
-        if (c != '&') text += c;
-    return std::string(Trimmed(text));
-}
+static_assert(std::size(kSwitches) == kReductionSwitchCount);
 
 // A value computed anew is kept to the decimals of the store's settings; one left as it was stays as read.
 double Kept(double value, double old, int decimals) {
@@ -59,13 +52,6 @@ std::span<const ReductionSwitch> ReductionSwitches() {
 
 // ---------------------------------------------------------------- the dialog
 
-void CReduction_Station::DeclareOptions(ui::DialogOptions& options) {
-    for (std::size_t i = 0; i < std::size(kSwitches); ++i) {
-        const ReductionSwitch& entry = kSwitches[i];
-        options.ZeroOrOne(entry.key, HelpText(entry.checkBox), [this, i](bool on) { m_given[i] = on; });
-    }
-}
-
 void CReduction_Station::OnInitDialog() {
     const std::string_view path = Inputs().paramPath;
     for (std::size_t i = 0; i < std::size(kSwitches); ++i) {
@@ -78,6 +64,17 @@ void CReduction_Station::OnInitDialog() {
     m_foldVertical = ReadOptionSwitch(path, kSectionCalculations, kKeyFoldVertical);
     m_defaultInstrument = DefaultInstrument(path);
     m_changed = false;
+    Notify(kPartSwitches);
+}
+
+void CReduction_Station::GiveSwitch(std::size_t which, bool on) {
+    m_given.at(which) = on;
+    m_options.*kSwitches[which].member = on;
+    Notify(kPartSwitches);
+}
+
+bool CReduction_Station::Switch(std::size_t which) const {
+    return which < std::size(kSwitches) && m_options.*kSwitches[which].member;
 }
 
 void CReduction_Station::SaveOptions() const {
@@ -88,13 +85,6 @@ void CReduction_Station::SaveOptions() const {
 void CReduction_Station::OnOK(ui::FrontEnd& frontEnd) {
     SaveOptions();
     Reduce(frontEnd);
-}
-
-ui::DialogResult CReduction_Station::Run(ui::FrontEnd& frontEnd) {
-    if (!m_carnet) return ui::DialogResult::Failed;
-    OnInitDialog();
-    OnOK(frontEnd);
-    return ui::DialogResult::Ok;
 }
 
 // ---------------------------------------------------------------- the reduction
@@ -117,6 +107,7 @@ void CReduction_Station::Reduce(ui::FrontEnd& frontEnd) {
 
     m_reducing = false;
     Settle();
+    Notify(kPartGeoBase);
 }
 
 void CReduction_Station::MergeReprises(const std::string& name) {

@@ -3,7 +3,7 @@
 #include "calc/RepriseBlock.h"
 #include "settings/CalcOptions.h"
 #include "settings/OptionInstruments.h"
-#include "ui/Dialog.h"
+#include "ui/DialogModel.h"
 
 #include <array>
 #include <optional>
@@ -18,6 +18,10 @@
 // instrument height.
 namespace pyr {
 
+namespace ui {
+class FrontEnd;
+}
+
 class CCarnet;
 class CVisee;
 
@@ -29,6 +33,7 @@ inline constexpr const char* kSectionReduction = "Reduction_des_Stations";
 inline constexpr const char* kKeyFoldVertical = "ExcentVertDansAngles";
 
 // The seven switches of the dialog, kept in the section "Reduction_des_Stations".
+inline constexpr std::size_t kReductionSwitchCount = 7;
 struct ReductionOptions {
     bool visComm = true;     // offsets between set-ups from their common sightings
     bool v0BasedOn = false;  // offsets between set-ups from their known V0
@@ -49,25 +54,34 @@ struct ReductionSwitch {
 };
 std::span<const ReductionSwitch> ReductionSwitches();
 
-// The dialog "Réduction des stations", opened by the GéoBase editor on the GéoBase it holds.
-class CReduction_Station : public ui::Dialog {
+// The dialog "Réduction des stations", opened by the GéoBase editor on the GéoBase it holds: seven check
+// boxes, kept in the parameter file, and OK, which reduces the stations of that GéoBase in place.
+class CReduction_Station : public ui::DialogModel {
 public:
+    // The parts of the dialog a change notice names.
+    enum Part : int {
+        kPartSwitches = 1, // the seven check boxes
+        kPartGeoBase = 2,  // the elements of the GéoBase, after a reduction
+    };
+
     explicit CReduction_Station(CCarnet* carnet = nullptr) : m_carnet(carnet) {}
     void SetCarnet(CCarnet* carnet) { m_carnet = carnet; }
+    CCarnet* Carnet() const { return m_carnet; }
 
     std::string Caption() const override { return kReductionCaption; }
-    // "--VisComm 0|1" ... one option for each switch; they hold over the parameter file's values.
-    void DeclareOptions(ui::DialogOptions& options) override;
-    // Opens the dialog and closes it with OK: there is nothing else to choose.
-    ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
 
     // Reads the switches and the calculation options it uses from the parameter file, as the dialog
-    // does when it opens; the switches set from a command line then replace those read.
+    // does when it opens; the switches given (GiveSwitch) hold over those read.
     void OnInitDialog();
+    // Ticks or clears the check box `which` (in the order of ReductionSwitches()). The value is given:
+    // it holds over the parameter file's when the dialog opens afterwards.
+    void GiveSwitch(std::size_t which, bool on);
+    bool Switch(std::size_t which) const;
     // Saves the switches, reduces, and closes.
     void OnOK(ui::FrontEnd& frontEnd);
     void SaveOptions() const;
 
+    // The switches as they stand; changed here, they are neither given nor announced.
     ReductionOptions& Options() { return m_options; }
     const ReductionOptions& Options() const { return m_options; }
     // "ExcentVertDansAngles": the vertical offsets go into the zenith angles and distances rather than the
@@ -78,7 +92,7 @@ public:
     // Whether any element of the GéoBase was changed.
     bool Changed() const { return m_changed; }
 
-    // Every step, in order; the warning is shown first.
+    // Every step, in order; the warning is shown first. Announces the GéoBase reduced, changed or not.
     void Reduce(ui::FrontEnd& frontEnd);
 
     // ---- The steps. Each leaves the GéoBase as it made it; run by Reduce, the deletions are carried out
@@ -138,7 +152,8 @@ private:
 
     CCarnet* m_carnet;
     ReductionOptions m_options;
-    std::array<std::optional<bool>, 7> m_given; // the switches set from a command line
+    // The switches given, holding over the parameter file.
+    std::array<std::optional<bool>, kReductionSwitchCount> m_given;
     bool m_foldVertical = false;
     InstrumentOptions m_defaultInstrument{kStandardInstrument};
     bool m_changed = false;

@@ -123,10 +123,11 @@ ui::DialogResult CGeoEditor::ReadFieldBook(CCarnet& carnet, CPyrTxtWnd& txt, ui:
 
 bool CGeoEditor::ReduceStations(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
     m_reduction.SetInputs({carnet.PathName(), Inputs().paramPath, Inputs().configFolder, kReductionCaption});
-    m_reduction.SetCarnet(&carnet);
+    CReduction_Station& reduction = m_reduction.Reduction();
+    reduction.SetCarnet(&carnet);
     const bool reduced = m_reduction.Run(frontEnd) == ui::DialogResult::Ok;
-    m_reduction.SetCarnet(nullptr);
-    if (!reduced || !m_reduction.Changed()) {
+    reduction.SetCarnet(nullptr);
+    if (!reduced || !reduction.Changed()) {
         txt.Print("%s", msg::kNoChange);
         return true;
     }

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "calc/StationReduction.h"
+#include "calc/StationReductionDriver.h"
 #include "fieldbook/FieldBookFormats.h"
 #include "fieldbook/LectCarnet.h"
 #include "ui/Dialog.h"
@@ -37,7 +37,7 @@ private:
     ui::DialogResult ReadFieldBook(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd);
 
     bool m_reduce = false;
-    CReduction_Station m_reduction;
+    CReductionDriver m_reduction; // its options are declared among the editor's
     std::optional<Reading> m_reading;
     ReadingRequests m_readingRequests;
 };

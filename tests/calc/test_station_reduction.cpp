@@ -4,6 +4,7 @@
 #include "TestSupport.h"
 #include "calc/GeoLines.h"
 #include "calc/StationReduction.h"
+#include "calc/StationReductionDriver.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "geobase/Carnet.h"
@@ -117,7 +118,8 @@ TEST(ReductionOptionsFile, InstrumentCorrectionsAreFoldedInAndTheSwitchesKept) {
         geo.Sta("S1", 1.5).Mes("P", 1.5, 20.0, 101.0, 80.0);
         geo.Put(std::make_unique<CAppareil>("TS 3", 0.5, 0.5), kKindAppareil)
             .Mes("Q", 1.5, 30.0, kUndefined, 0.0);
-        CReduction_Station dialog(&geo);
+        CReductionDriver dialog;
+        dialog.Reduction().SetCarnet(&geo);
         dialog.SetInputs({"", ini, "", ""});
         ui::DialogOptions options;
         dialog.DeclareOptions(options);
@@ -198,6 +200,34 @@ TEST_F(Reduction, SetUpsAreMergedAfterTheOldOnesByCommonSightingsKnownV0OrAsThey
         EXPECT_NEAR(geo.diAt(17), std::hypot(25.0, rise), kTenthMm) << c.name;
         EXPECT_TRUE(dialog.Changed()) << c.name;
     }
+}
+
+// The dialog as a desktop host shows it: a check box given before it opens holds over the parameter file,
+// and the listeners learn of the switches read, then of the GéoBase once it is reduced.
+TEST(ReductionDialog, AGivenSwitchHoldsOverTheFileAndTheReductionIsAnnouncedOnceDone) {
+    TempDir dir;
+    const std::string ini = dir / "Pyralis.ini";
+    WriteBytes(ini, "[Reduction_des_Stations]\nSuppress=1\nV0BasedOn=1\n");
+    Geo geo = TwoSetUps();
+    CReduction_Station dialog(&geo);
+    dialog.SetInputs({"", ini, "", ""});
+    std::vector<std::pair<int, int>> notices; // the parts, and the size of the GéoBase then
+    dialog.Listen([&](int parts) { notices.emplace_back(parts, geo.GetSize()); });
+
+    dialog.GiveSwitch(3, false); // "Supprimer les anciennes stations" cleared
+    dialog.OnInitDialog();
+    EXPECT_FALSE(dialog.Switch(3));
+    EXPECT_TRUE(dialog.Options().v0BasedOn); // as the file says
+    EXPECT_TRUE(dialog.Options().visComm);   // by default
+    ui::ScriptedFrontEnd frontEnd;
+    dialog.OnOK(frontEnd);
+
+    EXPECT_EQ(geo.GetSize(), 18); // merged by the common sightings, the old set-ups kept
+    using R = CReduction_Station;
+    const std::vector<std::pair<int, int>> expected{
+        {R::kPartSwitches, 11}, {R::kPartSwitches, 11}, {R::kPartGeoBase, 18}};
+    EXPECT_EQ(notices, expected);
+    EXPECT_NE(ReadBytes(ini).find("Suppress=0"), std::string::npos);
 }
 
 TEST_F(Reduction, SuppressRemovesTheOldSetUpsAndKeepsTheirPoints) {
