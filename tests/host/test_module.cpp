@@ -75,12 +75,12 @@ TEST_F(Module, InitialisationLoadsTheServicesInstallsTheToolbarAndRegistersTheCo
 }
 
 TEST_F(Module, ACommandAnswersToItsGlobalAndLocalNamesInAnyCase) {
-    for (const char* name : {"PyraCalInter", "calinter", "CalInter"})
+    for (const char* name : {"PyraCalRelev", "calrelev", "CalRelev"})
         ASSERT_TRUE(Run(name)) << name;
     // Not built yet: the command says so, and counts as refused.
     ASSERT_EQ(frontEnd.messages.size(), 3u);
     EXPECT_EQ(frontEnd.messages[0].text,
-              "La commande CalInter (calcul d'un point par intersections de visées) "
+              "La commande CalRelev (calcul d'un point par relèvement) "
               "n'est pas encore disponible dans cette version de PYRALIS Calculs Topo.");
     EXPECT_EQ(frontEnd.results, std::vector<DialogResult>(3, DialogResult::Failed));
 }

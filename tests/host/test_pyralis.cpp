@@ -33,9 +33,8 @@ TEST_F(Pyralis, ExitStatusSaysWhetherTheCommandRanWasRefusedOrMisused) {
         const char* arguments;
         int status;
         const char* said; // on standard error, or on standard output for the help
-    } cases[] = {{"CALINTER", 1,
-                  "La commande CalInter (calcul d'un point par intersections de visées) n'est pas encore "
-                  "disponible"},
+    } cases[] = {{"CALRELEV", 1,
+                  "La commande CalRelev (calcul d'un point par relèvement) n'est pas encore disponible"},
                  {"CalInconnu", 2, "commande inconnue « CalInconnu »"},
                  {"CalInter --bidon", 2, "--bidon"},
                  {"--bidon CalInter", 2, "--bidon"},
@@ -78,7 +77,7 @@ TEST_F(Pyralis, CalcOptRefusesAnOptionOutOfItsLimitsAndSetsOneWithin) {
 }
 
 TEST_F(Pyralis, APersonTypesCommandsAtThePrompt) {
-    const Outcome outcome = Run("--interactif", "calinter\n\"PyrCalTopo15\"\nFIN\n");
+    const Outcome outcome = Run("--interactif", "calrelev\n\"PyrCalTopo15\"\nFIN\n");
     EXPECT_EQ(outcome.status, 0);
     EXPECT_TRUE(Has(outcome.err, "Commande : ")) << outcome.err;
     EXPECT_TRUE(Has(outcome.err, "n'est pas encore disponible"));
