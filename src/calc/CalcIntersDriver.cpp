@@ -21,8 +21,6 @@ constexpr const char* kHelpPlani =
     "calculer la planimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
 constexpr const char* kHelpAlti = "calculer l'altimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
 constexpr const char* kHelpSave = "écrire chaque point calculé dans la GéoBase et l'enregistrer";
-constexpr const char* kHelpListing = "écrire le listing sans le demander (« Fin + Listing »), dans FICHIER "
-                                     "s'il est donné";
 
 std::string Shown(const std::string& text) {
     return text.empty() ? std::string("-") : text;
@@ -63,15 +61,7 @@ void CCalcIntersDriver::DeclareOptions(ui::DialogOptions& options) {
     });
     options.ZeroOrOne("plani", kHelpPlani, [this](bool on) { m_requests.plani = on; });
     options.ZeroOrOne("alti", kHelpAlti, [this](bool on) { m_requests.alti = on; });
-    options.Switch("enregistrer", kHelpSave, [this] {
-        m_requests.save = true;
-        return std::string();
-    });
-    options.OptionalValue("listing", "FICHIER", kHelpListing, [this](const std::string& path) {
-        m_requests.listing = true;
-        m_requests.listingPath = path;
-        return std::string();
-    });
+    DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
 // The result as the dialog shows it: the fields, then the residuals of each sighting taken.
@@ -112,7 +102,7 @@ bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& 
     // A point is computed when its planimetry is, or its altitude when only the altimetry is asked.
     const InterResult& result = m_model.Result();
     if (m_model.Plani() ? !(result.flags & kInterComputed) : !IsKnown(result.z)) return false;
-    return !m_requests.save || m_model.WritePoint();
+    return !m_requests.computation.save || m_model.WritePoint();
 }
 
 ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
@@ -143,8 +133,8 @@ ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
     for (const std::string& mat : asked)
         ok = ComputePoint(frontEnd, mat) && ok;
     // "--enregistrer" saves without the question of the closing.
-    if (m_requests.save && m_model.Modified() && !m_model.Save()) ok = false;
-    m_model.Close(m_requests.listing, m_requests.listingPath);
+    if (m_requests.computation.save && m_model.Modified() && !m_model.Save()) ok = false;
+    m_model.Close(m_requests.computation.listing, m_requests.computation.listingPath);
     return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
 }
 

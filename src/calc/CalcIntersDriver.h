@@ -1,6 +1,7 @@
 #pragma once
 
 #include "calc/CalcInters.h"
+#include "calc/ComputationOptions.h"
 #include "ui/Dialog.h"
 
 #include <optional>
@@ -31,9 +32,7 @@ private:
         std::optional<std::string> selection;
         std::optional<std::string> stations;
         std::optional<bool> plani, alti;
-        bool save = false;
-        bool listing = false;
-        std::string listingPath;
+        ComputationRequests computation;
     } m_requests;
 };
 

@@ -27,7 +27,6 @@ constexpr const char* kHelpForce = "garder toutes les références choisies, mê
 constexpr const char* kHelpV0 = "le V0 de la station fixé à la main (grades), écrit comme un V0 calculé";
 constexpr const char* kHelpSave = "écrire les V0 dans les stations et enregistrer la GéoBase (avec des "
                                   "coordonnées tapées, propose d'y ajouter le point de la station)";
-constexpr const char* kHelpListing = "écrire le listing sans le demander, dans FICHIER s'il est donné";
 
 // A number of an option, or the French reason it is not one.
 std::string ReadNumber(const char* option, const std::string& text, std::optional<double>& value) {
@@ -94,15 +93,7 @@ void CCalculV0Driver::DeclareOptions(ui::DialogOptions& options) {
         m_requests.type = Type::Unique;
         return ReadNumber("v0", text, m_requests.v0);
     });
-    options.Switch("enregistrer", kHelpSave, [this] {
-        m_requests.save = true;
-        return std::string();
-    });
-    options.OptionalValue("listing", "FICHIER", kHelpListing, [this](const std::string& path) {
-        m_requests.listing = true;
-        m_requests.listingPath = path;
-        return std::string();
-    });
+    DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
 bool CCalculV0Driver::ApplyRequests(ui::FrontEnd& frontEnd) {
@@ -131,9 +122,9 @@ ui::DialogResult CCalculV0Driver::Run(ui::FrontEnd& frontEnd) {
     if (!v0.Open(frontEnd)) return v0.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
     if (!ApplyRequests(frontEnd)) return ui::DialogResult::Failed;
     const bool done = m_requests.v0 ? v0.EnterV0(*m_requests.v0) : v0.Calculate();
-    const bool saved = done && m_requests.save && v0.Enregistrer();
-    v0.Close(saved, m_requests.listing, m_requests.listingPath);
-    return done && (saved || !m_requests.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+    const bool saved = done && m_requests.computation.save && v0.Enregistrer();
+    v0.Close(saved, m_requests.computation.listing, m_requests.computation.listingPath);
+    return done && (saved || !m_requests.computation.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
 }
 
 } // namespace pyr

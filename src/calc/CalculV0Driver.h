@@ -1,6 +1,7 @@
 #pragma once
 
 #include "calc/CalculV0Sta.h"
+#include "calc/ComputationOptions.h"
 #include "ui/Dialog.h"
 
 #include <optional>
@@ -32,9 +33,7 @@ private:
         std::optional<std::string> references;
         std::optional<double> x, y, z;
         std::optional<double> v0;
-        bool save = false;
-        bool listing = false;
-        std::string listingPath;
+        ComputationRequests computation;
     } m_requests;
 };
 

@@ -6,8 +6,6 @@ namespace pyr::v0 {
 
 inline constexpr const char* kCaption = "PYRALIS - Calcul des V0 de stations";
 
-inline constexpr const char* kChooseGeoBase = "Sélectionnez la GéoBase à traiter :";
-
 // The dialog's own settings in the parameter file.
 inline constexpr const char* kSection = "Calcul_V0";
 inline constexpr const char* kKeyType = "TypDeCalcul";
@@ -32,8 +30,6 @@ inline constexpr const char* kMsgStationCoordinatesKnown =
 inline constexpr const char* kMsgCoordinatesIncomplete =
     "Les coordonnées X et Y de la station vont ensemble !";
 inline constexpr const char* kMsgNoStation = "La GéoBase <%s> ne contient aucune station !";
-inline constexpr const char* kMsgEmptyGeoBase = "La GéoBase <%s> est vide : aucun calcul possible !";
-inline constexpr const char* kMsgNoGeoBase = "Aucune GéoBase à traiter : indiquez-la avec --geobase.";
 inline constexpr const char* kMsgNoStationInList = "Aucune station de la GéoBase n'est dans la liste <%s> !";
 inline constexpr const char* kMsgNoReferenceChosen = "Aucune référence choisie pour la station <%s> !";
 inline constexpr const char* kMsgReferenceNotOffered =
