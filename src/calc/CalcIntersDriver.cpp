@@ -1,5 +1,6 @@
 #include "calc/CalcIntersDriver.h"
 
+#include "calc/IntersectionListing.h"
 #include "calc/IntersectionTexts.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -26,17 +27,9 @@ std::string Shown(const std::string& text) {
     return text.empty() ? std::string("-") : text;
 }
 
-// A residual rounded first, so that a value that rounds to zero shows no sign.
-std::string Rounded(double value, int decimals) {
-    return Sprintf("%.*f", decimals, RoundToDecimals(value, decimals) + 0.0);
-}
-
-std::string Mgon(double grads) {
-    return IsKnown(grads) ? Rounded(grads * 1000.0, 1) : std::string("-");
-}
-
+// A linear residual to the tenth of a millimetre, rounded first so that a zero shows no sign.
 std::string Metres(double metres) {
-    return IsKnown(metres) ? Rounded(metres, 4) : std::string("-");
+    return IsKnown(metres) ? FormatFixed(RoundToDecimals(metres, 4) + 0.0, 4) : std::string("-");
 }
 
 } // namespace
@@ -82,8 +75,9 @@ void CCalcIntersDriver::Print(ui::FrontEnd& frontEnd) {
         txt.Print(inters::kLineAltitude, mat, m_model.ZText().c_str(), Shown(m_model.EmqZText()).c_str(),
                   result.altitudes);
     for (const InterSighting& s : result.sightings)
-        txt.Print(inters::kLineSighting, Sprintf("%s(%d)", s.station.c_str(), s.reprise).c_str(),
-                  Mgon(s.v).c_str(), Metres(s.e).c_str(), Mgon(s.vz).c_str(), Metres(s.ez).c_str());
+        txt.Print(inters::kLineSighting, StationPlace{-1, s.station, s.reprise}.Designation().c_str(),
+                  Milligrads(s.v).c_str(), Metres(s.e).c_str(), Milligrads(s.vz).c_str(),
+                  Metres(s.ez).c_str());
 }
 
 bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& mat) {

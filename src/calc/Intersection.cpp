@@ -1,8 +1,8 @@
 #include "calc/Intersection.h"
 
-#include "calc/SightingReduction.h"
 #include "calc/IntersectionTexts.h"
 #include "calc/Rays.h"
+#include "calc/SightingReduction.h"
 #include "core/Angles.h"
 
 #include <Eigen/Dense>
@@ -12,8 +12,6 @@
 namespace pyr {
 
 namespace {
-
-constexpr double kGonPerRadian = 200.0 / kPi;
 
 void ResetOutputs(InterResult& result) {
     result.first = result.second = -1;
@@ -26,11 +24,6 @@ void ResetOutputs(InterResult& result) {
     result.status.clear();
     for (InterSighting& s : result.sightings)
         s.v = s.e = s.vz = s.ez = s.zi = kUndefined;
-}
-
-// The bearing of the line of sight: the station's orientation plus the direction read.
-double SightedBearing(const InterSighting& s) {
-    return s.v0 + s.ah;
 }
 
 // A direction misclosure or residual brought within [-200, 200] gr.
@@ -67,10 +60,10 @@ std::optional<Eigen::Matrix2d> AdjustDirections(InterResult& result, const std::
         const double dx = result.x0 - s.xs, dy = result.y0 - s.ys;
         const double d2 = dx * dx + dy * dy;
         const auto row = static_cast<Eigen::Index>(k);
-        a(row, 0) = kGonPerRadian * dy / d2;
-        a(row, 1) = -kGonPerRadian * dx / d2;
+        a(row, 0) = RadiansToGrads(dy / d2);
+        a(row, 1) = -RadiansToGrads(dx / d2);
         // Computed less observed direction.
-        w(row) = Centred(WrapGrads(std::atan2(dx, dy) * kGonPerRadian - s.v0) - s.ah);
+        w(row) = Centred(WrapGrads(RadiansToGrads(std::atan2(dx, dy)) - s.v0) - s.ah);
     }
     const Eigen::FullPivLU<Eigen::Matrix2d> lu(a.transpose() * a);
     if (!lu.isInvertible()) return std::nullopt;
@@ -165,9 +158,9 @@ struct Zenith {
 };
 Zenith ZenithTo(const InterSighting& s, double z) {
     const double h = (z - s.zs - s.hi + s.hp - CurvatureRefraction(s.dh)) / s.dh;
-    const double zc = 100.0 - std::atan(h) * kGonPerRadian;
+    const double zc = 100.0 - RadiansToGrads(std::atan(h));
     const double sine = SinGrads(zc);
-    return {zc, sine * sine * kGonPerRadian / s.dh};
+    return {zc, RadiansToGrads(sine * sine / s.dh)};
 }
 
 void ComputeAltimetry(InterResult& result) {
@@ -223,6 +216,10 @@ void ComputeAltimetry(InterResult& result) {
 }
 
 } // namespace
+
+double SightedBearing(const InterSighting& s) {
+    return IsKnown(s.v0) && IsKnown(s.ah) ? WrapGrads(s.v0 + s.ah) : kUndefined;
+}
 
 bool UsableInPlanimetry(const InterSighting& s) {
     return IsKnown(s.xs) && IsKnown(s.ys) && IsKnown(s.v0) && IsKnown(s.ah);

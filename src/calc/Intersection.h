@@ -86,6 +86,9 @@ struct InterResult {
     std::string status; // the French text of a failure of the planimetry, "" otherwise
 };
 
+// The bearing of the line of sight, V0 + AH in [0, 400), when both are known.
+double SightedBearing(const InterSighting& sighting);
+
 // A sighting that takes part in the planimetry: its station's coordinates, the station's V0 and the
 // horizontal direction are known.
 bool UsableInPlanimetry(const InterSighting& sighting);

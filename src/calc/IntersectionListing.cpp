@@ -15,23 +15,17 @@
 
 namespace pyr {
 
-namespace {
-
-// A residual in grads written in milligrads to a tenth, "-" when unknown; a rounded zero has no sign.
 std::string Milligrads(double grads) {
     if (IsUndefined(grads)) return "-";
     return FormatFixed(std::round(grads * 1e4) / 10.0 + 0.0, 1);
 }
 
+namespace {
+
 // The station and its occurrence under the heading "Station       R".
 std::string StationCell(const InterSighting& s) {
     if (s.reprise <= 0) return s.station;
     return Sprintf("%-13s %d", s.station.c_str(), s.reprise);
-}
-
-// The sighted bearing V0 + AH, when both are known.
-double SightedBearing(const InterSighting& s) {
-    return IsKnown(s.v0) && IsKnown(s.ah) ? WrapGrads(s.v0 + s.ah) : kUndefined;
 }
 
 void WritePlanimetry(CDlgCfgListing& listing, const InterResult& result) {

@@ -2,6 +2,8 @@
 
 #include "calc/Intersection.h"
 
+#include <string>
+
 namespace pyr {
 
 class CDlgCfgListing;
@@ -12,5 +14,8 @@ class CDlgCfgListing;
 // not be computed). The altimetry: the table of the sightings that gave an altitude, the mean and
 // computed altitudes and the error. X and Y in the surveyor's order; an unknown value is "-".
 void WriteIntersectionResult(CDlgCfgListing& listing, const InterResult& result);
+
+// A residual in grads written in milligrads to a tenth, "-" when unknown; a rounded zero has no sign.
+std::string Milligrads(double grads);
 
 } // namespace pyr
