@@ -194,19 +194,5 @@ TEST_F(Intersection, WrittenWithTheInvariantQuestionsJournalledAndSavedOnLeaving
     EXPECT_EQ(plani, 1);
 }
 
-TEST_F(Intersection, ANewPointIsCreatedToTheTenthOfAMillimetre) {
-    ASSERT_TRUE(Open());
-    ASSERT_TRUE(dialog.ChoosePoint("P"));
-    dialog.AddAll();
-    ASSERT_TRUE(dialog.WritePoint());
-    ASSERT_TRUE(dialog.Save());
-    const CCarnet saved = Saved();
-    const int p = saved.findMat("P");
-    ASSERT_GE(p, 0);
-    EXPECT_NEAR(saved.xAt(p), kP.x, 1e-9);
-    EXPECT_NEAR(saved.yAt(p), kP.y, 1e-9);
-    EXPECT_NEAR(saved.zAt(p), kP.z, 1e-9);
-}
-
 } // namespace
 } // namespace pyr::test
