@@ -1,6 +1,7 @@
 #include "ui/Dialog.h"
 
 #include "core/Strings.h"
+#include "ui/Form.h"
 
 namespace pyr::ui {
 
@@ -61,6 +62,10 @@ void DialogOptions::Switch(std::string name, std::string help, std::function<std
     option.help = std::move(help);
     option.apply = std::move(apply);
     m_options.push_back(std::move(option));
+}
+
+std::unique_ptr<Form> Dialog::MakeForm() {
+    return nullptr;
 }
 
 } // namespace pyr::ui

@@ -3,6 +3,7 @@
 #include "ui/DialogModel.h"
 
 #include <functional>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -10,6 +11,7 @@
 // The face of a dialog that a front end runs: the options by which a command line drives it, and its run.
 namespace pyr::ui {
 
+class Form;
 class FrontEnd;
 
 // The options by which a dialog's values are set and its actions run from a command line. Each dialog
@@ -79,6 +81,9 @@ public:
     // Runs the dialog with the person at the front end, after the options were applied: what the dialog
     // does until it is closed.
     virtual DialogResult Run(FrontEnd& frontEnd) = 0;
+    // The dialog as a window shows it (Form.h), over the same model; null for a dialog that has no window
+    // yet, which a desktop front end then runs as a command line would without options.
+    virtual std::unique_ptr<Form> MakeForm();
 };
 
 } // namespace pyr::ui
