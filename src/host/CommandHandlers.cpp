@@ -85,4 +85,11 @@ void OnPending(const CommandEntry& command) {
     RunPending(command);
 }
 
+bool CommandAvailable(const CommandEntry& command) {
+    if (command.handler == OnPending || command.handler == OnExport || command.handler == OnTabCode)
+        return false;
+    if (command.handler == OnReadFieldBook) return FindFieldBookFormat(command.localName).has_value();
+    return true;
+}
+
 } // namespace pyr::host

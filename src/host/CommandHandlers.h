@@ -26,4 +26,7 @@ void OnTabCode(const CommandEntry& command);
 // A command whose dialog this version does not have yet.
 void OnPending(const CommandEntry& command);
 
+// Whether the command's handler does its work in this version, rather than saying it is not available.
+bool CommandAvailable(const CommandEntry& command);
+
 } // namespace pyr::host

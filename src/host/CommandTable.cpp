@@ -60,6 +60,11 @@ public:
             if (EqualIgnoringCase(command.globalName, globalName)) return command.title ? command.title : "";
         return {};
     }
+    bool Available(std::string_view globalName) const override {
+        for (const CommandEntry& command : kCommands)
+            if (EqualIgnoringCase(command.globalName, globalName)) return CommandAvailable(command);
+        return false;
+    }
 };
 
 CommandTitles g_titles;

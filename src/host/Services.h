@@ -63,6 +63,9 @@ class CPyrCommandTitles : public AcRxObject {
 public:
     // The title of the command of that global name, empty when it has none.
     virtual std::string Title(std::string_view globalName) const = 0;
+    // Whether this version does the command's work (the others say that it is not available yet): a
+    // desktop host greys their buttons.
+    virtual bool Available(std::string_view globalName) const = 0;
 };
 
 } // namespace pyr::host

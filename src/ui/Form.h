@@ -41,13 +41,13 @@ inline constexpr int kIdCancel = 2;
 struct Control {
     int id = 0; // unique in the dialog, above 2 but for OK and Cancel
     ControlKind kind = ControlKind::Label;
-    std::string name; // a stable name in the code ("ajouterUne"): the widget's name for tests and captures
-    std::string text; // a label, a button, a check box, a group or page title, with "&" before its accelerator
+    std::string name{}; // a stable name in the code ("ajouterUne"): the widget's name for tests and captures
+    std::string text{}; // a label, a button, a check box, a group or page title, with "&" before its accelerator
     int parent = 0;   // 0 the dialog itself, a Group or Page id, or kButtonRow
     int row = 0, column = 0, rowSpan = 1, columnSpan = 1; // the place in the parent's grid
     int buddy = 0;                    // a label: the control its accelerator gives the focus to
     bool isDefault = false;           // a button: the one Enter presses
-    std::vector<std::string> columns; // a list shown as a table: the column headings
+    std::vector<std::string> columns{}; // a list shown as a table: the column headings
     int width = 0;                    // an edit, a field or a list: the characters it shows at least
     int lines = 0;                    // a list: the lines it shows at least
 };
@@ -56,10 +56,10 @@ struct ControlState {
     bool enabled = true;
     bool visible = true;
     bool checked = false;           // a check box or a radio
-    std::string text;               // an edit, a field, a status line; a label or button whose text changes
-    std::vector<std::string> items; // the lines of a combo or a list; columns separated by '\t'
-    std::vector<std::string> tips;  // the tooltip of each line, when it has one
-    std::vector<bool> checks;       // a check list: each line checked or not
+    std::string text{};             // an edit, a field, a status line; a label or button whose text changes
+    std::vector<std::string> items{}; // the lines of a combo or a list; columns separated by '\t'
+    std::vector<std::string> tips{};  // the tooltip of each line, when it has one
+    std::vector<bool> checks{};       // a check list: each line checked or not
     int current = -1;               // the line chosen or highlighted, -1 for none
 };
 
@@ -77,7 +77,7 @@ struct Event {
     EventKind kind = EventKind::Click;
     int rank = -1;
     bool on = false;
-    std::string text;
+    std::string text{};
 };
 
 class Form {

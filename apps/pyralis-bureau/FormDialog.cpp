@@ -1,0 +1,441 @@
+#include "FormDialog.h"
+
+#include <QButtonGroup>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QFontMetrics>
+#include <QGridLayout>
+#include <QGroupBox>
+#include <QHBoxLayout>
+#include <QHeaderView>
+#include <QKeyEvent>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QSignalBlocker>
+#include <QTabWidget>
+#include <QTimer>
+#include <QTreeWidget>
+#include <QVBoxLayout>
+
+namespace pyr::bureau {
+
+using ui::ControlKind;
+using ui::EventKind;
+
+namespace {
+
+QString Text(const std::string& text) {
+    return QString::fromStdString(text);
+}
+
+// The width of `characters` average characters of the widget's font.
+int CharactersWide(const QWidget* widget, int characters) {
+    return QFontMetrics(widget->font()).averageCharWidth() * characters;
+}
+
+void SetLines(QListWidget* list, const std::vector<std::string>& items) {
+    list->clear();
+    for (const std::string& item : items)
+        list->addItem(Text(item));
+}
+
+void SetRows(QTreeWidget* table, const std::vector<std::string>& items, const std::vector<std::string>& tips) {
+    table->clear();
+    QList<QTreeWidgetItem*> rows;
+    rows.reserve(static_cast<qsizetype>(items.size()));
+    for (std::size_t rank = 0; rank < items.size(); ++rank) {
+        auto* row = new QTreeWidgetItem(Text(items[rank]).split('\t'));
+        if (rank < tips.size())
+            for (int column = 0; column < row->columnCount(); ++column)
+                row->setToolTip(column, Text(tips[rank]));
+        rows.append(row);
+    }
+    table->addTopLevelItems(rows);
+    for (int column = 0; column < table->columnCount(); ++column)
+        table->resizeColumnToContents(column);
+}
+
+} // namespace
+
+FormDialog::FormDialog(ui::Form& form, ui::FrontEnd& frontEnd, QWidget* parent)
+    : QDialog(parent), m_form(form), m_frontEnd(frontEnd) {
+    setWindowTitle(Text(m_form.Caption()));
+    setObjectName("dialogue");
+    Build();
+    // A change of the model outside an action (a question answered, a file chosen) is shown once the
+    // action that caused it is over.
+    m_listener = m_form.Model().Listen([this](int) {
+        if (m_refreshQueued) return;
+        m_refreshQueued = true;
+        QTimer::singleShot(0, this, [this] {
+            m_refreshQueued = false;
+            Refresh();
+        });
+    });
+    Refresh();
+}
+
+FormDialog::~FormDialog() {
+    m_form.Model().StopListening(m_listener);
+}
+
+QWidget* FormDialog::Widget(int id) const {
+    const auto found = m_byId.find(id);
+    return found == m_byId.end() ? nullptr : m_controls[found->second].widget;
+}
+
+QGridLayout* FormDialog::GridOf(int parent) {
+    const auto found = m_grids.find(parent);
+    return found == m_grids.end() ? m_grids.at(0) : found->second;
+}
+
+void FormDialog::Build() {
+    auto* layout = new QVBoxLayout(this);
+    auto* body = new QWidget(this);
+    auto* grid = new QGridLayout(body);
+    grid->setContentsMargins(0, 0, 0, 0);
+    m_grids[0] = grid;
+    layout->addWidget(body);
+
+    const std::vector<ui::Control> controls = m_form.Controls();
+    bool hasPages = false;
+    for (const ui::Control& control : controls)
+        hasPages |= control.kind == ControlKind::Page;
+    if (hasPages) {
+        m_pages = new QTabWidget(this);
+        m_pages->setObjectName("pages");
+        layout->addWidget(m_pages);
+        connect(m_pages, &QTabWidget::currentChanged, this, [this](int rank) {
+            if (!m_refreshing) Act(0, {EventKind::Page, rank, false, {}});
+        });
+    }
+    auto* foot = new QHBoxLayout;
+    foot->addStretch(1);
+    m_buttonRow = foot;
+    layout->addLayout(foot);
+
+    m_controls.reserve(controls.size());
+    for (const ui::Control& control : controls) {
+        QWidget* widget = Make(control);
+        m_byId[control.id] = m_controls.size();
+        m_controls.push_back({control, widget, {}, {}});
+        Place(control, widget);
+    }
+    for (Shown& shown : m_controls) {
+        if (shown.control.kind == ControlKind::Label && shown.control.buddy != 0)
+            if (QWidget* buddy = Widget(shown.control.buddy))
+                static_cast<QLabel*>(shown.widget)->setBuddy(buddy);
+        Connect(shown);
+    }
+    // Nothing stretched into empty space: the grids keep their rows together at the top.
+    for (const auto& [parent, parentGrid] : m_grids)
+        parentGrid->setRowStretch(parentGrid->rowCount(), 1);
+    if (body->layout()->isEmpty()) body->hide();
+}
+
+QWidget* FormDialog::Make(const ui::Control& control) {
+    QWidget* widget = nullptr;
+    const QString text = Text(control.text);
+    switch (control.kind) {
+    case ControlKind::Label:
+        widget = new QLabel(text);
+        break;
+    case ControlKind::Field: {
+        auto* field = new QLineEdit;
+        field->setReadOnly(true);
+        field->setFocusPolicy(Qt::ClickFocus);
+        field->setAlignment(Qt::AlignRight);
+        widget = field;
+        break;
+    }
+    case ControlKind::Edit:
+        widget = new QLineEdit;
+        break;
+    case ControlKind::Check:
+        widget = new QCheckBox(text);
+        break;
+    case ControlKind::Radio: {
+        auto* radio = new QRadioButton(text);
+        QButtonGroup*& group = m_radioGroups[control.parent];
+        if (!group) group = new QButtonGroup(this);
+        group->addButton(radio);
+        widget = radio;
+        break;
+    }
+    case ControlKind::Combo:
+    case ControlKind::EditCombo: {
+        auto* combo = new QComboBox;
+        combo->setEditable(control.kind == ControlKind::EditCombo);
+        combo->setInsertPolicy(QComboBox::NoInsert);
+        combo->setMaxVisibleItems(20);
+        widget = combo;
+        break;
+    }
+    case ControlKind::List:
+        if (!control.columns.empty()) {
+            auto* table = new QTreeWidget;
+            QStringList headings;
+            for (const std::string& column : control.columns)
+                headings << Text(column);
+            table->setHeaderLabels(headings);
+            table->setRootIsDecorated(false);
+            table->setUniformRowHeights(true);
+            table->setAlternatingRowColors(true);
+            widget = table;
+        } else {
+            auto* list = new QListWidget;
+            list->setUniformItemSizes(true);
+            widget = list;
+        }
+        break;
+    case ControlKind::CheckList:
+        widget = new QListWidget;
+        break;
+    case ControlKind::Button: {
+        auto* button = new QPushButton(text);
+        button->setDefault(control.isDefault);
+        widget = button;
+        break;
+    }
+    case ControlKind::Status: {
+        auto* status = new QLabel;
+        status->setFrameShape(QFrame::StyledPanel);
+        status->setFrameShadow(QFrame::Sunken);
+        status->setWordWrap(true);
+        status->setMinimumHeight(QFontMetrics(status->font()).height() + 8);
+        widget = status;
+        break;
+    }
+    case ControlKind::Group: {
+        auto* group = new QGroupBox(text);
+        m_grids[control.id] = new QGridLayout(group);
+        widget = group;
+        break;
+    }
+    case ControlKind::Page: {
+        auto* page = new QWidget;
+        m_grids[control.id] = new QGridLayout(page);
+        widget = page;
+        break;
+    }
+    }
+    widget->setObjectName(control.name.empty() ? QString("c%1").arg(control.id) : Text(control.name));
+    if (control.width > 0) widget->setMinimumWidth(CharactersWide(widget, control.width));
+    if (control.lines > 0)
+        widget->setMinimumHeight(QFontMetrics(widget->font()).lineSpacing() * (control.lines + 1) + 6);
+    return widget;
+}
+
+void FormDialog::Place(const ui::Control& control, QWidget* widget) {
+    if (control.kind == ControlKind::Page) {
+        m_pages->addTab(widget, Text(control.text));
+        return;
+    }
+    if (control.parent == ui::kButtonRow) {
+        m_buttonRow->addWidget(widget);
+        return;
+    }
+    QGridLayout* grid = GridOf(control.parent);
+    Qt::Alignment alignment;
+    if (control.kind == ControlKind::Label) alignment = Qt::AlignVCenter | Qt::AlignLeft;
+    grid->addWidget(widget, control.row, control.column, control.rowSpan, control.columnSpan, alignment);
+}
+
+void FormDialog::Connect(Shown& shown) {
+    const int id = shown.control.id;
+    QWidget* widget = shown.widget;
+    switch (shown.control.kind) {
+    case ControlKind::Edit: {
+        auto* edit = static_cast<QLineEdit*>(widget);
+        connect(edit, &QLineEdit::editingFinished, this, [this, id, edit] {
+            if (m_refreshing || !edit->isModified()) return;
+            edit->setModified(false);
+            Act(id, {EventKind::Text, -1, false, edit->text().toStdString()});
+        });
+        break;
+    }
+    case ControlKind::Check:
+    case ControlKind::Radio: {
+        // A radio turned off by the one turned on says nothing of its own.
+        const bool radio = shown.control.kind == ControlKind::Radio;
+        connect(static_cast<QAbstractButton*>(widget), &QAbstractButton::toggled, this, [this, id, radio](bool on) {
+            if (!m_refreshing && (on || !radio)) Act(id, {EventKind::Check, -1, on, {}});
+        });
+        break;
+    }
+    case ControlKind::Combo:
+    case ControlKind::EditCombo: {
+        auto* combo = static_cast<QComboBox*>(widget);
+        connect(combo, &QComboBox::activated, this, [this, id](int rank) {
+            if (!m_refreshing) Act(id, {EventKind::Select, rank, false, {}});
+        });
+        if (QLineEdit* typed = combo->lineEdit())
+            connect(typed, &QLineEdit::returnPressed, this, [this, id, combo] {
+                if (m_refreshing) return;
+                const int rank = combo->findText(combo->currentText(), Qt::MatchFixedString);
+                if (rank < 0) Act(id, {EventKind::Text, -1, false, combo->currentText().toStdString()});
+            });
+        break;
+    }
+    case ControlKind::List:
+        if (auto* table = qobject_cast<QTreeWidget*>(widget)) {
+            connect(table, &QTreeWidget::currentItemChanged, this, [this, id, table](QTreeWidgetItem* item) {
+                if (!m_refreshing) Act(id, {EventKind::Select, table->indexOfTopLevelItem(item), false, {}});
+            });
+            connect(table, &QTreeWidget::itemDoubleClicked, this, [this, id, table](QTreeWidgetItem* item) {
+                Act(id, {EventKind::Activate, table->indexOfTopLevelItem(item), false, {}});
+            });
+        } else {
+            auto* list = static_cast<QListWidget*>(widget);
+            connect(list, &QListWidget::currentRowChanged, this, [this, id](int rank) {
+                if (!m_refreshing) Act(id, {EventKind::Select, rank, false, {}});
+            });
+            connect(list, &QListWidget::itemDoubleClicked, this, [this, id, list](QListWidgetItem* item) {
+                Act(id, {EventKind::Activate, list->row(item), false, {}});
+            });
+        }
+        break;
+    case ControlKind::CheckList: {
+        auto* list = static_cast<QListWidget*>(widget);
+        connect(list, &QListWidget::itemChanged, this, [this, id, list](QListWidgetItem* item) {
+            if (!m_refreshing)
+                Act(id, {EventKind::CheckLine, list->row(item), item->checkState() == Qt::Checked, {}});
+        });
+        connect(list, &QListWidget::currentRowChanged, this, [this, id](int rank) {
+            if (!m_refreshing) Act(id, {EventKind::Select, rank, false, {}});
+        });
+        break;
+    }
+    case ControlKind::Button:
+        connect(static_cast<QPushButton*>(widget), &QPushButton::clicked, this,
+                [this, id] { Act(id, {EventKind::Click, -1, false, {}}); });
+        break;
+    default:
+        break;
+    }
+}
+
+void FormDialog::Act(int id, const ui::Event& event) {
+    m_form.Act(m_frontEnd, id, event);
+    if (const std::optional<ui::DialogResult> ended = m_form.Ended()) {
+        m_result = *ended;
+        done(*ended == ui::DialogResult::Ok ? QDialog::Accepted : QDialog::Rejected);
+        return;
+    }
+    Refresh();
+    if (const int focus = m_form.FocusRequest())
+        if (QWidget* widget = Widget(focus)) widget->setFocus(Qt::OtherFocusReason);
+}
+
+void FormDialog::reject() {
+    Act(ui::kIdCancel, {EventKind::Click, -1, false, {}});
+}
+
+void FormDialog::keyPressEvent(QKeyEvent* event) {
+    // Enter in a name typed into a drop-down list chooses that name, not the dialog's default button.
+    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (enter && focusWidget() && qobject_cast<QComboBox*>(focusWidget()->parentWidget())) {
+        event->accept();
+        return;
+    }
+    QDialog::keyPressEvent(event);
+}
+
+void FormDialog::Refresh() {
+    m_refreshing = true;
+    for (Shown& shown : m_controls)
+        Show(shown, m_form.State(shown.control.id));
+    m_refreshing = false;
+}
+
+void FormDialog::Show(Shown& shown, const ui::ControlState& state) {
+    QWidget* widget = shown.widget;
+    const ui::Control& control = shown.control;
+    if (control.kind == ControlKind::Page) {
+        m_pages->setTabEnabled(m_pages->indexOf(widget), state.enabled);
+        return;
+    }
+    widget->setEnabled(state.enabled);
+    widget->setVisible(state.visible);
+    const QString text = Text(state.text);
+    switch (control.kind) {
+    case ControlKind::Label:
+        if (!state.text.empty()) static_cast<QLabel*>(widget)->setText(text);
+        break;
+    case ControlKind::Status:
+        static_cast<QLabel*>(widget)->setText(text);
+        break;
+    case ControlKind::Field:
+    case ControlKind::Edit: {
+        auto* edit = static_cast<QLineEdit*>(widget);
+        // A text being typed stays as the person types it until committed.
+        if (edit->text() != text && !(control.kind == ControlKind::Edit && edit->isModified()))
+            edit->setText(text);
+        break;
+    }
+    case ControlKind::Check:
+    case ControlKind::Radio:
+        static_cast<QAbstractButton*>(widget)->setChecked(state.checked);
+        if (!state.text.empty()) static_cast<QAbstractButton*>(widget)->setText(text);
+        break;
+    case ControlKind::Button:
+        if (!state.text.empty()) static_cast<QAbstractButton*>(widget)->setText(text);
+        break;
+    case ControlKind::Group:
+        if (!state.text.empty()) static_cast<QGroupBox*>(widget)->setTitle(text);
+        break;
+    case ControlKind::Combo:
+    case ControlKind::EditCombo:
+    case ControlKind::List:
+    case ControlKind::CheckList:
+        ShowLines(shown, state);
+        break;
+    case ControlKind::Page:
+        break;
+    }
+}
+
+void FormDialog::ShowLines(Shown& shown, const ui::ControlState& state) {
+    const bool changed = shown.items != state.items || shown.tips != state.tips;
+    const QSignalBlocker blocker(shown.widget);
+    if (auto* combo = qobject_cast<QComboBox*>(shown.widget)) {
+        if (changed) {
+            const QString typed = combo->currentText();
+            combo->clear();
+            QStringList items;
+            items.reserve(static_cast<qsizetype>(state.items.size()));
+            for (const std::string& item : state.items)
+                items << Text(item);
+            combo->addItems(items);
+            if (combo->isEditable()) combo->setEditText(typed);
+        }
+        if (combo->currentIndex() != state.current || changed) combo->setCurrentIndex(state.current);
+    } else if (auto* table = qobject_cast<QTreeWidget*>(shown.widget)) {
+        if (changed) SetRows(table, state.items, state.tips);
+        QTreeWidgetItem* current = state.current >= 0 ? table->topLevelItem(state.current) : nullptr;
+        if (table->currentItem() != current) table->setCurrentItem(current);
+        if (!current) table->clearSelection();
+    } else if (auto* list = qobject_cast<QListWidget*>(shown.widget)) {
+        if (changed) SetLines(list, state.items);
+        const bool checkList = shown.control.kind == ControlKind::CheckList;
+        for (int row = 0; row < list->count(); ++row) {
+            QListWidgetItem* item = list->item(row);
+            const auto rank = static_cast<std::size_t>(row);
+            if (changed && rank < state.tips.size()) item->setToolTip(Text(state.tips[rank]));
+            if (checkList) {
+                item->setFlags(item->flags() | Qt::ItemIsUserCheckable);
+                const bool on = rank < state.checks.size() && state.checks[rank];
+                item->setCheckState(on ? Qt::Checked : Qt::Unchecked);
+            }
+        }
+        if (list->currentRow() != state.current) list->setCurrentRow(state.current);
+        if (state.current < 0) list->clearSelection();
+    }
+    shown.items = state.items;
+    shown.tips = state.tips;
+}
+
+} // namespace pyr::bureau

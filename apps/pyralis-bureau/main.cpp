@@ -1,0 +1,4 @@
+// pyralis-bureau: the desktop host (being built).
+int main() {
+    return 0;
+}
