@@ -4,6 +4,7 @@
 #   make bench   build in Release and run the benchmarks
 #   make fuzz    build the fuzz targets with clang and run each for FUZZ_SECONDS (60) seconds
 #   make fiabilite  build in Release and kill pyralis 1 000 times while it saves a 100 000-element GéoBase
+#   make bureau  install what is missing, build in Release and open pyralis-bureau on the demo GéoBase
 #   make format  apply .clang-format to every source file
 
 JOBS ?= $(shell nproc)
@@ -16,7 +17,7 @@ FUZZ_TARGETS := fuzz_geo_load fuzz_sepcol fuzz_gsi fuzz_quendal fuzz_geodim fuzz
 KILLS ?= 1000
 DEMO_DIR := build/demo-out
 
-.PHONY: all deps release demo check bench fuzz fiabilite format clean
+.PHONY: all deps release demo bureau check bench fuzz fiabilite format clean
 
 all: release
 
@@ -49,6 +50,13 @@ demo: release
 	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalculV0 --type toutes --enregistrer \
 		--listing $(DEMO_DIR)/carnet-tilleuls.cv0 </dev/null
 	@cat $(DEMO_DIR)/carnet-tilleuls.cv0
+
+# The desktop host on a copy of the demo job, with the demo's own parameter file. Without a display it
+# says so, and `pyralis-bureau --capture FICHIER.png` still draws its window into an image.
+bureau: release
+	@mkdir -p $(DEMO_DIR)
+	@test -f $(DEMO_DIR)/chantier-demo.geo || cp data/chantier-demo.geo $(DEMO_DIR)/
+	$(RELEASE_DIR)/bin/pyralis-bureau --params $(DEMO_DIR)/Pyralis.ini --geobase $(DEMO_DIR)/chantier-demo.geo
 
 check: deps
 	cmake -S . -B $(CHECK_DIR) -G Ninja -DCMAKE_BUILD_TYPE=Debug -DPYR_SANITIZE=ON -DPYR_WERROR=ON

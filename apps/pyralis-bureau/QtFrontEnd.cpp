@@ -134,12 +134,16 @@ void QtFrontEnd::TextLine(std::string_view line) {
 }
 
 ui::DialogResult QtFrontEnd::DoModal(ui::Dialog& dialog) {
+    const bool capturing = !m_capture.empty() && !m_captured;
+    if (capturing && !m_geoBase.empty()) dialog.SetGeoBase(m_geoBase);
     std::unique_ptr<ui::Form> form = dialog.MakeForm();
     // A dialog that has no window yet runs as a command line without options would run it.
     if (!form) return dialog.Run(*this);
     if (!form->Open(*this)) return form->Ended().value_or(ui::DialogResult::Failed);
     FormDialog window(*form, *this, m_parent);
-    if (Unattended() && !m_captured) return Capture(window);
+    if (capturing) return Capture(window);
+    // Nobody is there to close a dialog: it is not shown.
+    if (Unattended()) return ui::DialogResult::Cancel;
     window.exec();
     return window.Result();
 }

@@ -26,8 +26,15 @@ public:
     // The window that parents the dialogs and message boxes, and the text window of the lines.
     void SetParent(QWidget* parent) { m_parent = parent; }
     void SetTextWindow(TextWindow* textWindow) { m_textWindow = textWindow; }
-    // Capture mode: the first dialog with a form is saved as a PNG in `path`.
-    void SetCapture(std::string path) { m_capture = std::move(path); }
+    // Nobody at the window (a capture): messages go to the error output, questions take their default.
+    void SetUnattended(bool unattended) { m_unattended = unattended; }
+    // Capture of a dialog: the first dialog with a form is saved as a PNG in `path`, on `geoBase` when
+    // one is given, and closed.
+    void SetCapture(std::string path, std::string geoBase) {
+        m_unattended = true;
+        m_capture = std::move(path);
+        m_geoBase = std::move(geoBase);
+    }
     bool Captured() const { return m_captured; }
     const std::string& CaptureFailure() const { return m_captureFailure; }
 
@@ -40,12 +47,14 @@ public:
     void ShowFile(const std::string& path) override;
 
 private:
-    bool Unattended() const { return !m_capture.empty(); }
+    bool Unattended() const { return m_unattended; }
     ui::DialogResult Capture(class FormDialog& window);
 
     QWidget* m_parent = nullptr;
     TextWindow* m_textWindow = nullptr;
+    bool m_unattended = false;
     std::string m_capture;
+    std::string m_geoBase;
     bool m_captured = false;
     std::string m_captureFailure;
 };
