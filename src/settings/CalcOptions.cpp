@@ -3,6 +3,7 @@
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
+#include "settings/ListingObject.h"
 #include "settings/ParamStore.h"
 
 #include <algorithm>
@@ -76,6 +77,11 @@ constexpr std::array kOptions = {
     OptionEntry{kSectionListings, "Inverser_XY", T::Switch, "0", 0, 1},
     OptionEntry{kSectionListings, "ControleV0Rayonne", T::Switch, "1", 0, 1},
     OptionEntry{kSectionListings, "RayonContenu", T::Text, "N,X,Y,Z,GI,DH"},
+    // The layout of every listing, which the listings page edits too: 0 rich text, 1 plain text in
+    // numbered pages, 2 plain text in one run; the page's length in lines and width in characters.
+    OptionEntry{kSectionListingLayout, kKeyListingFormat, T::Integer, "1", 0, 2},
+    OptionEntry{kSectionListingLayout, kKeyPageLength, T::Integer, "70", kMinPageLength, kMaxPageLength},
+    OptionEntry{kSectionListingLayout, kKeyPageWidth, T::Integer, "80", kMinPageWidth, kMaxPageWidth},
 
     // Levelling.
     OptionEntry{kSectionLevelling, "TypeTolerance", T::Integer, "0", 0, 2},
@@ -92,6 +98,21 @@ constexpr std::array kOptions = {
     OptionEntry{kSectionTolerances, "FermPlanimetr", T::Real, "0.01", 0, 100},
     OptionEntry{kSectionTolerances, "FermAltimetr", T::Real, "0.01", 0, 100},
 };
+
+// The listing object starts with the defaults of the table, before it reads the file.
+constexpr int IntegerDefault(std::string_view section, std::string_view key) {
+    for (const auto& entry : kOptions)
+        if (entry.section == section && entry.key == key) {
+            int value = 0;
+            for (char c : entry.defaultValue)
+                value = value * 10 + (c - '0');
+            return value;
+        }
+    return -1;
+}
+static_assert(IntegerDefault(kSectionListingLayout, kKeyListingFormat) == kDefaultListingFormat);
+static_assert(IntegerDefault(kSectionListingLayout, kKeyPageLength) == kDefaultPageLength);
+static_assert(IntegerDefault(kSectionListingLayout, kKeyPageWidth) == kDefaultPageWidth);
 
 // The decimals of the store: a sane range, whatever the file holds.
 constexpr int kMaxDecimals = 10;

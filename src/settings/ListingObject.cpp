@@ -3,7 +3,7 @@
 #include "core/Files.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
-#include "settings/ParamStore.h"
+#include "settings/CalcOptions.h"
 
 #include <algorithm>
 #include <cstdarg>
@@ -33,12 +33,11 @@ void CDlgCfgListing::SetPageWidth(int characters) {
     m_pageWidth = std::clamp(characters, kMinPageWidth, kMaxPageWidth);
 }
 
+// The defaults and limits are those of the options table, which the listings page edits.
 void CDlgCfgListing::ReadLastParameters(std::string_view paramPath) {
-    ReadParamInt(paramPath, kSectionListingLayout, kKeyListingFormat, kDefaultListingFormat, 0, 2, m_format);
-    ReadParamInt(paramPath, kSectionListingLayout, kKeyPageLength, kDefaultPageLength, kMinPageLength,
-                 kMaxPageLength, m_pageLength);
-    ReadParamInt(paramPath, kSectionListingLayout, kKeyPageWidth, kDefaultPageWidth, kMinPageWidth,
-                 kMaxPageWidth, m_pageWidth);
+    m_format = ReadOptionInt(paramPath, kSectionListingLayout, kKeyListingFormat);
+    m_pageLength = ReadOptionInt(paramPath, kSectionListingLayout, kKeyPageLength);
+    m_pageWidth = ReadOptionInt(paramPath, kSectionListingLayout, kKeyPageWidth);
 }
 
 // --- Output ------------------------------------------------------------------------------------------

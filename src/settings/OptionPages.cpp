@@ -2,6 +2,7 @@
 
 #include "core/Numbers.h"
 #include "core/Strings.h"
+#include "settings/ListingObject.h"
 #include "settings/OptionTexts.h"
 #include "settings/ParamStore.h"
 
@@ -56,6 +57,11 @@ std::string CheckOptionNumber(std::string_view section, std::string_view key, st
 // --- A page of the table ------------------------------------------------------------------------------
 
 COptionPage::COptionPage(std::string_view section) : m_section(section) {
+    AddSection(section);
+}
+
+void COptionPage::AddSection(std::string_view section) {
+    if (section != m_section) m_otherSections.push_back(section);
     for (const auto& entry : CalcOptionTable()) {
         if (entry.section != section) continue;
         OptionValue value;
@@ -110,10 +116,29 @@ bool COptionPage::WriteKey(std::string_view paramPath, std::string_view key) con
     return false;
 }
 
+bool COptionPage::Holds(std::string_view section) const {
+    return EqualIgnoringCase(m_section, section) ||
+           std::any_of(m_otherSections.begin(), m_otherSections.end(),
+                       [section](std::string_view other) { return EqualIgnoringCase(other, section); });
+}
+
+std::string_view COptionPage::SectionOf(std::string_view key) const {
+    const OptionValue* value = Find(key);
+    return value ? value->entry->section : m_section;
+}
+
+// A section under its heading, an empty line between two sections, as the file shows them.
 std::vector<std::string> COptionPage::Lines() const {
     std::vector<std::string> lines{"[" + std::string(m_section) + "]"};
-    for (const auto& value : m_values)
+    std::string_view section = m_section;
+    for (const auto& value : m_values) {
+        if (value.entry->section != section) {
+            section = value.entry->section;
+            lines.emplace_back();
+            lines.push_back("[" + std::string(section) + "]");
+        }
         lines.push_back(std::string(value.entry->key) + "=" + ValueText(value));
+    }
     return lines;
 }
 
@@ -185,6 +210,10 @@ OptionValue* COptionPage::Find(std::string_view key) {
 }
 
 // --- Listings -------------------------------------------------------------------------------------------
+
+CPagOptionListing::CPagOptionListing() : COptionPage(kSectionListings) {
+    AddSection(kSectionListingLayout);
+}
 
 void CPagOptionListing::AddRadiatedColumn(std::string_view column) {
     SetText("RayonContenu", Text("RayonContenu") + "," + std::string(column));

@@ -5,6 +5,7 @@
 #include "ui/Dialog.h"
 
 #include <array>
+#include <memory>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -33,7 +34,12 @@ class COptionPage {
 public:
     virtual ~COptionPage() = default;
 
+    // The page's section; a page may also hold the keys of another (the listings page holds the layout
+    // of the listings), each key then written in its own section.
     std::string_view Section() const { return m_section; }
+    bool Holds(std::string_view section) const;
+    // The section a key of the page lives in (the page's own for a key it does not know).
+    std::string_view SectionOf(std::string_view key) const;
 
     // Reads every key of the page from the parameter path.
     virtual void Read(std::string_view paramPath);
@@ -64,13 +70,16 @@ public:
 
 protected:
     explicit COptionPage(std::string_view section);
+    // The keys of another section of the table, after those of the page's own.
+    void AddSection(std::string_view section);
 
 private:
     const OptionValue* Find(std::string_view key) const;
     OptionValue* Find(std::string_view key);
 
     std::string_view m_section;
-    std::vector<OptionValue> m_values; // in the order of the table
+    std::vector<std::string_view> m_otherSections;
+    std::vector<OptionValue> m_values; // in the order of the table, section by section
 };
 
 // Instruments. The list, numbered from 0, always starts with "Appareil Standard" (OptionInstruments.h).
@@ -123,10 +132,11 @@ public:
     CPagOptionLinkDB() : COptionPage(kSectionDatabase) {}
 };
 
-// Listings: "RayonContenu" lists the columns of the radiated-points listing.
+// Listings: "RayonContenu" lists the columns of the radiated-points listing. The page also holds the
+// layout of the listings, in its own section "Listings": the format, the page's length and width.
 class CPagOptionListing : public COptionPage {
 public:
-    CPagOptionListing() : COptionPage(kSectionListings) {}
+    CPagOptionListing();
 
     // The columns offered besides N, X, Y, Z, GI and DH.
     static constexpr std::array<const char*, 5> kExtraColumns = {"HP", "AH", "AV", "DI", "CS"};
@@ -157,6 +167,8 @@ public:
     std::string Caption() const override;
     void DeclareOptions(ui::DialogOptions& options) override;
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    // The sheet as a window: OptionPSheetForm.h.
+    std::unique_ptr<ui::Form> MakeForm() override;
 
     // The pages in their order.
     std::array<COptionPage*, 8> Pages();

@@ -26,7 +26,7 @@ std::array<COptionPage*, 8> COptionPSheet::Pages() {
 
 COptionPage* COptionPSheet::FindPage(std::string_view section) {
     for (COptionPage* page : Pages())
-        if (EqualIgnoringCase(page->Section(), section)) return page;
+        if (page->Holds(section)) return page;
     return nullptr;
 }
 
@@ -48,11 +48,15 @@ std::string COptionPSheet::Regler(std::string_view setting) {
     const std::string key(Trimmed(setting.substr(slash + 1, equal - slash - 1)));
     COptionPage* page = FindPage(section);
     if (!page) return Sprintf(kMsgUnknownSection, section.c_str());
+    // A page that holds two sections knows each key in its own only.
+    if (!EqualIgnoringCase(page->SectionOf(key), section))
+        return Sprintf(kMsgUnknownKey, section.c_str(), key.c_str());
     std::string refusal = page->Set(key, setting.substr(equal + 1));
     if (!refusal.empty()) return refusal;
-    // Kept under the name the page gives the key, so that a key given twice is written once.
+    // Kept under the names the page gives the section and the key, so that a key given twice is written
+    // once.
     std::string name = page->KeyAndValue(key).first;
-    std::pair<std::string, std::string> set(page->Section(), std::move(name));
+    std::pair<std::string, std::string> set(page->SectionOf(key), std::move(name));
     if (std::find(m_settings.begin(), m_settings.end(), set) == m_settings.end())
         m_settings.push_back(std::move(set));
     return {};

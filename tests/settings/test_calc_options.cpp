@@ -172,7 +172,7 @@ TEST_F(CalcOptions, TheValuesAreShownAsAnInitialisationFileShowsThem) {
     EXPECT_TRUE(std::regex_match(copy, std::regex(section + "(\n" + section + ")*"))) << copy;
     EXPECT_EQ(sections, (Words{"[Définitions_Des_Appareils]", "[Options_Calculs]", "[Options_Corrections]",
                                "[Options_Editeur]", "[Liaison_Base_de_Données]", "[Options_Listings]",
-                               "[Options_Nivellement]", "[Options_Tolerances]"}));
+                               "[Listings]", "[Options_Nivellement]", "[Options_Tolerances]"}));
     for (const char* line : {"Appareil0=Appareil Standard", "SigmaPpm0=0.000000", "RayonTerre=6378.000000"})
         EXPECT_NE(std::find(shown.begin(), shown.end(), line), shown.end()) << line;
 
