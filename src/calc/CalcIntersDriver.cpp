@@ -1,5 +1,6 @@
 #include "calc/CalcIntersDriver.h"
 
+#include "calc/CalcIntersForm.h"
 #include "calc/IntersectionListing.h"
 #include "calc/IntersectionTexts.h"
 #include "core/Numbers.h"
@@ -130,6 +131,10 @@ ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
     if (m_requests.computation.save && m_model.Modified() && !m_model.Save()) ok = false;
     m_model.Close(m_requests.computation.listing, m_requests.computation.listingPath);
     return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+std::unique_ptr<ui::Form> CCalcIntersDriver::MakeForm() {
+    return std::make_unique<CCalcIntersForm>(*this, m_model);
 }
 
 } // namespace pyr

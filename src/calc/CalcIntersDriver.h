@@ -4,6 +4,7 @@
 #include "calc/ComputationOptions.h"
 #include "ui/Dialog.h"
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
@@ -21,6 +22,8 @@ public:
     ui::DialogModel& Model() override { return m_model; }
     void DeclareOptions(ui::DialogOptions& options) override;
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    // The window, over the same model.
+    std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
     bool ComputePoint(ui::FrontEnd& frontEnd, const std::string& mat);

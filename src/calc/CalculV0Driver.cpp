@@ -1,5 +1,6 @@
 #include "calc/CalculV0Driver.h"
 
+#include "calc/CalculV0Form.h"
 #include "calc/CalculV0Texts.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -125,6 +126,10 @@ ui::DialogResult CCalculV0Driver::Run(ui::FrontEnd& frontEnd) {
     const bool saved = done && m_requests.computation.save && v0.Enregistrer();
     v0.Close(saved, m_requests.computation.listing, m_requests.computation.listingPath);
     return done && (saved || !m_requests.computation.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+std::unique_ptr<ui::Form> CCalculV0Driver::MakeForm() {
+    return std::make_unique<CCalculV0Form>(*this, m_model);
 }
 
 } // namespace pyr

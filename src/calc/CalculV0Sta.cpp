@@ -86,6 +86,13 @@ bool CCalculV0Sta::Open(ui::FrontEnd& frontEnd) {
     m_settings.tolerances = m_session.Tolerance();
     m_settings.reduction.correction = m_session.Reduction().correction;
     const int first = Carnet().Find(kKindStation, "");
+    std::unordered_map<std::string, int> setUps;
+    for (int i = first; i >= 0; i = Carnet().Find(kKindStation, "", i + 1)) {
+        const std::string name = Carnet().matAt(i);
+        const int reprise = ++setUps[name];
+        m_stationRank.emplace(i, static_cast<int>(m_stations.size()));
+        m_stations.push_back(reprise == 1 ? name : Sprintf("%s(%d)", name.c_str(), reprise));
+    }
     if (first < 0) {
         frontEnd.MessageBox(Sprintf(v0::kMsgNoStation, m_session.Path().c_str()), ui::kCaption,
                             ui::kIconWarning);
@@ -108,6 +115,11 @@ bool CCalculV0Sta::ChooseStation(std::string_view designation) {
         return false;
     }
     return ChooseStationAt(index);
+}
+
+int CCalculV0Sta::StationRank() const {
+    const auto found = m_stationRank.find(m_station.index);
+    return found == m_stationRank.end() ? -1 : found->second;
 }
 
 bool CCalculV0Sta::ChooseStationAt(int stationIndex) {

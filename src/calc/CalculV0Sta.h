@@ -72,6 +72,10 @@ public:
     bool ChooseStation(std::string_view designation);
     bool ChooseStationAt(int stationIndex);
     const StationPlace& Station() const { return m_station; }
+    // Every station occurrence of the GéoBase by its designation, in GéoBase order: "S1" for the first
+    // set-up on S1, "S1(2)" for the second; and the rank of the chosen one among them, -1 for none.
+    const std::vector<std::string>& Stations() const { return m_stations; }
+    int StationRank() const;
     // Coordinates typed for a station that the GéoBase does not place (Z may be kUndefined). False, with
     // a message, when the GéoBase already places it.
     bool SetStationCoordinates(double x, double y, double z);
@@ -123,6 +127,8 @@ private:
     bool m_settingsLoaded = false;
     V0CalculationType m_type = V0CalculationType::Unique;
 
+    std::vector<std::string> m_stations;
+    std::unordered_map<int, int> m_stationRank; // station element to its rank in m_stations
     StationPlace m_station;
     bool m_typedPlace = false;
     std::vector<Offered> m_offered;

@@ -1,5 +1,6 @@
 #include "calc/StationReductionDriver.h"
 
+#include "calc/StationReductionForm.h"
 #include "core/Strings.h"
 
 #include <string_view>
@@ -34,6 +35,10 @@ ui::DialogResult CReductionDriver::Run(ui::FrontEnd& frontEnd) {
     m_model.OnInitDialog();
     m_model.OnOK(frontEnd);
     return ui::DialogResult::Ok;
+}
+
+std::unique_ptr<ui::Form> CReductionDriver::MakeForm() {
+    return std::make_unique<CStationReductionForm>(*this, m_model);
 }
 
 } // namespace pyr

@@ -4,6 +4,7 @@
 #include "ui/Dialog.h"
 
 #include <array>
+#include <memory>
 #include <optional>
 #include <string>
 
@@ -22,6 +23,8 @@ public:
     void DeclareOptions(ui::DialogOptions& options) override;
     // Fails when no GéoBase was given to the reduction.
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    // The window, over the same model.
+    std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
     CReduction_Station m_model;

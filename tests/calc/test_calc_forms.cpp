@@ -1,0 +1,367 @@
+// The windows of the computations driven as a desktop host drives them: the person's actions sent to the
+// form, the states read back after each one. The GéoBases are built from exact coordinates, so that the
+// points and orientations found are known beforehand.
+#include "TestSupport.h"
+#include "calc/CalcIntersDriver.h"
+#include "calc/CalcIntersForm.h"
+#include "calc/CalculV0Driver.h"
+#include "calc/CalculV0Form.h"
+#include "calc/GeoLines.h"
+#include "calc/IntersectionTexts.h"
+#include "calc/StationReductionDriver.h"
+#include "calc/StationReductionForm.h"
+#include "core/Numbers.h"
+#include "geobase/Elements.h"
+#include "test_v0_geometry.h"
+#include "ui/ScriptedFrontEnd.h"
+
+#include <cctype>
+#include <gtest/gtest.h>
+#include <set>
+
+namespace pyr::test {
+namespace {
+
+using ui::EventKind;
+using ui::kIdCancel;
+using ui::kIdOk;
+
+constexpr double kTenthMm = 1e-4, kTenthMgon = 1e-4;
+
+// Listings in plain text beside the GéoBase, without a question of their names.
+constexpr const char* kListingOptions =
+    "[Options_Listings]\nChoixNomListing=0\nAfficherListing=0\n[Listings]\nFormat=2\n";
+
+struct Person {
+    ui::Form& form;
+    ui::ScriptedFrontEnd& frontEnd;
+    void Click(int id) { form.Act(frontEnd, id, {EventKind::Click, -1, false, {}}); }
+    void Check(int id, bool on) { form.Act(frontEnd, id, {EventKind::Check, -1, on, {}}); }
+    void Select(int id, int rank) { form.Act(frontEnd, id, {EventKind::Select, rank, false, {}}); }
+    void CheckLine(int id, int rank, bool on) {
+        form.Act(frontEnd, id, {EventKind::CheckLine, rank, on, {}});
+    }
+    void Type(int id, std::string text) {
+        form.Act(frontEnd, id, {EventKind::Text, -1, false, std::move(text)});
+    }
+    ui::ControlState operator[](int id) const { return form.State(id); }
+};
+
+CCarnet Load(const std::string& path) {
+    CCarnet carnet;
+    carnet.Load(nullptr, path);
+    return carnet;
+}
+
+// Every window a host may build: controls it can tell apart, labels that give the focus to a control
+// that exists, frames that hold them, one button for Enter and no accelerator twice.
+TEST(ComputationForms, TemplatesAreConsistentAndEveryAcceleratorIsUnique) {
+    CCalcIntersDriver intersection;
+    CCalculV0Driver v0;
+    CReductionDriver reduction;
+    for (ui::Dialog* dialog : std::initializer_list<ui::Dialog*>{&intersection, &v0, &reduction}) {
+        const auto form = dialog->MakeForm();
+        ASSERT_TRUE(form);
+        const std::vector<ui::Control> controls = form->Controls();
+        std::set<int> ids{0, ui::kButtonRow};
+        std::set<std::string> names;
+        std::set<char> keys;
+        int defaults = 0;
+        for (const ui::Control& control : controls) {
+            SCOPED_TRACE(control.name);
+            EXPECT_TRUE(ids.insert(control.id).second);
+            EXPECT_TRUE(names.insert(control.name).second);
+            EXPECT_TRUE(ids.count(control.parent)) << "a parent comes before what it holds";
+            defaults += control.isDefault;
+            const std::size_t mark = control.text.find('&');
+            if (mark == std::string::npos) continue;
+            const auto key = static_cast<unsigned char>(control.text[mark + 1]);
+            EXPECT_TRUE(keys.insert(static_cast<char>(std::tolower(key))).second);
+        }
+        for (const ui::Control& control : controls) {
+            EXPECT_TRUE(control.buddy == 0 || ids.count(control.buddy)) << control.name;
+        }
+        EXPECT_EQ(defaults, 1);
+        EXPECT_TRUE(ids.count(kIdCancel));
+    }
+}
+
+// P read from three oriented stations; Q from one only.
+class IntersectionForm : public ::testing::Test {
+protected:
+    IntersectionForm() {
+        const Place s1{1000.0, 2000.0, 100.0}, s2{1100.0, 2000.0, 101.0}, s3{1120.0, 2150.0, 99.0};
+        for (const auto& [name, place] : {std::pair{"S1", s1}, {"S2", s2}, {"S3", s3}})
+            AddPoint(job, name, place);
+        AddStation(job, "S1", 1.5, 50.0);
+        AddSighting(job, "P", s1, 1.5, kP, 1.3, 50.0, kKindMesure);
+        AddStation(job, "S2", 1.6, 120.0);
+        AddSighting(job, "P", s2, 1.6, kP, 1.3, 120.0, kKindMesure);
+        AddSighting(job, "Q", s2, 1.6, {1180.0, 2050.0, 100.0}, 1.3, 120.0, kKindMesure);
+        AddStation(job, "S3", 1.45, 333.3);
+        AddSighting(job, "P", s3, 1.45, kP, 1.3, 333.3, kKindMesure);
+    }
+    // The same GéoBase, in a folder of its own.
+    std::string Prepare(const TempDir& dir) {
+        WriteBytes(dir / "Pyralis.ini", kListingOptions);
+        EXPECT_EQ(job.Save(dir / "chantier.geo"), 1);
+        return dir / "chantier.geo";
+    }
+
+    static constexpr Place kP{1050.0, 2080.0, 103.2};
+    CCarnet job;
+    ui::ScriptedFrontEnd frontEnd;
+};
+
+TEST_F(IntersectionForm, PointChosenSightingsMovedWrittenThenFinishedWithTheListing) {
+    using F = CCalcIntersForm;
+    TempDir dir;
+    const std::string geo = Prepare(dir);
+    CCalcIntersDriver dialog;
+    dialog.SetInputs({geo, dir / "Pyralis.ini", "", "calcul d'un point par intersections de visées"});
+    const auto form = dialog.MakeForm();
+    Person person{*form, frontEnd};
+    ASSERT_TRUE(form->Open(frontEnd));
+    EXPECT_EQ(person[F::kPoint].items, (std::vector<std::string>{"P", "Q"}));
+    EXPECT_FALSE(person[kIdOk].enabled || person[F::kAddAll].enabled);
+
+    person.Select(F::kPoint, 0);
+    EXPECT_EQ(form->Caption(), "Calcul du point P par intersection");
+    EXPECT_EQ(person[F::kPoint].current, 0);
+    const ui::ControlState available = person[F::kAvailable];
+    ASSERT_EQ(available.items.size(), 3u);
+    ASSERT_EQ(available.tips.size(), 3u);
+    EXPECT_NE(available.tips[1].find(" P : "), std::string::npos);
+    EXPECT_TRUE(person[kIdOk].enabled && person[F::kAddAll].enabled); // three sightings in the lists
+    EXPECT_FALSE(person[F::kAddOne].enabled || person[F::kRemoveAll].enabled || person[F::kWrite].enabled);
+
+    person.Select(F::kAvailable, 1);
+    EXPECT_EQ(person[F::kAvailable].current, 1);
+    ASSERT_TRUE(person[F::kAddOne].enabled);
+    person.Click(F::kAddOne);
+    EXPECT_EQ(form->FocusRequest(), kIdOk);
+    EXPECT_EQ(person[F::kSelected].items, std::vector<std::string>{available.items[1]});
+    EXPECT_EQ(person[F::kStatus].text, inters::kMsgOneSighting);
+    EXPECT_EQ(person[F::kFirst].text, "");
+    EXPECT_TRUE(person[F::kRemoveAll].enabled && !person[F::kRemoveOne].enabled);
+
+    person.Click(F::kAddAll);
+    EXPECT_EQ(person[F::kLabelFirst].text, "X =");
+    EXPECT_EQ(person[F::kFirst].text, "1050.0000");
+    EXPECT_EQ(person[F::kSecond].text, "2080.0000");
+    EXPECT_EQ(person[F::kZ].text, "103.200");
+    EXPECT_EQ(person[F::kStatus].text, "");
+    person.Check(F::kPlani, false); // the altitude alone
+    EXPECT_FALSE(person[F::kPlani].checked);
+    EXPECT_EQ(person[F::kFirst].text, "");
+    EXPECT_EQ(person[F::kZ].text, "103.200");
+    person.Check(F::kPlani, true);
+    ASSERT_TRUE(person[F::kWrite].enabled);
+    person.Click(F::kWrite);
+
+    frontEnd.answers = {ui::Answer::Yes}; // save the GéoBase on leaving
+    person.Click(kIdOk);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Ok);
+    EXPECT_EQ(frontEnd.questions.size(), 1u);
+    const CCarnet saved = Load(geo);
+    const int p = saved.findMat("P");
+    ASSERT_GE(p, 0);
+    EXPECT_NEAR(saved.xAt(p), kP.x, kTenthMm);
+    EXPECT_NEAR(saved.yAt(p), kP.y, kTenthMm);
+    EXPECT_NEAR(saved.zAt(p), kP.z, kTenthMm);
+    EXPECT_NE(ReadBytes(dir / "chantier.cin").find("Calcul du point P"), std::string::npos);
+
+    // The same actions on the model leave the same GéoBase.
+    TempDir other;
+    CCalcInters model;
+    model.SetInputs({Prepare(other), other / "Pyralis.ini", "", ""});
+    ASSERT_TRUE(model.Open(frontEnd));
+    ASSERT_TRUE(model.ChoosePoint("P"));
+    model.AddAll();
+    ASSERT_TRUE(model.WritePoint());
+    frontEnd.answers = {ui::Answer::Yes};
+    model.FinishWithListing();
+    EXPECT_EQ(ReadBytes(other / "chantier.geo"), ReadBytes(geo));
+}
+
+TEST_F(IntersectionForm, ClosedWithoutWritingTheListingIsOfferedAndNothingSaved) {
+    TempDir dir;
+    const std::string geo = Prepare(dir);
+    CCalcIntersDriver dialog;
+    dialog.SetInputs({geo, dir / "Pyralis.ini", "", ""});
+    const auto form = dialog.MakeForm();
+    Person person{*form, frontEnd};
+    ASSERT_TRUE(form->Open(frontEnd));
+    person.Type(CCalcIntersForm::kPoint, "P"); // typed in the combo
+    form->Act(frontEnd, CCalcIntersForm::kAvailable, {EventKind::Activate, 2, false, {}}); // double-click
+    EXPECT_EQ(person[CCalcIntersForm::kSelected].items.size(), 1u);
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    person.Click(kIdCancel);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Cancel);
+    EXPECT_EQ(frontEnd.questions.size(), 1u);
+    EXPECT_EQ(Load(geo).findMat("P"), -1);
+}
+
+// S1 oriented at 50 gr on A, B, C and D, D read 0.02 gr off, then fixed by hand; S2, which the GéoBase
+// does not place, at 120 gr on A and B. X and Y are shown in the order Y, X.
+TEST(V0Form, StationsOrientedFromTheWindowTheirCoordinatesTypedInTheAxesShown) {
+    using F = CCalculV0Form;
+    const Place s1{1000.0, 2000.0, 100.0}, s2{1100.0, 2100.0, 102.0};
+    const std::pair<const char*, Place> points[] = {{"A", {1000.0, 2100.0, 101.0}},
+                                                    {"B", {1200.0, 2000.0, 99.2}},
+                                                    {"C", {700.0, 2000.0, 104.5}},
+                                                    {"D", {1000.0, 1900.0, 100.0}}};
+    TempDir dir;
+    const std::string geo = dir / "chantier.geo", params = dir / "Pyralis.ini";
+    WriteBytes(params, "[Options_Listings]\nChoixNomListing=0\nAfficherListing=0\nInverser_XY=1\n"
+                       "[Listings]\nFormat=2\n");
+    // The axes' order is the store's, for the whole program: set back for the tests that follow.
+    struct Unswap {
+        ~Unswap() { CPointGen::setSwapXY(false); }
+    } unswap;
+    CCarnet job;
+    AddPoint(job, "S1", s1);
+    for (const auto& [name, place] : points)
+        AddPoint(job, name, place);
+    AddStation(job, "S1", 1.5, 49.5);
+    for (const auto& [name, place] : points)
+        AddSighting(job, name, s1, 1.5, place, 1.3, 50.0);
+    job.As<CVisee>(job.GetSize() - 1)->setAH(149.98);
+    AddStation(job, "S2", 1.6);
+    for (int i : {0, 1})
+        AddSighting(job, points[i].first, s2, 1.6, points[i].second, 1.3, 120.0);
+    ASSERT_EQ(job.Save(geo), 1);
+
+    CCalculV0Driver dialog;
+    dialog.SetInputs({geo, params, "", ""});
+    ui::ScriptedFrontEnd frontEnd;
+    const auto form = dialog.MakeForm();
+    Person person{*form, frontEnd};
+    ASSERT_TRUE(form->Open(frontEnd));
+    EXPECT_TRUE(person[F::kUnique].checked);
+    EXPECT_FALSE(person[F::kList].enabled);
+    EXPECT_EQ(person[F::kStation].items, (std::vector<std::string>{"S1", "S2"}));
+    EXPECT_EQ(person[F::kStation].current, 0);
+    EXPECT_EQ(person[F::kLabelFirst].text, "&Y :");
+    EXPECT_EQ(person[F::kFirst].text, "2000.0000");
+    EXPECT_FALSE(person[F::kFirst].enabled); // placed by the GéoBase
+    EXPECT_EQ(person[F::kReferences].checks, std::vector<bool>(4, true));
+    EXPECT_EQ(person[F::kPrevious].text, FormatFixed(49.5, CStation::DeciAng()));
+
+    person.Click(F::kCalculate);
+    auto* model = static_cast<CCalculV0Sta*>(&form->Model());
+    EXPECT_NEAR(model->V0(), 50.0, kTenthMgon);
+    EXPECT_EQ(person[F::kV0].text, FormatFixed(50.0, CStation::DeciAng()));
+    const std::vector<std::string> lines = person[F::kResults].items;
+    ASSERT_EQ(lines.size(), 4u);
+    EXPECT_EQ(lines[0].substr(0, 2), "A\t");
+    EXPECT_EQ(lines[3].substr(lines[3].size() - 2), "\t-"); // D dropped: no residual
+    person.CheckLine(F::kReferences, 3, false);
+    EXPECT_FALSE(model->References()[3].chosen);
+    person.Click(F::kCalculate);
+    EXPECT_EQ(person[F::kResults].items.size(), 3u);
+
+    person.Check(F::kListe, true);
+    EXPECT_TRUE(person[F::kList].enabled && !person[F::kCalculate].enabled); // no list yet
+    EXPECT_FALSE(person[F::kReferences].enabled || person[F::kFixed].enabled);
+    person.Type(F::kList, "S1 S2");
+    EXPECT_EQ(model->List(), "S1 S2");
+    EXPECT_TRUE(person[F::kCalculate].enabled);
+    person.Check(F::kUnique, true);
+
+    person.Type(F::kFixed, "49,9"); // S1's V0 fixed by hand
+    EXPECT_EQ(person[F::kV0].text, FormatFixed(49.9, CStation::DeciAng()));
+    EXPECT_EQ(person[F::kFixed].text, person[F::kV0].text);
+    EXPECT_TRUE(person[F::kResults].items.empty());
+
+    person.Select(F::kStation, 1);
+    EXPECT_TRUE(person[F::kFirst].enabled && person[F::kZ].enabled);
+    EXPECT_EQ(person[F::kPrevious].text, "");
+    person.Type(F::kFirst, "2100,0"); // Y, with a decimal comma: the station waits for its X
+    EXPECT_FALSE(model->Station().HasPlace());
+    EXPECT_EQ(person[F::kFirst].text, "2100.0000");
+    person.Type(F::kSecond, "1100");
+    person.Type(F::kZ, "102");
+    EXPECT_EQ(model->Station().x, 1100.0);
+    EXPECT_EQ(model->Station().y, 2100.0);
+    EXPECT_EQ(model->Station().z, 102.0);
+    EXPECT_TRUE(frontEnd.messages.empty());
+    person.Click(F::kCalculate);
+    EXPECT_NEAR(model->V0(), 120.0, kTenthMgon);
+
+    frontEnd.answers = {ui::Answer::Yes, ui::Answer::Yes}; // add S2's point; write the listing
+    person.Click(kIdOk);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Ok);
+    const CCarnet saved = Load(geo);
+    EXPECT_NEAR(saved.v0At(saved.findStaRep("S1", 1)), 49.9, 1e-9);
+    EXPECT_NEAR(saved.v0At(saved.findStaRep("S2", 1)), 120.0, kTenthMgon);
+    double x = 0, y = 0;
+    ASSERT_TRUE(saved.hasXY("S2", x, y));
+    EXPECT_EQ(x, 1100.0);
+    EXPECT_EQ(y, 2100.0);
+    EXPECT_NE(ReadBytes(dir / "chantier.cv0").find("Calcul de la station S2, reprise 1"), std::string::npos);
+}
+
+// Two set-ups on S1, the second one's circle turned back by 5 gr: merged by their common sightings.
+Geo TwoSetUps() {
+    Geo geo;
+    geo.Sta("S1", 1.60).Ref("A", 1.3, 2.0, 100.0, 50.0).Ref("B", 1.3, 110.0, 100.0, 60.0);
+    geo.Sta("S1", 1.60).Ref("A", 1.3, 397.0, 100.0, 50.0).Ref("B", 1.3, 105.0, 100.0, 60.0);
+    return geo;
+}
+
+TEST(StationReductionForm, SwitchesReadTickedAndKeptOnOkLeftAsTheyWereOnCancel) {
+    TempDir dir;
+    const std::string ini = dir / "Pyralis.ini";
+    WriteBytes(ini, "[Reduction_des_Stations]\nSuppress=1\n");
+    constexpr int kVisComm = CStationReductionForm::kFirstSwitch, kSuppress = kVisComm + 3;
+    ui::ScriptedFrontEnd frontEnd;
+
+    CReductionDriver dialog;
+    dialog.SetInputs({"", ini, "", ""});
+    EXPECT_FALSE(dialog.MakeForm()->Open(frontEnd)) << "no GéoBase given";
+    Geo geo = TwoSetUps();
+    dialog.Reduction().SetCarnet(&geo);
+    auto form = dialog.MakeForm();
+    Person person{*form, frontEnd};
+    ASSERT_TRUE(form->Open(frontEnd));
+    EXPECT_TRUE(person[kVisComm].checked);  // by default
+    EXPECT_TRUE(person[kSuppress].checked); // as the file says
+    person.Check(kSuppress, false);
+    EXPECT_FALSE(person[kSuppress].checked);
+    person.Click(kIdOk);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Ok);
+    EXPECT_EQ(frontEnd.messages.size(), 1u); // the warning on the codes
+    ASSERT_EQ(geo.GetSize(), 6 + 5);         // the old set-ups kept, the merged station after them
+    EXPECT_EQ(geo.findStaRep("S1", 3), 6);
+    EXPECT_NEAR(geo.ahAt(9), 2.0, kTenthMgon); // the second set-up turned by 5 gr
+    EXPECT_NE(ReadBytes(ini).find("Suppress=0"), std::string::npos);
+
+    // The same actions on the model give the same GéoBase.
+    const std::string fromFile = dir / "Suppress.ini";
+    WriteBytes(fromFile, "[Reduction_des_Stations]\nSuppress=1\n");
+    Geo same = TwoSetUps();
+    CReduction_Station model(&same);
+    model.SetInputs({"", fromFile, "", ""});
+    model.OnInitDialog();
+    model.Options().suppress = false;
+    model.OnOK(frontEnd);
+    ASSERT_EQ(geo.Save(dir / "form.geo"), 1);
+    ASSERT_EQ(same.Save(dir / "model.geo"), 1);
+    EXPECT_EQ(ReadBytes(dir / "form.geo"), ReadBytes(dir / "model.geo"));
+
+    // Opened again: the box cleared is read back; Cancel leaves the GéoBase and the file alone.
+    form = dialog.MakeForm();
+    Person again{*form, frontEnd};
+    ASSERT_TRUE(form->Open(frontEnd));
+    EXPECT_FALSE(again[kSuppress].checked);
+    again.Check(kSuppress, true);
+    const std::string file = ReadBytes(ini);
+    again.Click(kIdCancel);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Cancel);
+    EXPECT_EQ(geo.GetSize(), 11);
+    EXPECT_EQ(ReadBytes(ini), file);
+}
+
+} // namespace
+} // namespace pyr::test
