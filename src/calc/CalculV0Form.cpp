@@ -108,7 +108,10 @@ std::vector<ui::Control> CCalculV0Form::Controls() const {
 bool CCalculV0Form::Open(ui::FrontEnd& frontEnd) {
     m_model.SetInputs(m_dialog.Inputs());
     if (m_dialog.GeoBaseNamed()) m_model.SetGeoBase(m_dialog.GeoBase());
-    return m_model.Open(frontEnd);
+    if (m_model.Open(frontEnd)) return true;
+    // No GéoBase chosen is a cancel; any other refusal was told by a message.
+    End(m_model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed);
+    return false;
 }
 
 CCalculV0Form::Axis CCalculV0Form::AxisOf(int id) {

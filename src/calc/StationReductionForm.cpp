@@ -40,7 +40,10 @@ std::vector<ui::Control> CStationReductionForm::Controls() const {
 bool CStationReductionForm::Open(ui::FrontEnd&) {
     m_model.SetInputs(m_dialog.Inputs());
     if (m_dialog.GeoBaseNamed()) m_model.SetGeoBase(m_dialog.GeoBase());
-    if (!m_model.Carnet()) return false;
+    if (!m_model.Carnet()) {
+        End(ui::DialogResult::Failed);
+        return false;
+    }
     m_model.OnInitDialog();
     return true;
 }
