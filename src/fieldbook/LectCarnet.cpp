@@ -125,6 +125,12 @@ bool CLectCarnet::BrowseCodeTable(ui::FrontEnd& frontEnd) {
 }
 
 bool CLectCarnet::OnEditParams(ui::FrontEnd& frontEnd) {
+    if (!PrepareEditParams(frontEnd)) return false;
+    m_driver.Edit(frontEnd);
+    return true;
+}
+
+bool CLectCarnet::PrepareEditParams(ui::FrontEnd& frontEnd) {
     if (!FileExists(ParamFile())) {
         const std::string question = Sprintf(fb::kAskCreateParamFile, fb::kMsgParamFileMissing);
         if (frontEnd.Ask(question, ui::kCaption, ui::Buttons::YesNo, ui::Answer::Yes) != ui::Answer::Yes) {
@@ -137,7 +143,6 @@ bool CLectCarnet::OnEditParams(ui::FrontEnd& frontEnd) {
         m_params.WriteString(kSectionChargementDeSemis, kKeyParametresColonne, WholePath(ParamFile()));
     else if (m_format == FieldBookFormat::Separateur)
         m_params.WriteString(kSectionChargementDeSemis, kKeyParametresSeparateur, WholePath(ParamFile()));
-    m_driver.Edit(frontEnd);
     return true;
 }
 

@@ -7,6 +7,7 @@
 #include "settings/ParamStore.h"
 #include "ui/Dialog.h"
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
@@ -97,6 +98,10 @@ public:
     // "Paramètres...": the parameter file shown to be edited, after the question to create it when it
     // does not exist. False when the person does not want it created.
     bool OnEditParams(ui::FrontEnd& frontEnd);
+    // What "Paramètres..." does before the settings are edited: the question to create a file that does not
+    // exist (false, the focus on the parameter file, when the person does not want it), and the layout of
+    // the delimited and columnar formats kept for the loading of points.
+    bool PrepareEditParams(ui::FrontEnd& frontEnd);
     // Shift + Ctrl + right click on a field: its file shown, when it exists.
     void ShowFieldFile(ui::FrontEnd& frontEnd, Field field);
     // OK: the checks in their order. Ok when all pass; Cancel when the person answers No to a question;
@@ -107,6 +112,8 @@ public:
     // The values handed to the format's reader once OK passed.
     ReadingChoices Choices() const;
     CParamDriver& Driver() { return m_driver; }
+    // The folder under which the installation's Config lies.
+    const std::string& InstallDir() const { return m_installDir; }
     const CParamDriver& Driver() const { return m_driver; }
     // The code table resolved at OK: a bare file name is looked for in the installation's Config folder.
     std::string ResolvedCodeTable() const;
@@ -121,6 +128,8 @@ public:
     // Applies the requests, offers the field book to be confirmed when none was named, shows the
     // parameter file when asked, and presses OK.
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    // The dialog as a window: LectCarnetForm.h.
+    std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
     ui::DialogResult Fail(ui::FrontEnd& frontEnd, const std::string& text, Field field);

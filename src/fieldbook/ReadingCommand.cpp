@@ -19,9 +19,11 @@ ui::DialogResult CFieldBookCommand::Run(ui::FrontEnd& frontEnd) {
     FieldBookConverter converter(m_format, &frontEnd, Inputs().paramPath, Inputs().configFolder, &txt);
     ReadingRequests requests = m_requests;
     if (GeoBaseNamed()) requests.geoBase = GeoBase();
+    // The reading dialog is run by the front end: a window shows it, a command line applies to it the
+    // options this command was given, the same as its own.
     converter.showDialog = [&frontEnd, &requests](CLectCarnet& dialog) {
         dialog.SetRequests(requests);
-        return dialog.Run(frontEnd);
+        return frontEnd.DoModal(dialog);
     };
     return RunConversion(converter, nullptr);
 }
