@@ -76,91 +76,135 @@ void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
     DeclareReadingOptions(options, m_readingRequests, true, false);
 }
 
-ui::DialogResult CGeoEditor::ReadFieldBook(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
+ui::DialogResult CGeoEditor::ReadFieldBook(const Reading& reading, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd,
+                                           bool asWindow) {
     CCarnet fresh;
-    CCarnet* target = &carnet;
-    if (!carnet.IsEmpty()) {
+    CCarnet* target = &m_carnet;
+    if (!m_carnet.IsEmpty()) {
         const ui::Answer answer =
             frontEnd.Ask(fb::kAskAppendToGeoBase, ui::kCaption, ui::Buttons::YesNoCancel, ui::Answer::Cancel);
         if (answer == ui::Answer::Cancel) return ui::DialogResult::Cancel;
-        if (answer == ui::Answer::No) {
-            // A new GéoBase, named after the field book; the open one stays as it is.
-            const std::string path = BesideCarnet(m_reading->carnet, kGeoFileExtension);
-            if (FileExists(path) &&
-                frontEnd.Ask(Sprintf(fb::kAskReplaceGeoBase, fb::kGeoBaseExists, fb::kReplaceIt),
-                             ui::kCaption, ui::Buttons::YesNo, ui::Answer::No) != ui::Answer::Yes)
-                return ui::DialogResult::Cancel;
-            fresh.SetPathName(path);
-            target = &fresh;
-        }
+        if (answer == ui::Answer::No) target = &fresh; // the open GéoBase stays as it is
     }
+    // A new GéoBase is named after the field book: asked about at once when a command line names the book,
+    // once the reading dialog has it otherwise.
+    const auto nameFresh = [&frontEnd, &fresh](const std::string& carnet) {
+        const std::string path = BesideCarnet(carnet, kGeoFileExtension);
+        if (FileExists(path) &&
+            frontEnd.Ask(Sprintf(fb::kAskReplaceGeoBase, fb::kGeoBaseExists, fb::kReplaceIt), ui::kCaption,
+                         ui::Buttons::YesNo, ui::Answer::No) != ui::Answer::Yes)
+            return false;
+        fresh.SetPathName(path);
+        return true;
+    };
+    if (target == &fresh && reading.carnet && !nameFresh(*reading.carnet)) return ui::DialogResult::Cancel;
+
     const std::string paramPath = Inputs().paramPath;
     std::unique_ptr<CTableCode> table = EditorCodeTable(*target, paramPath, txt);
     EditorDocument document{table.get(), ReadInstruments(paramPath)};
-    FieldBookConverter converter(m_reading->format, &frontEnd, paramPath, Inputs().configFolder, &txt,
+    FieldBookConverter converter(reading.format, &frontEnd, paramPath, Inputs().configFolder, &txt,
                                  &document);
     ReadingRequests requests = m_readingRequests;
-    requests.carnet = m_reading->carnet;
-    converter.showDialog = [&frontEnd, &requests](CLectCarnet& dialog) {
+    requests.carnet = reading.carnet;
+    converter.showDialog = [&](CLectCarnet& dialog) {
         dialog.SetRequests(requests);
-        return dialog.Run(frontEnd);
+        const ui::DialogResult shown = asWindow ? frontEnd.DoModal(dialog) : dialog.Run(frontEnd);
+        if (shown == ui::DialogResult::Ok && target == &fresh && !reading.carnet &&
+            !nameFresh(dialog.Carnet()))
+            return ui::DialogResult::Cancel;
+        return shown;
     };
     const int former = target->GetSize();
     const ui::DialogResult read = RunConversion(converter, target);
     if (read != ui::DialogResult::Ok) return read;
 
-    if (target == &fresh) carnet = std::move(fresh);
-    const std::string path = carnet.PathName();
-    if (!carnet.BackUp(&frontEnd) || !carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
+    if (target == &fresh) m_carnet = std::move(fresh);
+    Notify(kPartGeoBase);
+    const std::string path = m_carnet.PathName();
+    if (!m_carnet.BackUp(&frontEnd) || !m_carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
     txt.Print(msg::kSaved, path.c_str());
     WriteLastGeoBase(paramPath, WholePath(path));
     // The view refreshed from the former end of the GéoBase on.
-    txt.Print(kReadingDone, path.c_str(), carnet.GetSize(), carnet.GetSize() - former);
-    for (int i = former; i < carnet.GetSize(); ++i)
-        txt.PrintText(EditorLine(carnet, i));
+    txt.Print(kReadingDone, path.c_str(), m_carnet.GetSize(), m_carnet.GetSize() - former);
+    if (!asWindow) // a window lists them
+        for (int i = former; i < m_carnet.GetSize(); ++i)
+            txt.PrintText(EditorLine(m_carnet, i));
     return ui::DialogResult::Ok;
 }
 
-bool CGeoEditor::ReduceStations(CCarnet& carnet, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
-    m_reduction.SetInputs({carnet.PathName(), Inputs().paramPath, Inputs().configFolder, kReductionCaption});
+ui::DialogResult CGeoEditor::ReadFieldBook(ui::FrontEnd& frontEnd, FieldBookFormat format) {
+    CPyrTxtWnd txt(frontEnd);
+    return ReadFieldBook(Reading{format, std::nullopt}, txt, frontEnd, true);
+}
+
+bool CGeoEditor::ReduceStations(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd, bool asWindow) {
+    m_reduction.SetInputs(
+        {m_carnet.PathName(), Inputs().paramPath, Inputs().configFolder, kReductionCaption});
     CReduction_Station& reduction = m_reduction.Reduction();
-    reduction.SetCarnet(&carnet);
-    const bool reduced = m_reduction.Run(frontEnd) == ui::DialogResult::Ok;
+    reduction.SetCarnet(&m_carnet);
+    const ui::DialogResult shown = asWindow ? frontEnd.DoModal(m_reduction) : m_reduction.Run(frontEnd);
     reduction.SetCarnet(nullptr);
-    if (!reduced || !reduction.Changed()) {
+    if (shown != ui::DialogResult::Ok || !reduction.Changed()) {
         txt.Print("%s", msg::kNoChange);
         return true;
     }
-    const std::string path = carnet.PathName();
-    if (!carnet.BackUp(&frontEnd) || !carnet.Save(path, &frontEnd)) return false;
+    Notify(kPartGeoBase);
+    const std::string path = m_carnet.PathName();
+    if (!m_carnet.BackUp(&frontEnd) || !m_carnet.Save(path, &frontEnd)) return false;
     txt.Print(msg::kSaved, path.c_str());
     return true;
 }
 
-ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
+bool CGeoEditor::ReduceStations(ui::FrontEnd& frontEnd) {
+    CPyrTxtWnd txt(frontEnd);
+    return ReduceStations(txt, frontEnd, true);
+}
+
+std::optional<std::string> CGeoEditor::ChosenGeoBase(ui::FrontEnd& frontEnd) const {
     std::string path = GeoBase();
     if (!GeoBaseNamed()) {
         auto chosen = frontEnd.ChooseFile({false, kChooseTitle, kGeoFileFilter, kGeoFileExtension, path});
-        if (!chosen) return ui::DialogResult::Cancel;
+        if (!chosen) return std::nullopt;
         path = *chosen;
     }
-    if (path.empty()) return ui::DialogResult::Cancel;
+    if (path.empty()) return std::nullopt;
+    return path;
+}
+
+bool CGeoEditor::Load(const std::string& path, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
+    CCarnet carnet;
+    if (!carnet.Load(&txt, path, {}, 0, &frontEnd)) return false;
+    // The next command opens the last GéoBase: never a file that is not one.
+    if (!carnet.LoadedFileIsForeign()) WriteLastGeoBase(Inputs().paramPath, WholePath(path));
+    m_carnet = std::move(carnet);
+    Notify(kPartGeoBase);
+    return true;
+}
+
+ui::DialogResult CGeoEditor::OpenGeoBase(ui::FrontEnd& frontEnd) {
+    const std::optional<std::string> path = ChosenGeoBase(frontEnd);
+    if (!path) return ui::DialogResult::Cancel;
+    CPyrTxtWnd txt(frontEnd);
+    return Load(*path, txt, frontEnd) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
+    const std::optional<std::string> path = ChosenGeoBase(frontEnd);
+    if (!path) return ui::DialogResult::Cancel;
 
     CPyrTxtWnd txt(frontEnd);
-    CCarnet carnet;
-    if (m_reading && !FileExists(path)) {
-        carnet.SetPathName(path); // a new GéoBase, made by the reading, recorded once it is saved
-    } else {
-        if (!carnet.Load(&txt, path, {}, 0, &frontEnd)) return ui::DialogResult::Failed;
-        // The next command opens the last GéoBase: never a file that is not one.
-        if (!carnet.LoadedFileIsForeign()) WriteLastGeoBase(Inputs().paramPath, WholePath(path));
+    if (m_reading && !FileExists(*path)) {
+        m_carnet = CCarnet(); // a new GéoBase, made by the reading, recorded once it is saved
+        m_carnet.SetPathName(*path);
+    } else if (!Load(*path, txt, frontEnd)) {
+        return ui::DialogResult::Failed;
     }
 
-    if (m_reduce && !ReduceStations(carnet, txt, frontEnd)) return ui::DialogResult::Failed;
-    if (m_reading) return ReadFieldBook(carnet, txt, frontEnd);
-    txt.Print(kOpened, path.c_str(), carnet.GetSize());
-    for (int i = 0; i < carnet.GetSize(); ++i)
-        txt.PrintText(EditorLine(carnet, i));
+    if (m_reduce && !ReduceStations(txt, frontEnd, false)) return ui::DialogResult::Failed;
+    if (m_reading) return ReadFieldBook(*m_reading, txt, frontEnd, false);
+    txt.Print(kOpened, path->c_str(), m_carnet.GetSize());
+    for (int i = 0; i < m_carnet.GetSize(); ++i)
+        txt.PrintText(EditorLine(m_carnet, i));
     return ui::DialogResult::Ok;
 }
 
