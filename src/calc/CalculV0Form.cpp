@@ -62,30 +62,30 @@ std::vector<ui::Control> CCalculV0Form::Controls() const {
             .Buddy(kList),
         Ctl(kList, K::Edit, "stationsListe").In(kType).At(1, 1, 1, 2).Width(20),
 
+        // The station and its coordinates one above the other, the references it offers beside them;
+        // under them, the references as the computation left them, across the whole dialog.
         Ctl(kLabelStation, K::Label, "etiquetteStation", "&Station :").At(1, 0).Buddy(kStation),
         Ctl(kStation, K::Combo, "station").At(1, 1).Width(12),
         // The names say the place, the labels the axis: X or Y first as the options show them.
         Ctl(kLabelFirst, K::Label, "etiquettePremiere", swap ? "&Y :" : "&X :").At(2, 0).Buddy(kFirst),
         Ctl(kFirst, K::Edit, "coordonneePremiere").At(2, 1).Width(12),
-        Ctl(kLabelSecond, K::Label, "etiquetteSeconde", swap ? "&X :" : "&Y :").At(2, 2).Buddy(kSecond),
-        Ctl(kSecond, K::Edit, "coordonneeSeconde").At(2, 3).Width(12),
-        Ctl(kLabelZ, K::Label, "etiquetteAltitude", "&Z :").At(3, 0).Buddy(kZ),
-        Ctl(kZ, K::Edit, "altitude").At(3, 1).Width(10),
+        Ctl(kLabelSecond, K::Label, "etiquetteSeconde", swap ? "&X :" : "&Y :").At(3, 0).Buddy(kSecond),
+        Ctl(kSecond, K::Edit, "coordonneeSeconde").At(3, 1).Width(12),
+        Ctl(kLabelZ, K::Label, "etiquetteAltitude", "&Z :").At(4, 0).Buddy(kZ),
+        Ctl(kZ, K::Edit, "altitude").At(4, 1).Width(12),
+        Ctl(kLabelReferences, K::Label, "etiquetteReferences", "&Références :").At(1, 2).Buddy(kReferences),
+        Ctl(kReferences, K::CheckList, "references").At(1, 3, 4, 1).Width(14).Lines(4),
 
-        Ctl(kLabelReferences, K::Label, "etiquetteReferences", "&Références :")
-            .At(4, 0, 1, 2)
-            .Buddy(kReferences),
-        Ctl(kReferences, K::CheckList, "references").At(5, 0, 1, 2).Width(14).Lines(8),
-        Ctl(kLabelResults, K::Label, "etiquetteResultats", "Rés&ultats :").At(4, 2, 1, 2).Buddy(kResults),
+        Ctl(kLabelResults, K::Label, "etiquetteResultats", "Rés&ultats :").At(5, 0, 1, 4).Buddy(kResults),
         Ctl(kResults, K::List, "resultats")
-            .At(5, 2, 1, 2)
+            .At(6, 0, 1, 4)
             .Columns({std::begin(kColumns), std::end(kColumns)})
-            .Width(56)
-            .Lines(8),
-        Ctl(kWeighted, K::Check, "ponderation", "&Pondérer par les distances").At(6, 0, 1, 2),
-        Ctl(kForced, K::Check, "forcer", "&Forcer l'utilisation des réf. choisies").At(6, 2, 1, 2),
+            .Width(66)
+            .Lines(6),
+        Ctl(kWeighted, K::Check, "ponderation", "&Pondérer par les distances").At(7, 0, 1, 2),
+        Ctl(kForced, K::Check, "forcer", "&Forcer l'utilisation des réf. choisies").At(7, 2, 1, 2),
 
-        Ctl(kHand, K::Group, "entreeV0", "Entrée du V0 de la station").At(7, 0, 1, 4),
+        Ctl(kHand, K::Group, "entreeV0", "Entrée du V0 de la station").At(8, 0, 1, 4),
         Ctl(kLabelPrevious, K::Label, "etiquetteV0Precedent", "Valeur précédente du V0 :")
             .In(kHand)
             .Buddy(kPrevious),
@@ -96,10 +96,10 @@ std::vector<ui::Control> CCalculV0Form::Controls() const {
             .Buddy(kFixed),
         Ctl(kFixed, K::Edit, "v0Fixe").In(kHand).At(0, 3).Width(10),
 
-        Ctl(kLabelV0, K::Label, "etiquetteV0", "&V0 :").At(8, 0).Buddy(kV0),
-        Ctl(kV0, K::Field, "v0").At(8, 1).Width(10),
-        Ctl(kCalculate, K::Button, "calculer", "&Calculer").At(8, 2).Default(),
-        Ctl(kGraphic, K::Button, "graphique", "&Graphique").At(8, 3),
+        Ctl(kLabelV0, K::Label, "etiquetteV0", "&V0 :").At(9, 0).Buddy(kV0),
+        Ctl(kV0, K::Field, "v0").At(9, 1).Width(10),
+        Ctl(kCalculate, K::Button, "calculer", "&Calculer").At(9, 2).Default(),
+        Ctl(kGraphic, K::Button, "graphique", "&Graphique").At(9, 3),
         Ctl(ui::kIdOk, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
         Ctl(ui::kIdCancel, K::Button, "annuler", "Annuler").In(ui::kButtonRow).At(0, 1),
     };
