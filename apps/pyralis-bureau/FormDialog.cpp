@@ -272,12 +272,9 @@ void FormDialog::Connect(Shown& shown) {
         connect(combo, &QComboBox::activated, this, [this, id](int rank) {
             if (!m_refreshing) Act(id, {EventKind::Select, rank, false, {}});
         });
-        if (QLineEdit* typed = combo->lineEdit())
-            connect(typed, &QLineEdit::returnPressed, this, [this, id, combo] {
-                if (m_refreshing) return;
-                const int rank = combo->findText(combo->currentText(), Qt::MatchFixedString);
-                if (rank < 0) Act(id, {EventKind::Text, -1, false, combo->currentText().toStdString()});
-            });
+        // Enter in a name typed into the list chooses that name (or sends it, when the list does not
+        // hold it), rather than pressing the dialog's default button.
+        if (QLineEdit* typed = combo->lineEdit()) typed->installEventFilter(this);
         break;
     }
     case ControlKind::List:
@@ -334,14 +331,21 @@ void FormDialog::reject() {
     Act(ui::kIdCancel, {EventKind::Click, -1, false, {}});
 }
 
-void FormDialog::keyPressEvent(QKeyEvent* event) {
-    // Enter in a name typed into a drop-down list chooses that name, not the dialog's default button.
-    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
-    if (enter && focusWidget() && qobject_cast<QComboBox*>(focusWidget()->parentWidget())) {
-        event->accept();
-        return;
+bool FormDialog::eventFilter(QObject* watched, QEvent* event) {
+    if (event->type() != QEvent::KeyPress) return QDialog::eventFilter(watched, event);
+    const int key = static_cast<QKeyEvent*>(event)->key();
+    auto* combo = qobject_cast<QComboBox*>(watched->parent());
+    if ((key != Qt::Key_Return && key != Qt::Key_Enter) || !combo) return QDialog::eventFilter(watched, event);
+    for (const Shown& shown : m_controls) {
+        if (shown.widget != combo) continue;
+        const int rank = combo->findText(combo->currentText(), Qt::MatchFixedString);
+        if (rank >= 0)
+            Act(shown.control.id, {EventKind::Select, rank, false, {}});
+        else
+            Act(shown.control.id, {EventKind::Text, -1, false, combo->currentText().toStdString()});
+        return true;
     }
-    QDialog::keyPressEvent(event);
+    return QDialog::eventFilter(watched, event);
 }
 
 void FormDialog::Refresh() {

@@ -33,7 +33,7 @@ public:
 
 protected:
     void reject() override; // Escape and the close box: the form's Cancel
-    void keyPressEvent(QKeyEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
 private:
     struct Shown {

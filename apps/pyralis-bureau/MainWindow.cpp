@@ -29,7 +29,7 @@ namespace pyr::bureau {
 
 namespace {
 
-QString Text(const std::string& text) {
+QString Utf8(const std::string& text) {
     return QString::fromStdString(text);
 }
 
@@ -58,14 +58,14 @@ const std::vector<MenuGroup>& MenuGroups() {
 // A command's title as a menu shows it: its first letter in capitals ("Calcul du V0 d'une station").
 QString MenuText(const CommandInfo& command) {
     if (command.title.empty()) return QString("Barre d'outils « %1 »").arg(host::kToolbarGroup);
-    QString text = Text(command.title);
+    QString text = Utf8(command.title);
     if (text.endsWith('.')) text.chop(1);
     text[0] = text[0].toUpper();
     return text;
 }
 
 QString HistoryPath() {
-    return Text(PyralisConfigFolder()) + "/historique-bureau.txt";
+    return Utf8(PyralisConfigFolder()) + "/historique-bureau.txt";
 }
 
 } // namespace
@@ -97,14 +97,14 @@ QAction* MainWindow::CommandAction(const std::string& localName) const {
 void MainWindow::BuildActions() {
     for (const CommandInfo& command : m_commands) {
         auto* action = new QAction(CommandIcon(command.localName), MenuText(command), this);
-        action->setObjectName(Text(command.localName));
-        QString tip = command.title.empty() ? MenuText(command) : Text(command.title);
-        tip += QString(" (%1)").arg(Text(command.localName));
+        action->setObjectName(Utf8(command.localName));
+        QString tip = command.title.empty() ? MenuText(command) : Utf8(command.title);
+        tip += QString(" (%1)").arg(Utf8(command.localName));
         if (!command.available) tip += " - pas encore disponible";
         action->setToolTip(tip);
         action->setStatusTip(tip);
         action->setEnabled(command.available);
-        const QString name = Text(command.localName);
+        const QString name = Utf8(command.localName);
         connect(action, &QAction::triggered, this, [this, name] {
             m_line->Remember(name);
             RunCommand(name);
@@ -179,7 +179,7 @@ void MainWindow::BuildDocks() {
 
     QStringList names;
     for (const CommandInfo& command : m_commands)
-        names << Text(command.localName) << Text(command.globalName);
+        names << Utf8(command.localName) << Utf8(command.globalName);
     names << "AIDE" << "FIN";
     m_line->SetNames(names);
     connect(m_line, &CommandLine::CommandEntered, this, &MainWindow::RunCommand);
@@ -213,9 +213,9 @@ void MainWindow::RunCommand(const QString& typed) {
     if (upper == "?" || upper == "AIDE") {
         for (const CommandInfo& command : m_commands)
             m_text->AddLine(QString("%1 %2 %3")
-                                .arg(Text(command.globalName), -14)
-                                .arg(Text(command.localName), -12)
-                                .arg(command.title.empty() ? MenuText(command) : Text(command.title)));
+                                .arg(Utf8(command.globalName), -14)
+                                .arg(Utf8(command.localName), -12)
+                                .arg(command.title.empty() ? MenuText(command) : Utf8(command.title)));
         return;
     }
     if (!m_module.IsCommand(name.toStdString())) {
@@ -236,7 +236,7 @@ void MainWindow::AfterCommand() {
     if (host::CPyrMainServices* services = m_module.Services())
         m_toolbar->setVisible(services->IsToolbarVisible(host::kToolbarGroup));
     // The GéoBase the command used, or the one drawn when it was written again.
-    const QString last = Text(m_module.LastGeoBase());
+    const QString last = Utf8(m_module.LastGeoBase());
     const QString path = last.isEmpty() ? m_geoBase : last;
     if (path.isEmpty()) return;
     const QDateTime written = QFileInfo(path).lastModified();
@@ -244,7 +244,7 @@ void MainWindow::AfterCommand() {
 }
 
 bool MainWindow::ShowGeoBase(const QString& path) {
-    const QString shown = path.isEmpty() ? Text(m_module.LastGeoBase()) : path;
+    const QString shown = path.isEmpty() ? Utf8(m_module.LastGeoBase()) : path;
     if (shown.isEmpty()) return false;
     m_geoBase = shown;
     m_geoBaseTime = QFileInfo(shown).lastModified();
@@ -259,7 +259,7 @@ void MainWindow::ChooseGeoBase() {
     choice.filter = "GéoBase PYRALIS (*.geo)|*.geo||";
     choice.defaultExtension = "geo";
     choice.startPath = m_geoBase.toStdString();
-    if (const std::optional<std::string> path = m_frontEnd.ChooseFile(choice)) ShowGeoBase(Text(*path));
+    if (const std::optional<std::string> path = m_frontEnd.ChooseFile(choice)) ShowGeoBase(Utf8(*path));
 }
 
 void MainWindow::UpdateTitle() {
@@ -294,7 +294,7 @@ void MainWindow::SaveHistory() {
     std::filesystem::create_directories(std::filesystem::path(path).parent_path(), ignored);
     const int error = ReplaceFileContents(path, text);
     if (error != 0 && !m_historyReported) {
-        m_text->AddLine(Text("Historique des commandes non enregistré : " + FileWriteFailure(path, error)));
+        m_text->AddLine(Utf8("Historique des commandes non enregistré : " + FileWriteFailure(path, error)));
         m_historyReported = true;
     }
 }

@@ -40,7 +40,7 @@ public:
 
     void MessageBox(std::string_view text, std::string_view caption, int icon) override;
     ui::Answer Ask(std::string_view text, std::string_view caption, ui::Buttons buttons, ui::Answer byDefault,
-                   int icon) override;
+                   int icon = ui::kIconQuestion) override;
     std::optional<std::string> ChooseFile(const ui::FileChoice& choice) override;
     void TextLine(std::string_view line) override;
     ui::DialogResult DoModal(ui::Dialog& dialog) override;

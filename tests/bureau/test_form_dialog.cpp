@@ -122,6 +122,8 @@ struct FormDialogTest : testing::Test {
 
 TEST_F(FormDialogTest, WidgetsShowTheStatesAndSendTheActions) {
     pyr::bureau::FormDialog dialog(form, frontEnd);
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
     EXPECT_EQ(dialog.windowTitle(), "Calcul de points");
     auto* combo = Find<QComboBox>(dialog, "point");
     auto* list = Find<QListWidget>(dialog, "liste");
@@ -183,6 +185,7 @@ TEST_F(FormDialogTest, TheFormDecidesWhenTheDialogCloses) {
     {
         // Escape is the form's Cancel: a form that does not end (a question answered "Annuler") keeps
         // the dialog open.
+        PointsForm form{model};
         form.cancelCloses = false;
         pyr::bureau::FormDialog dialog(form, frontEnd);
         dialog.show();
