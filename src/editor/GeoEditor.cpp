@@ -43,16 +43,29 @@ std::unique_ptr<CTableCode> EditorCodeTable(const CCarnet& carnet, std::string_v
 
 } // namespace
 
-std::string EditorLine(const CCarnet& carnet, int index) {
-    const int kind = carnet.GetType(index);
-    // The element's fields as the file writes them, the kind code left out, a column between them.
-    std::string fields = ElementLine(*carnet.GetAt(index), kind);
+namespace {
+
+// The element's fields as the file writes them, the kind code left out, two blanks between them.
+std::string ElementValues(const CCarnet& carnet, int index) {
+    const std::string fields = ElementLine(*carnet.GetAt(index), carnet.GetType(index));
     const size_t first = fields.find('\t');
-    fields = first == std::string::npos ? std::string() : fields.substr(first + 1);
     std::string values;
-    for (char c : fields)
+    if (first == std::string::npos) return values;
+    for (char c : std::string_view(fields).substr(first + 1))
         values += c == '\t' ? std::string("  ") : std::string(1, c);
-    return Sprintf("%06d  %s%s", index + 1, PadRight(KindLabel(kind), kKindColumn).c_str(), values.c_str());
+    return values;
+}
+
+} // namespace
+
+std::string EditorLine(const CCarnet& carnet, int index) {
+    return Sprintf("%06d  %s%s", index + 1, PadRight(KindLabel(carnet.GetType(index)), kKindColumn).c_str(),
+                   ElementValues(carnet, index).c_str());
+}
+
+std::string EditorRow(const CCarnet& carnet, int index) {
+    return Sprintf("%06d\t%s\t%s", index + 1, std::string(KindLabel(carnet.GetType(index))).c_str(),
+                   ElementValues(carnet, index).c_str());
 }
 
 void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {

@@ -71,5 +71,7 @@ private:
 
 // The line of the element at `index`: "000001  Station       S1  1.562  -999999".
 std::string EditorLine(const CCarnet& carnet, int index);
+// The same as a row of a table, its number, kind and values separated by tabs.
+std::string EditorRow(const CCarnet& carnet, int index);
 
 } // namespace pyr

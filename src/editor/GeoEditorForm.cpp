@@ -45,6 +45,7 @@ std::vector<ui::Control> CGeoEditorForm::Controls() const {
     label.buddy = kElements;
     controls.push_back(label);
     ui::Control list = Make(kElements, ControlKind::List, "elements", "", 2, 0, 4);
+    list.columns = {"N°", "Élément", "Valeurs"};
     list.width = 100;
     list.lines = 20;
     controls.push_back(list);
@@ -79,7 +80,7 @@ void CGeoEditorForm::Refresh(bool whole) {
     }
     m_lines.reserve(static_cast<std::size_t>(carnet.GetSize()));
     for (int i = static_cast<int>(m_lines.size()); i < carnet.GetSize(); ++i)
-        m_lines.push_back(EditorLine(carnet, i));
+        m_lines.push_back(EditorRow(carnet, i));
 }
 
 ui::ControlState CGeoEditorForm::State(int id) const {

@@ -174,8 +174,10 @@ std::vector<ui::Control> CParamDriverForm::Controls() const {
             add(id + 1, key.words.empty() ? ControlKind::Edit : ControlKind::Combo, key.name, "", row, 1);
         if (key.words.empty()) field.width = key.maximum >= 0 ? 6 : 40;
     }
-    add(ui::kIdOk, ControlKind::Button, "ok", "OK", ui::kButtonRow, 0).isDefault = true;
-    add(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler", ui::kButtonRow, 1);
+    ui::Control& ok = add(ui::kIdOk, ControlKind::Button, "ok", "OK", 0, 0);
+    ok.parent = ui::kButtonRow;
+    ok.isDefault = true;
+    add(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler", 0, 1).parent = ui::kButtonRow;
     return controls;
 }
 

@@ -211,7 +211,7 @@ void COptionPSheetForm::Build() {
     Control list = Make(kInstruments, ControlKind::List, "appareils", "", instruments, 1, 0, 2);
     list.columns = {"N°",        "Nom",       "Prisme (m)", "Coll. V (gr)",
                     "σ AH (gr)", "σ AV (gr)", "σ DI (m)",   "σ DI (ppm)"};
-    list.width = 80;
+    list.width = 125;
     list.lines = 6;
     m_controls.push_back(list);
     m_controls.push_back(

@@ -31,7 +31,7 @@ protected:
         EXPECT_TRUE(carnet.Load(nullptr, dir / "job.geo"));
         std::vector<std::string> lines;
         for (int i = 0; i < carnet.GetSize(); ++i)
-            lines.push_back(pyr::EditorLine(carnet, i));
+            lines.push_back(pyr::EditorRow(carnet, i));
         return lines;
     }
 
@@ -48,7 +48,7 @@ TEST_F(EditorForm, ListsTheElementsAndReadsAFieldBookIntoThem) {
     ASSERT_TRUE(form->Open(frontEnd)); // the GéoBase offered, confirmed
     EXPECT_EQ(form->State(CGeoEditorForm::kGeoBase).text, dir / "job.geo");
     EXPECT_EQ(form->State(CGeoEditorForm::kElements).items, Lines());
-    EXPECT_EQ(form->State(CGeoEditorForm::kElements).items.at(1).substr(0, 14), "000002  Statio");
+    EXPECT_EQ(form->State(CGeoEditorForm::kElements).items.at(1), "000002\tStation\tS1  1.562  -999999");
 
     // The reduction's dialog and the reading's are run by the front end.
     form->Act(frontEnd, CGeoEditorForm::kReduce, {});

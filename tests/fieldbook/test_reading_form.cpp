@@ -154,13 +154,15 @@ TEST_F(ReadingForm, TheFormatsSettingsAreChosenInADialogOfTheirOwn) {
     EXPECT_FALSE(fs::exists(dir / "mon.sep"));
 }
 
-// Every key of every format has a label, and each label's accelerator is its own in its dialog.
+// Every key of every format has a label, in the dialog's grid, and each label's accelerator is its own in its
+// dialog.
 TEST_F(ReadingForm, EverySettingHasALabelWithAnAcceleratorOfItsOwn) {
     for (const auto& info : FieldBookFormats()) {
         if (!info.parameterFile) continue;
         CDlgParamDriver dialog(CParamDriver("", "", info.format), "", info.name);
         std::set<char> accelerators;
         for (const auto& control : dialog.MakeForm()->Controls()) {
+            EXPECT_TRUE(control.row >= 0 && control.column >= 0) << info.name << " : " << control.name;
             const std::size_t amp = control.text.find('&');
             const bool labelled =
                 control.kind == ui::ControlKind::Label || control.kind == ui::ControlKind::Check;
