@@ -286,4 +286,95 @@ IntersectionGrid MakeIntersectionGrid(int columns, int rows) {
     return grid;
 }
 
+MappedJob MakeMappedJob(int pointCount, int sightingCount) {
+    constexpr double kSpacing = 100.0;
+    constexpr double kEast = 651200.0;
+    constexpr double kNorth = 6862300.0;
+    constexpr int kReferences = 4;
+    constexpr int kSightingsPerStation = 20;
+    MappedJob job;
+    Draws draws;
+    const int stations = std::max(1, sightingCount / kSightingsPerStation);
+    const int columns = static_cast<int>(std::ceil(std::sqrt(static_cast<double>(stations))));
+    const int newPoints = std::max(1, (pointCount - stations) / stations);
+
+    // The station points first, as a control survey gives them; the grid is walked in a serpentine.
+    std::vector<Place> places;
+    std::vector<std::pair<int, int>> nodes; // column and row of each station
+    for (int s = 0; s < stations; ++s) {
+        const int row = s / columns, step = s % columns;
+        const int column = row % 2 == 0 ? step : columns - 1 - step;
+        nodes.emplace_back(column, row);
+        places.push_back({kEast + column * kSpacing + draws.Rounded(-10, 10, 1e3),
+                          kNorth + row * kSpacing + draws.Rounded(-10, 10, 1e3), draws.Rounded(50, 60, 1e3)});
+        auto point = std::make_unique<CPointGen>("S" + std::to_string(s + 1), places.back().x,
+                                                 places.back().y, places.back().z);
+        if (s % 10 == 0) point->setInvariantXY(true);
+        job.carnet.Add(std::move(point), kKindPoint);
+        ++job.points;
+    }
+    auto stationAt = [&](int column, int row) {
+        if (column < 0 || row < 0 || column >= columns) return -1;
+        const int s = row * columns + (row % 2 == 0 ? column : columns - 1 - column);
+        return s < stations ? s : -1;
+    };
+
+    std::vector<Place> previous, current;
+    long long number = 1;
+    for (int s = 0; s < stations; ++s) {
+        const Place& place = places[static_cast<std::size_t>(s)];
+        const double hi = draws.Rounded(1.45, 1.70, 1e3);
+        const double v0 = draws.Rounded(0, 400, 1e5);
+        job.carnet.Add(std::make_unique<CStation>("S" + std::to_string(s + 1), hi, v0), kKindStation);
+        ++job.stations;
+        // References: the nearest neighbours on the grid, across and then diagonally.
+        const auto [column, row] = nodes[static_cast<std::size_t>(s)];
+        int references = 0;
+        for (auto [dc, dr] :
+             {std::pair(1, 0), {-1, 0}, {0, 1}, {0, -1}, {1, 1}, {-1, -1}, {1, -1}, {-1, 1}}) {
+            const int other = stationAt(column + dc, row + dr);
+            if (other < 0 || references == kReferences) continue;
+            AddMeasureFromCoordinates(job.carnet, place, hi, v0, "S" + std::to_string(other + 1),
+                                      places[static_cast<std::size_t>(other)], 1.3);
+            job.carnet.SetKindAt(job.carnet.GetSize() - 1, kKindReference);
+            ++references;
+            ++job.sightings;
+        }
+        // Its new points, then some of the station before's again (its own, for the first station).
+        current.clear();
+        const long long first = number;
+        for (int k = 0; k < newPoints; ++k)
+            current.push_back({std::round((place.x + draws.Uniform(-60, 60)) * 1e3) / 1e3,
+                               std::round((place.y + draws.Uniform(-60, 60)) * 1e3) / 1e3,
+                               draws.Rounded(45, 65, 1e3)});
+        const std::vector<Place>& again = previous.empty() ? current : previous;
+        const long long againFirst = previous.empty() ? first : first - newPoints;
+        // A corner station with fewer neighbours measures more.
+        for (int m = 0; m < kSightingsPerStation - references; ++m) {
+            const bool own = m < newPoints;
+            const int k = own ? m : (m - newPoints) % static_cast<int>(again.size());
+            const long long target = own ? first + k : againFirst + k;
+            AddMeasureFromCoordinates(job.carnet, place, hi, v0, std::to_string(target),
+                                      own ? current[static_cast<std::size_t>(k)]
+                                          : again[static_cast<std::size_t>(k)],
+                                      k % 3 == 0 ? 2.0 : 1.3);
+            ++job.sightings;
+        }
+        for (const Place& point : current) {
+            job.carnet.Add(std::make_unique<CPointGen>(std::to_string(number++), point.x, point.y, point.z),
+                           kKindPoint);
+            ++job.points;
+        }
+        previous = current;
+        // Each row of the grid is a traverse through its stations.
+        if ((s + 1) % columns == 0 || s + 1 == stations) {
+            auto traverse = std::make_unique<CChemin>("CHEM" + std::to_string(s / columns + 1));
+            for (int t = s - s % columns; t <= s; ++t)
+                traverse->add("S" + std::to_string(t + 1) + "(1)");
+            job.carnet.Add(std::move(traverse), kKindChemin);
+        }
+    }
+    return job;
+}
+
 } // namespace pyr::bench

@@ -80,4 +80,17 @@ struct IntersectionGrid {
 };
 IntersectionGrid MakeIntersectionGrid(int columns, int rows);
 
+// ---- A job for the graphic view: `sightings` / 20 stations on a square grid 100 m apart, walked row
+// by row as traverses, each station point known one time in ten. Every station sights four of its
+// neighbours as references and measures its own new points (scattered up to 60 m around it) and some of
+// those of the station before. With 100 000 points and 200 000 sightings: 10 000 stations, each with nine
+// new points, four references and sixteen measures.
+struct MappedJob {
+    CCarnet carnet;
+    int stations = 0;
+    int points = 0;
+    int sightings = 0;
+};
+MappedJob MakeMappedJob(int points, int sightings);
+
 } // namespace pyr::bench
