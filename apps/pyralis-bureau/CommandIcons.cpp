@@ -13,7 +13,7 @@ namespace {
 // Drawn on a 32 × 32 grid; Qt scales the icon for the toolbar and the menus.
 constexpr int kSize = 32;
 const QColor kInk(40, 40, 48);
-const QColor kKnown(200, 40, 40);    // known points and stations
+const QColor kKnown(200, 40, 40);     // known points and stations
 const QColor kComputed(30, 110, 200); // the point or the value computed
 const QColor kBook(52, 101, 164);
 const QColor kExport(46, 139, 87);
@@ -90,8 +90,8 @@ void Draw(QPainter& p, const std::string& name) {
         {"LSokkia", "SOK"}, {"LQuenda", "QDL"}, {"LSeparat", ";"},  {"LColonne", "COL"},
         {"LTopcon", "GT7"}, {"LecWild", "GSI"}, {"LZeiss1", "ZEI"}};
     static const std::map<std::string, QString> exports = {
-        {"EPoints", "PTS"}, {"EGeoBase", "GEO"}, {"ESeparat", ";"},  {"EColonne", "COL"},
-        {"EQuendal", "QDL"}, {"ELeica", "GSI"},  {"ESpectra", "GDM"}, {"ESokkia", "SOK"}};
+        {"EPoints", "PTS"},  {"EGeoBase", "GEO"}, {"ESeparat", ";"},   {"EColonne", "COL"},
+        {"EQuendal", "QDL"}, {"ELeica", "GSI"},   {"ESpectra", "GDM"}, {"ESokkia", "SOK"}};
     if (const auto book = books.find(name); book != books.end()) return FieldBook(p, book->second);
     if (const auto out = exports.find(name); out != exports.end()) return ExportSheet(p, out->second);
 

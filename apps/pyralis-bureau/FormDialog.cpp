@@ -42,7 +42,8 @@ void SetLines(QListWidget* list, const std::vector<std::string>& items) {
         list->addItem(Text(item));
 }
 
-void SetRows(QTreeWidget* table, const std::vector<std::string>& items, const std::vector<std::string>& tips) {
+void SetRows(QTreeWidget* table, const std::vector<std::string>& items,
+             const std::vector<std::string>& tips) {
     table->clear();
     QList<QTreeWidgetItem*> rows;
     rows.reserve(static_cast<qsizetype>(items.size()));
@@ -147,7 +148,6 @@ QWidget* FormDialog::Make(const ui::Control& control) {
         auto* field = new QLineEdit;
         field->setReadOnly(true);
         field->setFocusPolicy(Qt::ClickFocus);
-        field->setAlignment(Qt::AlignRight);
         widget = field;
         break;
     }
@@ -261,9 +261,10 @@ void FormDialog::Connect(Shown& shown) {
     case ControlKind::Radio: {
         // A radio turned off by the one turned on says nothing of its own.
         const bool radio = shown.control.kind == ControlKind::Radio;
-        connect(static_cast<QAbstractButton*>(widget), &QAbstractButton::toggled, this, [this, id, radio](bool on) {
-            if (!m_refreshing && (on || !radio)) Act(id, {EventKind::Check, -1, on, {}});
-        });
+        connect(static_cast<QAbstractButton*>(widget), &QAbstractButton::toggled, this,
+                [this, id, radio](bool on) {
+                    if (!m_refreshing && (on || !radio)) Act(id, {EventKind::Check, -1, on, {}});
+                });
         break;
     }
     case ControlKind::Combo:
@@ -307,8 +308,9 @@ void FormDialog::Connect(Shown& shown) {
         break;
     }
     case ControlKind::Button:
-        connect(static_cast<QPushButton*>(widget), &QPushButton::clicked, this,
-                [this, id] { Act(id, {EventKind::Click, -1, false, {}}); });
+        connect(static_cast<QPushButton*>(widget), &QPushButton::clicked, this, [this, id] {
+            Act(id, {EventKind::Click, -1, false, {}});
+        });
         break;
     default:
         break;
@@ -335,7 +337,8 @@ bool FormDialog::eventFilter(QObject* watched, QEvent* event) {
     if (event->type() != QEvent::KeyPress) return QDialog::eventFilter(watched, event);
     const int key = static_cast<QKeyEvent*>(event)->key();
     auto* combo = qobject_cast<QComboBox*>(watched->parent());
-    if ((key != Qt::Key_Return && key != Qt::Key_Enter) || !combo) return QDialog::eventFilter(watched, event);
+    if ((key != Qt::Key_Return && key != Qt::Key_Enter) || !combo)
+        return QDialog::eventFilter(watched, event);
     for (const Shown& shown : m_controls) {
         if (shown.widget != combo) continue;
         const int rank = combo->findText(combo->currentText(), Qt::MatchFixedString);
@@ -378,6 +381,12 @@ void FormDialog::Show(Shown& shown, const ui::ControlState& state) {
         // A text being typed stays as the person types it until committed.
         if (edit->text() != text && !(control.kind == ControlKind::Edit && edit->isModified()))
             edit->setText(text);
+        // A result is a number, aligned on the right as in a table; a name or a path reads from the left.
+        if (control.kind == ControlKind::Field) {
+            bool number = false;
+            text.trimmed().toDouble(&number);
+            edit->setAlignment(number || text.isEmpty() ? Qt::AlignRight : Qt::AlignLeft);
+        }
         break;
     }
     case ControlKind::Check:

@@ -56,7 +56,7 @@ private:
     ui::FrontEnd& m_frontEnd;
     std::vector<Shown> m_controls;
     std::map<int, std::size_t> m_byId;
-    std::map<int, QGridLayout*> m_grids;       // of the dialog (0), of each group and page
+    std::map<int, QGridLayout*> m_grids;        // of the dialog (0), of each group and page
     std::map<int, QButtonGroup*> m_radioGroups; // one per parent
     QTabWidget* m_pages = nullptr;
     QHBoxLayout* m_buttonRow = nullptr;

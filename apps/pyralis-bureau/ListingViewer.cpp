@@ -38,8 +38,9 @@ void ShowInViewer(const QString& path, QWidget* parent) {
     }
     QFile file(path);
     if (!file.open(QIODevice::ReadOnly)) {
-        QMessageBox::warning(parent, "PYRALIS",
-                             QString("Le fichier <%1> n'a pas pu être ouvert :\n%2").arg(path, file.errorString()));
+        QMessageBox::warning(
+            parent, "PYRALIS",
+            QString("Le fichier <%1> n'a pas pu être ouvert :\n%2").arg(path, file.errorString()));
         return;
     }
     auto* window = new QDialog(parent);

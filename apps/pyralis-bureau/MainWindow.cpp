@@ -5,9 +5,9 @@
 #include "GeoView.h"
 #include "QtFrontEnd.h"
 #include "TextWindow.h"
+#include "core/SafeFile.h"
 #include "host/HostTexts.h"
 #include "host/Services.h"
-#include "core/SafeFile.h"
 #include "settings/ConfigPaths.h"
 
 #include <QAction>
@@ -45,10 +45,12 @@ const std::vector<MenuGroup>& MenuGroups() {
         {"&Lecture de carnets",
          {"LGeodim", "LNikPsi", "LNikAtl", "LNikKps", "LSokkia", "LQuenda", "LSeparat", "LColonne", "LTopcon",
           "LecWild", "LZeiss1"}},
-        {"&Exports", {"EPoints", "EGeoBase", "ESeparat", "EColonne", "EQuendal", "ELeica", "ESpectra", "ESokkia"}},
+        {"&Exports",
+         {"EPoints", "EGeoBase", "ESeparat", "EColonne", "EQuendal", "ELeica", "ESpectra", "ESokkia"}},
         {"É&diteur", {"GeoEdit", "GeoEdit2"}},
         {"&Calculs",
-         {"CalculV0", "CalInter", "CalRelev", "CalRecou", "CalExcen", "CalTrian", "CalRayon", "CalChem", "CalBloc"}},
+         {"CalculV0", "CalInter", "CalRelev", "CalRecou", "CalExcen", "CalTrian", "CalRayon", "CalChem",
+          "CalBloc"}},
         {"&Nivellement", {"CalNivSm", "CalNivSt"}},
         {"Co&dification", {"CalAsmCode", "CalTabCode", "CalDesCode"}},
     };
@@ -86,6 +88,9 @@ MainWindow::MainWindow(ModuleHost& module, QtFrontEnd& frontEnd, QWidget* parent
     m_frontEnd.SetTextWindow(m_text);
     LoadHistory();
     UpdateTitle();
+    m_text->AddLine(QString("PYRALIS Calculs Topo : %1 commandes ; « ? » en donne la liste, Entrée répète la "
+                            "dernière.")
+                        .arg(m_commands.size()));
     resize(1280, 860);
 }
 
@@ -137,9 +142,10 @@ void MainWindow::BuildMenus() {
     QMenu* help = menuBar()->addMenu("A&ide");
     help->addAction("Liste des &commandes", this, [this] { RunCommand("?"); });
     help->addAction("À &propos", this, [this] {
-        QMessageBox::about(this, "PYRALIS",
-                           "PYRALIS Calculs Topo\n\nCalculs topométriques pour les géomètres : lecture des carnets "
-                           "de terrain, GéoBases, V0 de stations, intersections, listings.");
+        QMessageBox::about(
+            this, "PYRALIS",
+            "PYRALIS Calculs Topo\n\nCalculs topométriques pour les géomètres : lecture des carnets "
+            "de terrain, GéoBases, V0 de stations, intersections, listings.");
     });
 }
 
@@ -148,8 +154,9 @@ void MainWindow::BuildToolbar() {
     m_toolbar->setIconSize(QSize(24, 24));
     for (const CommandInfo& command : m_commands) {
         // Separators between the groups, as the menu has them.
-        if (command.localName == "LGeodim" || command.localName == "EPoints" || command.localName == "GeoEdit" ||
-            command.localName == "CalInter" || command.localName == "CalAsmCode")
+        if (command.localName == "LGeodim" || command.localName == "EPoints" ||
+            command.localName == "GeoEdit" || command.localName == "CalInter" ||
+            command.localName == "CalAsmCode")
             m_toolbar->addSeparator();
         m_toolbar->addAction(CommandAction(command.localName));
     }
@@ -180,7 +187,8 @@ void MainWindow::BuildDocks() {
     QStringList names;
     for (const CommandInfo& command : m_commands)
         names << Utf8(command.localName) << Utf8(command.globalName);
-    names << "AIDE" << "FIN";
+    names << "AIDE"
+          << "FIN";
     m_line->SetNames(names);
     connect(m_line, &CommandLine::CommandEntered, this, &MainWindow::RunCommand);
 }
@@ -224,7 +232,8 @@ void MainWindow::RunCommand(const QString& typed) {
     }
     SaveHistory();
     if (words.size() > 1)
-        m_text->AddLine("Les options d'une commande sont celles de pyralis ; ici, sa boîte de dialogue les donne.");
+        m_text->AddLine(
+            "Les options d'une commande sont celles de pyralis ; ici, sa boîte de dialogue les donne.");
     m_running = true;
     m_frontEnd.ResetFailures();
     m_module.Run(name.toStdString());

@@ -17,7 +17,8 @@ bool ModuleHost::Load(const std::string& programFolder) {
     SetSupportPath({programFolder});
     std::string module;
     if (acedFindFile(host::kModuleFile, module) != RTNORM || !acrxDynamicLinker()->loadModule(module)) {
-        m_failure = Sprintf(host::kMsgModuleNotLoaded, host::kModuleFile) + "\n" + acrxDynamicLinker()->lastError();
+        m_failure =
+            Sprintf(host::kMsgModuleNotLoaded, host::kModuleFile) + "\n" + acrxDynamicLinker()->lastError();
         return false;
     }
     acrxDynamicLinker()->sendDocumentMessage(AcRx::kLoadDwgMsg, &g_drawing);
@@ -33,7 +34,8 @@ void ModuleHost::Unload() {
 }
 
 std::vector<CommandInfo> ModuleHost::Commands() const {
-    const auto* titles = static_cast<const host::CPyrCommandTitles*>(acrxServiceDictionary()->at(host::kCommandTitlesName));
+    const auto* titles =
+        static_cast<const host::CPyrCommandTitles*>(acrxServiceDictionary()->at(host::kCommandTitlesName));
     std::vector<CommandInfo> commands;
     for (const AcEdCommand& command : acedRegCmds()->commands()) {
         if (command.group != host::kCommandGroup) continue;

@@ -87,12 +87,14 @@ ui::Answer QtFrontEnd::Ask(std::string_view text, std::string_view caption, ui::
     QMessageBox box(BoxIcon(icon), Text(caption), Text(text), QMessageBox::NoButton, m_parent);
     QPushButton* yes = box.addButton("&Oui", QMessageBox::YesRole);
     QPushButton* no = box.addButton("&Non", QMessageBox::NoRole);
-    QPushButton* cancel = buttons == ui::Buttons::YesNoCancel ? box.addButton("Annuler", QMessageBox::RejectRole)
-                                                              : nullptr;
+    QPushButton* cancel =
+        buttons == ui::Buttons::YesNoCancel ? box.addButton("Annuler", QMessageBox::RejectRole) : nullptr;
     yes->setObjectName("oui");
     no->setObjectName("non");
     if (cancel) cancel->setObjectName("annuler");
-    box.setDefaultButton(byDefault == ui::Answer::Yes ? yes : byDefault == ui::Answer::No || !cancel ? no : cancel);
+    box.setDefaultButton(byDefault == ui::Answer::Yes             ? yes
+                         : byDefault == ui::Answer::No || !cancel ? no
+                                                                  : cancel);
     // Escape cancels the question, or says no when it offers only yes and no.
     box.setEscapeButton(cancel ? cancel : no);
     box.exec();

@@ -72,7 +72,8 @@ int Capture(pyr::bureau::MainWindow& window, pyr::bureau::QtFrontEnd& frontEnd, 
     window.show();
     QApplication::processEvents();
     if (!window.grab().save(QString::fromStdString(options.capture), "PNG")) {
-        std::fprintf(stderr, "pyralis-bureau : l'image <%s> n'a pas pu être écrite.\n", options.capture.c_str());
+        std::fprintf(stderr, "pyralis-bureau : l'image <%s> n'a pas pu être écrite.\n",
+                     options.capture.c_str());
         return kStatusFailed;
     }
     return 0;
@@ -87,8 +88,9 @@ int main(int argc, char** argv) {
         ->option_text("CHEMIN");
     app.add_option("--geobase", options.geoBase, "la GéoBase à dessiner (la dernière utilisée sinon)")
         ->option_text("GEOBASE");
-    app.add_option("--capture", options.capture,
-                   "dessine la fenêtre (ou la boîte de dialogue de --dialogue) dans une image PNG, sans écran")
+    app.add_option(
+           "--capture", options.capture,
+           "dessine la fenêtre (ou la boîte de dialogue de --dialogue) dans une image PNG, sans écran")
         ->option_text("FICHIER.png");
     app.add_option("--dialogue", options.dialog, "avec --capture : la commande dont la boîte est dessinée")
         ->option_text("COMMANDE");

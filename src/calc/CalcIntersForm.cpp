@@ -1,15 +1,17 @@
 #include "calc/CalcIntersForm.h"
 
-#include "calc/FormControls.h"
 #include "calc/IntersectionTexts.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
+#include "ui/FormControls.h"
 
 #include <algorithm>
 
 namespace pyr {
 
 namespace {
+
+using ui::Ctl;
 
 using ui::Control;
 using ui::ControlKind;

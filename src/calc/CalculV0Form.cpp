@@ -1,10 +1,10 @@
 #include "calc/CalculV0Form.h"
 
-#include "calc/FormControls.h"
 #include "core/Angles.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
+#include "ui/FormControls.h"
 #include "ui/FrontEnd.h"
 
 #include <algorithm>
@@ -13,6 +13,8 @@
 namespace pyr {
 
 namespace {
+
+using ui::Ctl;
 
 using ui::Control;
 using ui::ControlKind;

@@ -1,10 +1,12 @@
 #include "calc/StationReductionForm.h"
 
-#include "calc/FormControls.h"
+#include "ui/FormControls.h"
 
 #include <string_view>
 
 namespace pyr {
+
+using ui::Ctl;
 
 std::vector<ui::Control> CStationReductionForm::Controls() const {
     // One frame for each group of switches, in the order the switches name them, one above the other.

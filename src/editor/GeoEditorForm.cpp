@@ -2,6 +2,7 @@
 
 #include "core/Strings.h"
 #include "fieldbook/FieldBookFormats.h"
+#include "ui/FormControls.h"
 #include "ui/FrontEnd.h"
 
 namespace pyr {
@@ -9,19 +10,6 @@ namespace pyr {
 namespace {
 
 using ui::ControlKind;
-
-ui::Control Make(int id, ControlKind kind, std::string name, std::string text, int row, int column,
-                 int columnSpan = 1) {
-    ui::Control control;
-    control.id = id;
-    control.kind = kind;
-    control.name = std::move(name);
-    control.text = std::move(text);
-    control.row = row;
-    control.column = column;
-    control.columnSpan = columnSpan;
-    return control;
-}
 
 // A menu entry as a line of a list: "Carnet &Wild, Leica" gives "Carnet Wild, Leica".
 std::string WithoutAccelerator(std::string_view entry) {
@@ -35,28 +23,29 @@ std::string WithoutAccelerator(std::string_view entry) {
 
 std::vector<ui::Control> CGeoEditorForm::Controls() const {
     std::vector<ui::Control> controls;
-    ui::Control label = Make(kGeoBaseLabel, ControlKind::Label, "geobaseLabel", "GéoBase :", 0, 0);
+    ui::Control label = ui::Ctl(kGeoBaseLabel, ControlKind::Label, "geobaseLabel", "GéoBase :");
     label.buddy = kGeoBase;
     controls.push_back(label);
-    ui::Control field = Make(kGeoBase, ControlKind::Field, "geobase", "", 0, 1, 3);
+    ui::Control field = ui::Ctl(kGeoBase, ControlKind::Field, "geobase").At(0, 1, 1, 3);
     field.width = 60;
     controls.push_back(field);
-    label = Make(kElementsLabel, ControlKind::Label, "elementsLabel", "&Éléments :", 1, 0, 4);
+    label = ui::Ctl(kElementsLabel, ControlKind::Label, "elementsLabel", "&Éléments :").At(1, 0, 1, 4);
     label.buddy = kElements;
     controls.push_back(label);
-    ui::Control list = Make(kElements, ControlKind::List, "elements", "", 2, 0, 4);
+    ui::Control list = ui::Ctl(kElements, ControlKind::List, "elements").At(2, 0, 1, 4);
     list.columns = {"N°", "Élément", "Valeurs"};
     list.width = 100;
     list.lines = 20;
     controls.push_back(list);
-    controls.push_back(Make(kReduce, ControlKind::Button, "reduction", "Ré&duction des reprises", 3, 0));
-    label = Make(kFormatLabel, ControlKind::Label, "formatLabel", "F&ormat du carnet :", 3, 1);
+    controls.push_back(
+        ui::Ctl(kReduce, ControlKind::Button, "reduction", "Ré&duction des reprises").At(3, 0));
+    label = ui::Ctl(kFormatLabel, ControlKind::Label, "formatLabel", "F&ormat du carnet :").At(3, 1);
     label.buddy = kFormat;
     controls.push_back(label);
-    controls.push_back(Make(kFormat, ControlKind::Combo, "format", "", 3, 2));
-    controls.push_back(Make(kRead, ControlKind::Button, "lecture", "&Lecture", 3, 3));
-    controls.push_back(Make(kStatus, ControlKind::Status, "etat", "", 4, 0, 4));
-    ui::Control close = Make(ui::kIdCancel, ControlKind::Button, "fermer", "&Fermer", 0, 0);
+    controls.push_back(ui::Ctl(kFormat, ControlKind::Combo, "format").At(3, 2));
+    controls.push_back(ui::Ctl(kRead, ControlKind::Button, "lecture", "&Lecture").At(3, 3));
+    controls.push_back(ui::Ctl(kStatus, ControlKind::Status, "etat").At(4, 0, 1, 4));
+    ui::Control close = ui::Ctl(ui::kIdCancel, ControlKind::Button, "fermer", "&Fermer");
     close.parent = ui::kButtonRow;
     controls.push_back(close);
     return controls;

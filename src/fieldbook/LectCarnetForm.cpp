@@ -1,6 +1,7 @@
 #include "fieldbook/LectCarnetForm.h"
 
 #include "fieldbook/ParamDriverForm.h"
+#include "ui/FormControls.h"
 #include "ui/FrontEnd.h"
 
 namespace pyr {
@@ -11,19 +12,6 @@ using ui::ControlKind;
 
 constexpr int kPathWidth = 50;
 
-ui::Control Make(int id, ControlKind kind, std::string name, std::string text, int row, int column,
-                 int columnSpan = 1) {
-    ui::Control control;
-    control.id = id;
-    control.kind = kind;
-    control.name = std::move(name);
-    control.text = std::move(text);
-    control.row = row;
-    control.column = column;
-    control.columnSpan = columnSpan;
-    return control;
-}
-
 } // namespace
 
 std::vector<ui::Control> CLectCarnetForm::Controls() const {
@@ -31,37 +19,40 @@ std::vector<ui::Control> CLectCarnetForm::Controls() const {
     std::vector<ui::Control> controls;
     // A file: its label, its edit and its browse button, on a row of the grid.
     const auto file = [&controls](int label, const char* name, const char* text, int row) {
-        ui::Control caption = Make(label, ControlKind::Label, std::string(name) + "Label", text, row, 0);
+        ui::Control caption =
+            ui::Ctl(label, ControlKind::Label, std::string(name) + "Label", text).At(row, 0);
         caption.buddy = label + 1;
         controls.push_back(caption);
-        ui::Control edit = Make(label + 1, ControlKind::Edit, name, "", row, 1);
+        ui::Control edit = ui::Ctl(label + 1, ControlKind::Edit, name).At(row, 1);
         edit.width = kPathWidth;
         controls.push_back(edit);
         controls.push_back(
-            Make(label + 2, ControlKind::Button, std::string(name) + "Parcourir", "...", row, 2));
+            ui::Ctl(label + 2, ControlKind::Button, std::string(name) + "Parcourir", "...").At(row, 2));
     };
     file(Id::kCarnetLabel, "carnet", "&Carnet :", 0);
     file(Id::kGeoBaseLabel, "geobase", "&GéoBase à créer :", 1);
     file(Id::kParamFileLabel, "parametrage", "&Fichier de paramétrage :", 2);
-    controls.push_back(Make(Id::kInterpret, ControlKind::Check, "interpretation",
-                            "&Interpréter les codes par la table de codes", 3, 1, 2));
+    controls.push_back(ui::Ctl(Id::kInterpret, ControlKind::Check, "interpretation",
+                               "&Interpréter les codes par la table de codes")
+                           .At(3, 1, 1, 2));
     file(Id::kCodeTableLabel, "table", "Ta&ble de codes :", 4);
-    controls.push_back(Make(Id::kWriteInstrument, ControlKind::Check, "ecrireAppareil",
-                            "Écrire l'&appareil en tête de la GéoBase", 5, 1, 2));
+    controls.push_back(ui::Ctl(Id::kWriteInstrument, ControlKind::Check, "ecrireAppareil",
+                               "Écrire l'&appareil en tête de la GéoBase")
+                           .At(5, 1, 1, 2));
     ui::Control label =
-        Make(Id::kInstrumentLabel, ControlKind::Label, "appareilLabel", "Appareil de &terrain :", 6, 0);
+        ui::Ctl(Id::kInstrumentLabel, ControlKind::Label, "appareilLabel", "Appareil de &terrain :").At(6, 0);
     label.buddy = Id::kInstrument;
     controls.push_back(label);
-    controls.push_back(Make(Id::kInstrument, ControlKind::Combo, "appareil", "", 6, 1));
+    controls.push_back(ui::Ctl(Id::kInstrument, ControlKind::Combo, "appareil").At(6, 1));
 
-    ui::Control params = Make(Id::kEditParams, ControlKind::Button, "parametres", "&Paramètres...", 0, 0);
+    ui::Control params = ui::Ctl(Id::kEditParams, ControlKind::Button, "parametres", "&Paramètres...");
     params.parent = ui::kButtonRow;
     controls.push_back(params);
-    ui::Control ok = Make(ui::kIdOk, ControlKind::Button, "ok", "OK", 0, 1);
+    ui::Control ok = ui::Ctl(ui::kIdOk, ControlKind::Button, "ok", "OK").At(0, 1);
     ok.parent = ui::kButtonRow;
     ok.isDefault = true;
     controls.push_back(ok);
-    ui::Control cancel = Make(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler", 0, 2);
+    ui::Control cancel = ui::Ctl(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler").At(0, 2);
     cancel.parent = ui::kButtonRow;
     controls.push_back(cancel);
     return controls;

@@ -3,6 +3,7 @@
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "settings/ListingObject.h"
+#include "ui/FormControls.h"
 #include "ui/FrontEnd.h"
 
 #include <algorithm>
@@ -165,20 +166,6 @@ constexpr std::array<const char*, 6> kInstrumentValueLabels = {
 constexpr int kNumberWidth = 12;
 constexpr int kTextWidth = 30;
 
-Control Make(int id, ControlKind kind, std::string name, std::string text, int parent, int row, int column,
-             int columnSpan = 1) {
-    Control control;
-    control.id = id;
-    control.kind = kind;
-    control.name = std::move(name);
-    control.text = std::move(text);
-    control.parent = parent;
-    control.row = row;
-    control.column = column;
-    control.columnSpan = columnSpan;
-    return control;
-}
-
 // The page ids follow the controls of the instruments page and the columns.
 constexpr int PageId(int rank) {
     return COptionPSheetForm::kAddExtraColumn + 1 + rank;
@@ -200,39 +187,45 @@ int COptionPSheetForm::InstrumentValueEdit(std::string_view prefix) {
 void COptionPSheetForm::Build() {
     for (int rank = 0; rank < static_cast<int>(kPageTitles.size()); ++rank)
         m_controls.push_back(
-            Make(PageId(rank), ControlKind::Page, Sprintf("page%d", rank), kPageTitles[rank], 0, 0, 0));
+            ui::Ctl(PageId(rank), ControlKind::Page, Sprintf("page%d", rank), kPageTitles[rank]));
 
     // Instruments: the list, its two buttons, then the instrument highlighted.
     const int instruments = PageId(kInstrumentsPage);
-    Control label =
-        Make(kInstrumentsLabel, ControlKind::Label, "appareilsLabel", "&Appareils :", instruments, 0, 0, 2);
+    Control label = ui::Ctl(kInstrumentsLabel, ControlKind::Label, "appareilsLabel", "&Appareils :")
+                        .In(instruments)
+                        .At(0, 0, 1, 2);
     label.buddy = kInstruments;
     m_controls.push_back(label);
-    Control list = Make(kInstruments, ControlKind::List, "appareils", "", instruments, 1, 0, 2);
+    Control list = ui::Ctl(kInstruments, ControlKind::List, "appareils").In(instruments).At(1, 0, 1, 2);
     list.columns = {"N°",        "Nom",       "Prisme (m)", "Coll. V (gr)",
                     "σ AH (gr)", "σ AV (gr)", "σ DI (m)",   "σ DI (ppm)"};
     list.width = 125;
     list.lines = 6;
     m_controls.push_back(list);
     m_controls.push_back(
-        Make(kAddInstrument, ControlKind::Button, "ajouterAppareil", "A&jouter", instruments, 2, 0));
-    m_controls.push_back(
-        Make(kRemoveInstrument, ControlKind::Button, "supprimerAppareil", "&Supprimer", instruments, 2, 1));
-    label = Make(kInstrumentNameLabel, ControlKind::Label, "nomAppareilLabel", "&Nom :", instruments, 3, 0);
+        ui::Ctl(kAddInstrument, ControlKind::Button, "ajouterAppareil", "A&jouter").In(instruments).At(2, 0));
+    m_controls.push_back(ui::Ctl(kRemoveInstrument, ControlKind::Button, "supprimerAppareil", "&Supprimer")
+                             .In(instruments)
+                             .At(2, 1));
+    label = ui::Ctl(kInstrumentNameLabel, ControlKind::Label, "nomAppareilLabel", "&Nom :")
+                .In(instruments)
+                .At(3, 0);
     label.buddy = kInstrumentName;
     m_controls.push_back(label);
-    Control edit = Make(kInstrumentName, ControlKind::Edit, "nomAppareil", "", instruments, 3, 1);
+    Control edit = ui::Ctl(kInstrumentName, ControlKind::Edit, "nomAppareil").In(instruments).At(3, 1);
     edit.width = kTextWidth;
     m_controls.push_back(edit);
     const auto valueKeys = InstrumentValueKeys();
     for (std::size_t i = 0; i < valueKeys.size(); ++i) {
         const int id = kInstrumentValues + 2 * static_cast<int>(i);
         const int row = 4 + static_cast<int>(i);
-        label = Make(id, ControlKind::Label, std::string(valueKeys[i].prefix) + "Label",
-                     kInstrumentValueLabels[i], instruments, row, 0);
+        label = ui::Ctl(id, ControlKind::Label, std::string(valueKeys[i].prefix) + "Label",
+                        kInstrumentValueLabels[i])
+                    .In(instruments)
+                    .At(row, 0);
         label.buddy = id + 1;
         m_controls.push_back(label);
-        edit = Make(id + 1, ControlKind::Edit, valueKeys[i].prefix, "", instruments, row, 1);
+        edit = ui::Ctl(id + 1, ControlKind::Edit, valueKeys[i].prefix).In(instruments).At(row, 1);
         edit.width = kNumberWidth;
         m_controls.push_back(edit);
     }
@@ -250,8 +243,10 @@ void COptionPSheetForm::Build() {
                 group = id++;
                 groupRow = 0;
                 groupTitle = field.group;
-                m_controls.push_back(Make(group, ControlKind::Group, Sprintf("groupe%d", group), field.group,
-                                          parent, (*row)++, 0, 2));
+                m_controls.push_back(
+                    ui::Ctl(group, ControlKind::Group, Sprintf("groupe%d", group), field.group)
+                        .In(parent)
+                        .At((*row)++, 0, 1, 2));
             }
             parent = group;
             row = &groupRow;
@@ -263,9 +258,10 @@ void COptionPSheetForm::Build() {
         if (field.widget == Widget::Check) {
             key.id = id++;
             key.shows = Shows::Switch;
-            m_controls.push_back(Make(key.id, ControlKind::Check, name, field.label, parent, (*row)++, 0, 2));
+            m_controls.push_back(
+                ui::Ctl(key.id, ControlKind::Check, name, field.label).In(parent).At((*row)++, 0, 1, 2));
         } else {
-            label = Make(id++, ControlKind::Label, name + "/label", field.label, parent, *row, 0);
+            label = ui::Ctl(id++, ControlKind::Label, name + "/label", field.label).In(parent).At(*row, 0);
             key.id = id++;
             label.buddy = key.id;
             m_controls.push_back(label);
@@ -273,15 +269,15 @@ void COptionPSheetForm::Build() {
             switch (field.widget) {
             case Widget::Bits:
                 key.shows = Shows::Bits;
-                control = Make(key.id, ControlKind::CheckList, name, "", parent, *row, 1);
+                control = ui::Ctl(key.id, ControlKind::CheckList, name).In(parent).At(*row, 1);
                 control.lines = static_cast<int>(field.lines.size());
                 break;
             case Widget::Choice:
                 key.shows = Shows::Choice;
-                control = Make(key.id, ControlKind::Combo, name, "", parent, *row, 1);
+                control = ui::Ctl(key.id, ControlKind::Combo, name).In(parent).At(*row, 1);
                 break;
             default:
-                control = Make(key.id, ControlKind::Edit, name, "", parent, *row, 1);
+                control = ui::Ctl(key.id, ControlKind::Edit, name).In(parent).At(*row, 1);
                 control.width = FindOption(field.section, field.key)->type == OptionType::Text ? kTextWidth
                                                                                                : kNumberWidth;
                 break;
@@ -294,22 +290,26 @@ void COptionPSheetForm::Build() {
         // The columns of the radiated points are completed from those offered.
         if (field.page == kListingsPage && std::string_view(field.key) == "RayonContenu") {
             const int page = PageId(kListingsPage);
-            label = Make(kExtraColumnLabel, ControlKind::Label, "colonneLabel",
-                         "Colonne &supplémentaire :", page, *row, 0);
+            label =
+                ui::Ctl(kExtraColumnLabel, ControlKind::Label, "colonneLabel", "Colonne &supplémentaire :")
+                    .In(page)
+                    .At(*row, 0);
             label.buddy = kExtraColumn;
             m_controls.push_back(label);
-            m_controls.push_back(Make(kExtraColumn, ControlKind::Combo, "colonne", "", page, *row, 1));
-            m_controls.push_back(Make(kAddExtraColumn, ControlKind::Button, "ajouterColonne",
-                                      "Ajo&uter la colonne", page, ++*row, 1));
+            m_controls.push_back(ui::Ctl(kExtraColumn, ControlKind::Combo, "colonne").In(page).At(*row, 1));
+            m_controls.push_back(
+                ui::Ctl(kAddExtraColumn, ControlKind::Button, "ajouterColonne", "Ajo&uter la colonne")
+                    .In(page)
+                    .At(++*row, 1));
             ++*row;
         }
     }
 
-    Control ok = Make(ui::kIdOk, ControlKind::Button, "ok", "OK", ui::kButtonRow, 0, 0);
+    Control ok = ui::Ctl(ui::kIdOk, ControlKind::Button, "ok", "OK").In(ui::kButtonRow);
     ok.isDefault = true;
     m_controls.push_back(ok);
     m_controls.push_back(
-        Make(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler", ui::kButtonRow, 0, 1));
+        ui::Ctl(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler").In(ui::kButtonRow).At(0, 1));
 }
 
 bool COptionPSheetForm::Open(ui::FrontEnd&) {

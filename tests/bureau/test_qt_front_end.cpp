@@ -44,8 +44,9 @@ TEST(QtFrontEnd, MessageBoxesAndQuestionsCarryTheCaptionTheIconAndTheDefault) {
         EXPECT_EQ(box.buttons().size(), 3);
         box.defaultButton()->click();
     });
-    EXPECT_EQ(frontEnd.Ask("La GéoBase courante a été modifiée !", kCaption, Buttons::YesNoCancel, Answer::No),
-              Answer::No);
+    EXPECT_EQ(
+        frontEnd.Ask("La GéoBase courante a été modifiée !", kCaption, Buttons::YesNoCancel, Answer::No),
+        Answer::No);
     OnModalBox([](QMessageBox& box) { box.reject(); });
     EXPECT_EQ(frontEnd.Ask("Compléter ?", kCaption, Buttons::YesNoCancel, Answer::Yes), Answer::Cancel);
     // With only yes and no, Escape says no.

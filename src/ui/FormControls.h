@@ -6,14 +6,14 @@
 #include <utility>
 #include <vector>
 
-// The controls of a computation's window, written one to a line: what it is, then where it stands and
-// what it needs.
+// The controls of a window's template, written one to a line: what it is, then where it stands and what
+// it needs.
 //   Ctl(kPoint, ControlKind::EditCombo, "point").At(0, 1).Width(12)
-namespace pyr {
+namespace pyr::ui {
 
 class Ctl {
 public:
-    Ctl(int id, ui::ControlKind kind, std::string name, std::string text = {}) {
+    Ctl(int id, ControlKind kind, std::string name, std::string text = {}) {
         m_control.id = id;
         m_control.kind = kind;
         m_control.name = std::move(name);
@@ -49,10 +49,10 @@ public:
         m_control.lines = lines;
         return *this;
     }
-    operator ui::Control() const { return m_control; }
+    operator Control() const { return m_control; }
 
 private:
-    ui::Control m_control;
+    Control m_control;
 };
 
-} // namespace pyr
+} // namespace pyr::ui

@@ -1,0 +1,160 @@
+// The computations' dialogs used as a person uses them, through their widgets: the point or the V0 found
+// is the one the geometry gives, and the same as the same actions on the model give. The GéoBases are
+// built from exact coordinates.
+#include "FormDialog.h"
+#include "TestSupport.h"
+#include "calc/CalcInters.h"
+#include "calc/CalcIntersDriver.h"
+#include "calc/CalculV0Driver.h"
+#include "calc/test_v0_geometry.h"
+#include "ui/Form.h"
+#include "ui/ScriptedFrontEnd.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QPushButton>
+#include <QTest>
+#include <gtest/gtest.h>
+
+namespace pyr::test {
+namespace {
+
+constexpr double kTenthMm = 1e-4;
+constexpr const char* kListingOptions =
+    "[Options_Listings]\nChoixNomListing=0\nAfficherListing=0\n[Listings]\nFormat=2\n";
+
+template <class Widget>
+Widget& Find(QWidget& dialog, const char* name) {
+    auto* widget = dialog.findChild<Widget*>(name);
+    if (!widget) throw std::runtime_error(std::string("pas de contrôle ") + name);
+    return *widget;
+}
+
+void Click(QWidget& dialog, const char* name) {
+    auto& button = Find<QPushButton>(dialog, name);
+    EXPECT_TRUE(button.isEnabled()) << name;
+    QTest::mouseClick(&button, Qt::LeftButton);
+}
+
+// P sighted from three stations whose places and orientations are known.
+struct IntersectionJob {
+    static constexpr Place kP{1050.0, 2080.0, 103.2};
+    CCarnet job;
+
+    IntersectionJob() {
+        const Place s1{1000.0, 2000.0, 100.0}, s2{1100.0, 2000.0, 101.0}, s3{1120.0, 2150.0, 99.0};
+        for (const auto& [name, place] : {std::pair{"S1", s1}, {"S2", s2}, {"S3", s3}})
+            AddPoint(job, name, place);
+        AddStation(job, "S1", 1.5, 50.0);
+        AddSighting(job, "P", s1, 1.5, kP, 1.3, 50.0, kKindMesure);
+        AddStation(job, "S2", 1.6, 120.0);
+        AddSighting(job, "P", s2, 1.6, kP, 1.3, 120.0, kKindMesure);
+        AddStation(job, "S3", 1.45, 333.3);
+        AddSighting(job, "P", s3, 1.45, kP, 1.3, 333.3, kKindMesure);
+    }
+    std::string Prepare(const TempDir& dir) {
+        WriteBytes(dir / "Pyralis.ini", kListingOptions);
+        EXPECT_EQ(job.Save(dir / "chantier.geo"), 1);
+        return dir / "chantier.geo";
+    }
+};
+
+TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog) {
+    IntersectionJob job;
+    TempDir dir;
+    const std::string geo = job.Prepare(dir);
+    ui::ScriptedFrontEnd frontEnd;
+    CCalcIntersDriver driver;
+    driver.SetInputs({geo, dir / "Pyralis.ini", "", "calcul d'un point par intersections de visées"});
+    const std::unique_ptr<ui::Form> form = driver.MakeForm();
+    ASSERT_TRUE(form->Open(frontEnd));
+    bureau::FormDialog dialog(*form, frontEnd);
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
+
+    // The point's name typed into the combo, then every sighting taken.
+    auto& point = Find<QComboBox>(dialog, "point");
+    point.setFocus();
+    point.lineEdit()->selectAll();
+    QTest::keyClicks(point.lineEdit(), "P");
+    QTest::keyClick(point.lineEdit(), Qt::Key_Return);
+    EXPECT_EQ(Find<QListWidget>(dialog, "disponibles").count(), 3);
+    EXPECT_FALSE(Find<QPushButton>(dialog, "ecrire").isEnabled());
+    Click(dialog, "ajouterToutes");
+    EXPECT_EQ(Find<QListWidget>(dialog, "retenues").count(), 3);
+    EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneePremiere").text().toStdString(), "1050.0000");
+    EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneeSeconde").text().toStdString(), "2080.0000");
+
+    // Planimetry switched off leaves the altitude alone, and back on.
+    Find<QCheckBox>(dialog, "calculPlani").click();
+    EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneePremiere").text().toStdString(), "");
+    Find<QCheckBox>(dialog, "calculPlani").click();
+
+    Click(dialog, "ecrire");
+    frontEnd.answers = {ui::Answer::Yes}; // the modified GéoBase saved on leaving
+    Click(dialog, "finListing");
+    EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
+    CCarnet saved;
+    saved.Load(nullptr, geo);
+    const int p = saved.findMat("P");
+    ASSERT_GE(p, 0);
+    EXPECT_NEAR(saved.xAt(p), IntersectionJob::kP.x, kTenthMm);
+    EXPECT_NEAR(saved.yAt(p), IntersectionJob::kP.y, kTenthMm);
+    EXPECT_NEAR(saved.zAt(p), IntersectionJob::kP.z, kTenthMm);
+    EXPECT_NE(ReadBytes(dir / "chantier.cin").find("Calcul du point P"), std::string::npos);
+
+    // The same actions on the model leave the same GéoBase.
+    TempDir other;
+    IntersectionJob same;
+    CCalcInters model;
+    model.SetInputs({same.Prepare(other), other / "Pyralis.ini", "", ""});
+    ASSERT_TRUE(model.Open(frontEnd));
+    ASSERT_TRUE(model.ChoosePoint("P"));
+    model.AddAll();
+    ASSERT_TRUE(model.WritePoint());
+    frontEnd.answers = {ui::Answer::Yes};
+    model.FinishWithListing();
+    EXPECT_EQ(ReadBytes(other / "chantier.geo"), ReadBytes(geo));
+}
+
+TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
+    // S1 at a V0 of 50 gr on four known points.
+    const Place s1{1000.0, 2000.0, 100.0};
+    const Place a{1100.0, 2100.0, 101.0}, b{900.0, 2150.0, 99.0}, c{950.0, 1850.0, 100.5},
+        d{1150.0, 1950.0, 98.0};
+    CCarnet job;
+    AddPoint(job, "S1", s1);
+    for (const auto& [name, place] : {std::pair{"A", a}, {"B", b}, {"C", c}, {"D", d}})
+        AddPoint(job, name, place);
+    AddStation(job, "S1", 1.5, kUndefined);
+    for (const auto& [name, place] : {std::pair{"A", a}, {"B", b}, {"C", c}, {"D", d}})
+        AddSighting(job, name, s1, 1.5, place, 1.3, 50.0, kKindReference);
+    TempDir dir;
+    WriteBytes(dir / "Pyralis.ini", kListingOptions);
+    ASSERT_EQ(job.Save(dir / "chantier.geo"), 1);
+
+    ui::ScriptedFrontEnd frontEnd;
+    CCalculV0Driver driver;
+    driver.SetInputs({dir / "chantier.geo", dir / "Pyralis.ini", "", "calcul du V0 d'une station"});
+    const std::unique_ptr<ui::Form> form = driver.MakeForm();
+    ASSERT_TRUE(form->Open(frontEnd));
+    bureau::FormDialog dialog(*form, frontEnd);
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
+    EXPECT_EQ(Find<QListWidget>(dialog, "references").count(), 4);
+    Click(dialog, "calculer");
+    EXPECT_NEAR(Find<QLineEdit>(dialog, "v0").text().toDouble(), 50.0, 1e-4);
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    Click(dialog, "enregistrer");
+    EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
+    CCarnet saved;
+    saved.Load(nullptr, dir / "chantier.geo");
+    const int station = saved.findStaRep("S1", 1);
+    ASSERT_GE(station, 0);
+    EXPECT_NEAR(saved.v0At(station), 50.0, 1e-4);
+}
+
+} // namespace
+} // namespace pyr::test
