@@ -353,6 +353,8 @@ bool FormDialog::eventFilter(QObject* watched, QEvent* event) {
 
 void FormDialog::Refresh() {
     m_refreshing = true;
+    // The caption follows the model ("Calcul du point 101 par intersection").
+    setWindowTitle(Text(m_form.Caption()));
     for (Shown& shown : m_controls)
         Show(shown, m_form.State(shown.control.id));
     m_refreshing = false;

@@ -1,5 +1,6 @@
 #include "QtFrontEnd.h"
 
+#include "Capture.h"
 #include "FormDialog.h"
 #include "ListingViewer.h"
 #include "TextWindow.h"
@@ -157,7 +158,7 @@ ui::DialogResult QtFrontEnd::Capture(FormDialog& window) {
     window.Refresh();
     QApplication::processEvents();
     m_captured = true;
-    if (!window.grab().save(Text(m_capture), "PNG"))
+    if (!SaveCapture(window, Text(m_capture)))
         m_captureFailure = "L'image <" + m_capture + "> n'a pas pu être écrite.";
     window.hide();
     return ui::DialogResult::Cancel;

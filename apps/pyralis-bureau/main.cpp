@@ -2,6 +2,7 @@
 // its commands a window: the toolbar "Calculs Topo", the menus, the drawing of the current GéoBase, the
 // text window and the command line. Without a display it can still draw the window, or a command's
 // dialog, into a PNG file (--capture).
+#include "Capture.h"
 #include "MainWindow.h"
 #include "ModuleHost.h"
 #include "QtFrontEnd.h"
@@ -71,7 +72,7 @@ int Capture(pyr::bureau::MainWindow& window, pyr::bureau::QtFrontEnd& frontEnd, 
     }
     window.show();
     QApplication::processEvents();
-    if (!window.grab().save(QString::fromStdString(options.capture), "PNG")) {
+    if (!pyr::bureau::SaveCapture(window, QString::fromStdString(options.capture))) {
         std::fprintf(stderr, "pyralis-bureau : l'image <%s> n'a pas pu être écrite.\n",
                      options.capture.c_str());
         return kStatusFailed;

@@ -7,6 +7,7 @@
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "calc/test_v0_geometry.h"
+#include "settings/OptionPages.h"
 #include "ui/Form.h"
 #include "ui/ScriptedFrontEnd.h"
 
@@ -15,6 +16,7 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
+#include <QTabWidget>
 #include <QTest>
 #include <gtest/gtest.h>
 
@@ -154,6 +156,46 @@ TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     const int station = saved.findStaRep("S1", 1);
     ASSERT_GE(station, 0);
     EXPECT_NEAR(saved.v0At(station), 50.0, 1e-4);
+}
+
+TEST(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWrite) {
+    TempDir dir;
+    const std::string params = dir / "Pyralis.ini";
+    WriteBytes(params, "; réglages du cabinet\n");
+    ui::ScriptedFrontEnd frontEnd;
+    COptionPSheet sheet;
+    sheet.SetInputs({"", params, "", "options des calculs topométriques."});
+    const std::unique_ptr<ui::Form> form = sheet.MakeForm();
+    ASSERT_TRUE(form->Open(frontEnd));
+    bureau::FormDialog dialog(*form, frontEnd);
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
+
+    auto& pages = Find<QTabWidget>(dialog, "pages");
+    pages.setCurrentIndex(2);
+    auto& radius = Find<QLineEdit>(dialog, "Options_Corrections/RayonTerre");
+    radius.setFocus();
+    radius.selectAll();
+    QTest::keyClicks(&radius, "6378.5");
+    // A value out of the limits is said, and the field keeps its value.
+    auto& length = Find<QLineEdit>(dialog, "Listings/LongueurPage");
+    pages.setCurrentIndex(5);
+    length.setFocus(); // leaving the radius commits it
+    length.selectAll();
+    QTest::keyClicks(&length, "-4");
+    QTest::keyClick(&length, Qt::Key_Tab);
+    EXPECT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_NE(length.text(), "-4");
+    Click(dialog, "ok");
+    EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
+    const std::string byWindow = ReadBytes(params);
+
+    WriteBytes(params, "; réglages du cabinet\n");
+    COptionPSheet bySet;
+    bySet.SetInputs({"", params, "", ""});
+    ASSERT_EQ(bySet.Regler("Options_Corrections/RayonTerre=6378.5"), "");
+    ASSERT_TRUE(bySet.OnOK());
+    EXPECT_EQ(ReadBytes(params), byWindow);
 }
 
 } // namespace
