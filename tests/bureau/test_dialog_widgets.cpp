@@ -6,7 +6,7 @@
 #include "calc/CalcInters.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalculV0Driver.h"
-#include "calc/test_v0_geometry.h"
+#include "calc/IntersectionJob.h"
 #include "settings/OptionPages.h"
 #include "ui/Form.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -24,8 +24,6 @@ namespace pyr::test {
 namespace {
 
 constexpr double kTenthMm = 1e-4;
-constexpr const char* kListingOptions =
-    "[Options_Listings]\nChoixNomListing=0\nAfficherListing=0\n[Listings]\nFormat=2\n";
 
 template <class Widget>
 Widget& Find(QWidget& dialog, const char* name) {
@@ -39,29 +37,6 @@ void Click(QWidget& dialog, const char* name) {
     EXPECT_TRUE(button.isEnabled()) << name;
     QTest::mouseClick(&button, Qt::LeftButton);
 }
-
-// P sighted from three stations whose places and orientations are known.
-struct IntersectionJob {
-    static constexpr Place kP{1050.0, 2080.0, 103.2};
-    CCarnet job;
-
-    IntersectionJob() {
-        const Place s1{1000.0, 2000.0, 100.0}, s2{1100.0, 2000.0, 101.0}, s3{1120.0, 2150.0, 99.0};
-        for (const auto& [name, place] : {std::pair{"S1", s1}, {"S2", s2}, {"S3", s3}})
-            AddPoint(job, name, place);
-        AddStation(job, "S1", 1.5, 50.0);
-        AddSighting(job, "P", s1, 1.5, kP, 1.3, 50.0, kKindMesure);
-        AddStation(job, "S2", 1.6, 120.0);
-        AddSighting(job, "P", s2, 1.6, kP, 1.3, 120.0, kKindMesure);
-        AddStation(job, "S3", 1.45, 333.3);
-        AddSighting(job, "P", s3, 1.45, kP, 1.3, 333.3, kKindMesure);
-    }
-    std::string Prepare(const TempDir& dir) {
-        WriteBytes(dir / "Pyralis.ini", kListingOptions);
-        EXPECT_EQ(job.Save(dir / "chantier.geo"), 1);
-        return dir / "chantier.geo";
-    }
-};
 
 TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog) {
     IntersectionJob job;
@@ -108,17 +83,7 @@ TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog
     EXPECT_NE(ReadBytes(dir / "chantier.cin").find("Calcul du point P"), std::string::npos);
 
     // The same actions on the model leave the same GéoBase.
-    TempDir other;
-    IntersectionJob same;
-    CCalcInters model;
-    model.SetInputs({same.Prepare(other), other / "Pyralis.ini", "", ""});
-    ASSERT_TRUE(model.Open(frontEnd));
-    ASSERT_TRUE(model.ChoosePoint("P"));
-    model.AddAll();
-    ASSERT_TRUE(model.WritePoint());
-    frontEnd.answers = {ui::Answer::Yes};
-    model.FinishWithListing();
-    EXPECT_EQ(ReadBytes(other / "chantier.geo"), ReadBytes(geo));
+    EXPECT_EQ(IntersectionJob::ByTheModel(frontEnd), ReadBytes(geo));
 }
 
 TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
@@ -134,7 +99,7 @@ TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     for (const auto& [name, place] : {std::pair{"A", a}, {"B", b}, {"C", c}, {"D", d}})
         AddSighting(job, name, s1, 1.5, place, 1.3, 50.0, kKindReference);
     TempDir dir;
-    WriteBytes(dir / "Pyralis.ini", kListingOptions);
+    WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
     ASSERT_EQ(job.Save(dir / "chantier.geo"), 1);
 
     ui::ScriptedFrontEnd frontEnd;

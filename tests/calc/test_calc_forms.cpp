@@ -7,6 +7,7 @@
 #include "calc/CalculV0Driver.h"
 #include "calc/CalculV0Form.h"
 #include "calc/GeoLines.h"
+#include "calc/IntersectionJob.h"
 #include "calc/IntersectionTexts.h"
 #include "calc/StationReductionDriver.h"
 #include "calc/StationReductionForm.h"
@@ -27,10 +28,6 @@ using ui::kIdCancel;
 using ui::kIdOk;
 
 constexpr double kTenthMm = 1e-4, kTenthMgon = 1e-4;
-
-// Listings in plain text beside the GéoBase, without a question of their names.
-constexpr const char* kListingOptions =
-    "[Options_Listings]\nChoixNomListing=0\nAfficherListing=0\n[Listings]\nFormat=2\n";
 
 struct Person {
     ui::Form& form;
@@ -86,30 +83,8 @@ TEST(ComputationForms, TemplatesAreConsistentAndEveryAcceleratorIsUnique) {
     }
 }
 
-// P read from three oriented stations; Q from one only.
-class IntersectionForm : public ::testing::Test {
+class IntersectionForm : public ::testing::Test, public IntersectionJob {
 protected:
-    IntersectionForm() {
-        const Place s1{1000.0, 2000.0, 100.0}, s2{1100.0, 2000.0, 101.0}, s3{1120.0, 2150.0, 99.0};
-        for (const auto& [name, place] : {std::pair{"S1", s1}, {"S2", s2}, {"S3", s3}})
-            AddPoint(job, name, place);
-        AddStation(job, "S1", 1.5, 50.0);
-        AddSighting(job, "P", s1, 1.5, kP, 1.3, 50.0, kKindMesure);
-        AddStation(job, "S2", 1.6, 120.0);
-        AddSighting(job, "P", s2, 1.6, kP, 1.3, 120.0, kKindMesure);
-        AddSighting(job, "Q", s2, 1.6, {1180.0, 2050.0, 100.0}, 1.3, 120.0, kKindMesure);
-        AddStation(job, "S3", 1.45, 333.3);
-        AddSighting(job, "P", s3, 1.45, kP, 1.3, 333.3, kKindMesure);
-    }
-    // The same GéoBase, in a folder of its own.
-    std::string Prepare(const TempDir& dir) {
-        WriteBytes(dir / "Pyralis.ini", kListingOptions);
-        EXPECT_EQ(job.Save(dir / "chantier.geo"), 1);
-        return dir / "chantier.geo";
-    }
-
-    static constexpr Place kP{1050.0, 2080.0, 103.2};
-    CCarnet job;
     ui::ScriptedFrontEnd frontEnd;
 };
 
@@ -172,16 +147,7 @@ TEST_F(IntersectionForm, PointChosenSightingsMovedWrittenThenFinishedWithTheList
     EXPECT_NE(ReadBytes(dir / "chantier.cin").find("Calcul du point P"), std::string::npos);
 
     // The same actions on the model leave the same GéoBase.
-    TempDir other;
-    CCalcInters model;
-    model.SetInputs({Prepare(other), other / "Pyralis.ini", "", ""});
-    ASSERT_TRUE(model.Open(frontEnd));
-    ASSERT_TRUE(model.ChoosePoint("P"));
-    model.AddAll();
-    ASSERT_TRUE(model.WritePoint());
-    frontEnd.answers = {ui::Answer::Yes};
-    model.FinishWithListing();
-    EXPECT_EQ(ReadBytes(other / "chantier.geo"), ReadBytes(geo));
+    EXPECT_EQ(ByTheModel(frontEnd), ReadBytes(geo));
 }
 
 TEST_F(IntersectionForm, ClosedWithoutWritingTheListingIsOfferedAndNothingSaved) {
