@@ -127,8 +127,14 @@ void FormDialog::Build() {
     }
     for (Shown& shown : m_controls) {
         if (shown.control.kind == ControlKind::Label && shown.control.buddy != 0)
-            if (QWidget* buddy = Widget(shown.control.buddy))
+            if (QWidget* buddy = Widget(shown.control.buddy)) {
                 static_cast<QLabel*>(shown.widget)->setBuddy(buddy);
+                // Beside a list, the label stands at the list's first line.
+                const ControlKind kind = m_controls[m_byId.at(shown.control.buddy)].control.kind;
+                if ((kind == ControlKind::List || kind == ControlKind::CheckList) &&
+                    shown.control.parent != ui::kButtonRow)
+                    GridOf(shown.control.parent)->setAlignment(shown.widget, Qt::AlignTop | Qt::AlignLeft);
+            }
         Connect(shown);
     }
     // Nothing stretched into empty space: the grids keep their rows together at the top.

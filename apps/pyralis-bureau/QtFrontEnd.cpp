@@ -11,6 +11,7 @@
 #include <QFileInfo>
 #include <QMessageBox>
 #include <QPushButton>
+#include <QTabWidget>
 #include <cstdio>
 #include <memory>
 
@@ -138,7 +139,11 @@ void QtFrontEnd::TextLine(std::string_view line) {
 
 ui::DialogResult QtFrontEnd::DoModal(ui::Dialog& dialog) {
     const bool capturing = !m_capture.empty() && !m_captured;
-    if (capturing && !m_geoBase.empty()) dialog.SetGeoBase(m_geoBase);
+    // The GéoBase to capture goes to the command's dialog, not to the dialogs it opens.
+    if (capturing && !m_geoBase.empty() && !m_geoBaseGiven) {
+        dialog.SetGeoBase(m_geoBase);
+        m_geoBaseGiven = true;
+    }
     std::unique_ptr<ui::Form> form = dialog.MakeForm();
     // A dialog that has no window yet runs as a command line without options would run it.
     if (!form) return dialog.Run(*this);
@@ -155,11 +160,31 @@ ui::DialogResult QtFrontEnd::Capture(FormDialog& window) {
     window.adjustSize();
     window.show();
     QApplication::processEvents();
-    window.Refresh();
-    QApplication::processEvents();
+    // The dialog that a button of this one opens is the one drawn ("Paramètres...", "Réduction").
+    if (!m_button.empty() && !m_buttonPressed) {
+        m_buttonPressed = true;
+        auto* button = window.findChild<QPushButton*>(Text(m_button));
+        if (!button || !button->isEnabled())
+            m_captureFailure = "La boîte de dialogue n'a pas de bouton « " + m_button + " » à presser.";
+        else
+            button->click();
+        window.hide();
+        return ui::DialogResult::Cancel;
+    }
     m_captured = true;
-    if (!SaveCapture(window, Text(m_capture)))
-        m_captureFailure = "L'image <" + m_capture + "> n'a pas pu être écrite.";
+    // A sheet is drawn page after page: "options.png", then "options-2.png" ...
+    auto* pages = window.findChild<QTabWidget*>("pages");
+    const int count = pages ? pages->count() : 1;
+    const QString base =
+        Text(m_capture).chopped(Text(m_capture).endsWith(".png", Qt::CaseInsensitive) ? 4 : 0);
+    for (int page = 0; page < count; ++page) {
+        if (pages) pages->setCurrentIndex(page);
+        window.Refresh();
+        QApplication::processEvents();
+        const QString path = page == 0 ? Text(m_capture) : QString("%1-%2.png").arg(base).arg(page + 1);
+        if (!SaveCapture(window, path))
+            m_captureFailure = "L'image <" + path.toStdString() + "> n'a pas pu être écrite.";
+    }
     window.hide();
     return ui::DialogResult::Cancel;
 }

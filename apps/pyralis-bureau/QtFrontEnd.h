@@ -28,12 +28,14 @@ public:
     void SetTextWindow(TextWindow* textWindow) { m_textWindow = textWindow; }
     // Nobody at the window (a capture): messages go to the error output, questions take their default.
     void SetUnattended(bool unattended) { m_unattended = unattended; }
-    // Capture of a dialog: the first dialog with a form is saved as a PNG in `path`, on `geoBase` when
-    // one is given, and closed.
-    void SetCapture(std::string path, std::string geoBase) {
+    // Capture of a dialog: the first dialog with a form is saved as a PNG in `path` (a sheet, page after
+    // page: "x.png", "x-2.png" ...), on `geoBase` when one is given, and closed. With `button`, the
+    // button of that name is pressed first and the dialog it opens is the one saved.
+    void SetCapture(std::string path, std::string geoBase, std::string button = {}) {
         m_unattended = true;
         m_capture = std::move(path);
         m_geoBase = std::move(geoBase);
+        m_button = std::move(button);
     }
     bool Captured() const { return m_captured; }
     const std::string& CaptureFailure() const { return m_captureFailure; }
@@ -55,6 +57,9 @@ private:
     bool m_unattended = false;
     std::string m_capture;
     std::string m_geoBase;
+    bool m_geoBaseGiven = false;
+    std::string m_button;
+    bool m_buttonPressed = false;
     bool m_captured = false;
     std::string m_captureFailure;
 };

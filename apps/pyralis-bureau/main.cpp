@@ -32,6 +32,7 @@ struct Options {
     std::string geoBase;
     std::string capture;
     std::string dialog;
+    std::string button;
 };
 
 // The folder of this program: the host's support path, where its modules lie.
@@ -47,6 +48,15 @@ bool HasDisplay() {
         if (value && *value) return true;
     }
     return false;
+}
+
+// Qt's remarks on the platform without a display (no runtime folder, no window sizes to pass on) say
+// nothing to a surveyor: they are left out; the others go where Qt sends them.
+QtMessageHandler g_qtMessages = nullptr;
+void FilterQtMessages(QtMsgType type, const QMessageLogContext& context, const QString& message) {
+    if (message.contains("propagateSizeHints") || message.startsWith("QStandardPaths: XDG_RUNTIME_DIR"))
+        return;
+    g_qtMessages(type, context, message);
 }
 
 // Qt's own words (file dialogs, the standard buttons) in French when the translation is installed.
@@ -95,13 +105,18 @@ int main(int argc, char** argv) {
         ->option_text("FICHIER.png");
     app.add_option("--dialogue", options.dialog, "avec --capture : la commande dont la boîte est dessinée")
         ->option_text("COMMANDE");
+    app.add_option("--bouton", options.button,
+                   "avec --dialogue : le bouton de la boîte (son nom) qui ouvre la boîte à dessiner")
+        ->option_text("NOM");
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& error) {
         return app.exit(error);
     }
-    if (!options.dialog.empty() && options.capture.empty()) {
-        std::fputs("pyralis-bureau : --dialogue ne va qu'avec --capture.\n", stderr);
+    if ((!options.dialog.empty() && options.capture.empty()) ||
+        (!options.button.empty() && options.dialog.empty())) {
+        std::fputs("pyralis-bureau : --dialogue ne va qu'avec --capture, et --bouton qu'avec --dialogue.\n",
+                   stderr);
         return 2;
     }
     const bool capture = !options.capture.empty();
@@ -112,6 +127,7 @@ int main(int argc, char** argv) {
     }
     if (!options.params.empty()) setenv("PYRALIS_PARAMS", options.params.c_str(), 1);
 
+    g_qtMessages = qInstallMessageHandler(FilterQtMessages);
     QApplication application(argc, argv);
     QApplication::setApplicationName("pyralis-bureau");
     TranslateQt(application);
@@ -121,7 +137,7 @@ int main(int argc, char** argv) {
         if (options.dialog.empty())
             frontEnd.SetUnattended(true);
         else
-            frontEnd.SetCapture(options.capture, options.geoBase);
+            frontEnd.SetCapture(options.capture, options.geoBase, options.button);
     }
     pyr::ui::SetApplicationFrontEnd(&frontEnd);
     pyr::SetMainWindow(&frontEnd);
