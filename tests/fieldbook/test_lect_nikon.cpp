@@ -246,22 +246,3 @@ TEST(LectNikon, EveryLineIsReadOrReportedWithItsNumber) {
                                         "1000 Format               = Nikon DTM (virgules); 1003 P5; "))
         << ElementsSummary(read);
 }
-
-TEST(LectNikon, LineEndsAndTransmissionBytesGiveTheSameElements) {
-    const std::string lines[] = {"MP,A1,,2000.000,1100.000,100.000,", "ST,S1,,A1,,1.550,,",
-                                 "F1,,1.300,100.001,100.0000,99.8563,10:00:00"};
-    std::string lf, crlf, cr;
-    for (const std::string& line : lines) {
-        lf += line + "\n";
-        crlf += line + "  \r\n";
-        cr += line + "\r\r";
-    }
-    NikonRun reference;
-    const std::string expected = ElementsSummary(reference.Read(lf));
-    ASSERT_EQ(expected, "1006 A1; 1001 S1; 1000 Station <S1> : référence <A1>; 1002 A1; ");
-    for (const std::string& text : {crlf, "\x02" + cr + "\x03\r\n\x04", lf + "\x1a"}) {
-        NikonRun run;
-        EXPECT_EQ(ElementsSummary(run.Read(text)), expected);
-        EXPECT_EQ(ReportText(run), "");
-    }
-}

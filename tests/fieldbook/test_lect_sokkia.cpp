@@ -276,22 +276,3 @@ TEST(LectSokkia, LinesReportedWithTheirNumbers) {
         EXPECT_EQ(ReportHeads(run), heads) << book;
     }
 }
-
-// CRLF, CR alone, blanks before the line end, transfer controls: the same elements, the same values.
-TEST(LectSokkia, LineEndsAndTransferBytesGiveTheSameElements) {
-    const std::string book = Station("S1", "2000", "1000") + Observation("P", "10", "100", "20", "ARB");
-    auto ending = [&book](const char* end) {
-        std::string text;
-        for (char c : book)
-            text += c == '\n' ? std::string(end) : std::string(1, c);
-        return text;
-    };
-    for (const std::string& text :
-         {book, ending("\r\n"), ending("\r"), "\x02" + ending("  \r\n") + "\x04\n\x1a"}) {
-        SokkiaRun run;
-        EXPECT_EQ(ElementsSummary(run.Read(text)),
-                  "1000 Format               = SDR33; 1006 S1; 1001 S1; 1009 ARB; 1003 P; ");
-        ExpectValues(run.result, 4, {U, 20.0, 100.0, 10.0});
-        EXPECT_EQ(ReportText(run), "");
-    }
-}

@@ -190,25 +190,6 @@ TEST(LectTopcon, EveryLineIsReadOrReportedWithItsNumber) {
     }
 }
 
-TEST(LectTopcon, EveryLineEndBlankAndControlByteGivesTheSameElements) {
-    const std::string lines[] = {"STN     S1,1.500,", "SS      101,1.300,ARB",
-                                 "SD      100.0000,100.0000,10.000", "NOTE    D\xe9part"};
-    const std::pair<const char*, const char*> ends[] = {
-        {"", "\n"}, {"", "\r\n"}, {"", "\r"}, {"\x02", "  \r\n"}};
-    for (const auto& [start, end] : ends) {
-        std::string text = start;
-        for (const std::string& line : lines)
-            text += line + end;
-        text += "\x03\r\n\x1a";
-        SCOPED_TRACE(text);
-        TopconRun run;
-        const CCarnet& read = run.Read(text);
-        EXPECT_EQ(ElementsSummary(read), "1001 S1; 1009 ARB; 1003 101; 1000 Départ; ");
-        ExpectValues(read, 2, {1.3, 100.0, 100.0, 10.0});
-        EXPECT_EQ(ReportText(run), "");
-    }
-}
-
 TEST(LectTopcon, AFieldBookThatCannotBeOpenedIsNamedInTheMessage) {
     TopconRun run;
     const std::string path = FieldBookData("topcon-absent.gts7");

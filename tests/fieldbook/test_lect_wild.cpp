@@ -178,23 +178,6 @@ TEST(LectWild, EveryLineIsReadOrReportedWithItsNumber) {
     ExpectValues(read, 7, {kUndefined, 100.0, kUndefined, kUndefined}); // unit digit 0 read in grads
 }
 
-TEST(LectWild, EveryLineEndBlankAndControlLineGivesTheSameElements) {
-    const std::string station = "110001+00000S10 84..10+00010000 85..10+00020000 ";
-    const std::string sighting = "110002+00000101 21.102+12345678 22.102+09876543 31..00+00012345 ";
-    const std::string cases[] = {
-        station + "\r\r\r" + sighting + "\r\r\r",
-        "!Commentaire du chantier\n" + station + "    \n\n" + sighting + "      \n\x03\n\x04\n\x1a",
-        "\x02" + station + "\r\n  " + sighting + "\r\n\x03",
-    };
-    for (const std::string& text : cases) {
-        WildRun run;
-        const CCarnet& read = run.Read(text);
-        EXPECT_EQ(ReportText(run), "") << text;
-        ASSERT_EQ(ElementsSummary(read), kGsi8 + "1006 S10; 1001 S10; 1003 101; ") << text;
-        ExpectValues(read, 3, {kUndefined, 123.45678, 98.76543, 12.345});
-    }
-}
-
 // Point 205 has coordinates: a reference whatever the marking. The codes marking references are matched
 // whatever their case, from a code block or on the sighting.
 TEST(LectWild, ReferencesAreKnownPointsOrMarkedByTheirCodes) {
