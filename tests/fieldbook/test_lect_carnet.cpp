@@ -54,17 +54,15 @@ TEST_F(LectCarnet, WhatTheDialogShows) {
     EXPECT_EQ(dialog.Carnet(), dir / "levé.du.3.txt");
 }
 
-// The parameter file offered is the format's own: a delimited layout here.
-TEST_F(LectCarnet, TheBrowseButtonsTitlesAndFilters) {
+// The GéoBase is chosen to be created; the parameter file offered is the format's own: a delimited layout.
+TEST_F(LectCarnet, TheBrowseButtonsOfferTheFilesOfTheirKind) {
     dialog.BrowseGeoBase(frontEnd);
     CLectCarnet(FieldBookFormat::Separateur, params, "").BrowseParamFile(frontEnd);
     ASSERT_EQ(frontEnd.fileChoices.size(), 2u);
-    const auto& geo = frontEnd.fileChoices[0];
-    EXPECT_EQ(std::tie(geo.save, geo.title, geo.filter, geo.defaultExtension),
-              std::make_tuple(true, "Nom de la GéoBase à créer :", "GéoBase PYRALIS (*.geo)|*.geo||", "geo"));
-    const auto& layout = frontEnd.fileChoices[1];
-    EXPECT_EQ(std::tie(layout.save, layout.filter, layout.defaultExtension),
-              std::make_tuple(false, "Fichiers de paramètres (*.sep)|*.sep||", "sep"));
+    EXPECT_TRUE(frontEnd.fileChoices[0].save);
+    EXPECT_EQ(frontEnd.fileChoices[0].defaultExtension, "geo");
+    EXPECT_FALSE(frontEnd.fileChoices[1].save);
+    EXPECT_EQ(frontEnd.fileChoices[1].defaultExtension, "sep");
 }
 
 // Each check in its order; a failure sends the person back to its field, a question answered No too.
