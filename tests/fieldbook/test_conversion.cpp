@@ -378,21 +378,9 @@ TEST_F(Conversion, TheWildSettingsPreformattingAndZeroPrismHeight) {
     EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), install + "Config/Wild.ini");
 }
 
-// A GSI field book through its own reader and the shipped settings; a comment names the field book.
-TEST_F(Conversion, AWildFieldBookIsReadByItsOwnReader) {
-    fs::copy_file(FieldBookData("wild-gsi16-84.gsi"), dir / "levé.gsi");
-    frontEnd.dialogArguments = {dir / "levé.gsi"};
-    ASSERT_EQ(RunConversion(*Make(FieldBookFormat::Wild), nullptr), DialogResult::Ok);
-    CCarnet written;
-    ASSERT_TRUE(written.Load(nullptr, dir / "levé.geo"));
-    ASSERT_EQ(written.GetSize(), 18);
-    EXPECT_EQ(written.As<CComment>(0)->text(), "Fichier              = levé.gsi");
-    EXPECT_EQ(written.GetType(10), kKindReference);
-}
-
-// Files named from the folder the command runs in are recorded whole: the next reading finds them from any
-// other folder.
-TEST_F(Conversion, AParameterFileNamedFromTheCurrentFolderIsRecordedWhole) {
+// A GSI field book through its own reader, a comment naming the book; the files named from the folder
+// the command runs in are recorded whole: the next reading finds them from any other folder.
+TEST_F(Conversion, AWildFieldBookIsReadByItsOwnReaderWithFilesNamedFromTheCurrentFolder) {
     fs::copy_file(install + "Config/Wild.ini", dir / "chantier-wild.ini");
     fs::copy_file(FieldBookData("wild-gsi16-84.gsi"), dir / "levé.gsi");
     const fs::path before = fs::current_path();
@@ -400,9 +388,14 @@ TEST_F(Conversion, AParameterFileNamedFromTheCurrentFolderIsRecordedWhole) {
     frontEnd.dialogArguments = {"levé.gsi", "--parametrage", "chantier-wild.ini"};
     const DialogResult result = RunConversion(*Make(FieldBookFormat::Wild), nullptr);
     fs::current_path(before);
-    EXPECT_EQ(result, DialogResult::Ok);
+    ASSERT_EQ(result, DialogResult::Ok);
     EXPECT_EQ(Key("Carnet.Wild", kKeyParametrage), dir / "chantier-wild.ini");
     EXPECT_EQ(ReadLastGeoBase(Params()), dir / "levé.geo");
+    CCarnet written;
+    ASSERT_TRUE(written.Load(nullptr, dir / "levé.geo"));
+    ASSERT_EQ(written.GetSize(), 18);
+    EXPECT_EQ(written.As<CComment>(0)->text(), "Fichier              = levé.gsi");
+    EXPECT_EQ(written.GetType(10), kKindReference);
 }
 
 // A delimited field book goes through a Quendal-Pc file beside it, read with the same choices and the
