@@ -54,19 +54,6 @@ TEST(LectNikon, ARawFieldBookGivesItsPointsStationBacksightsAndShots) {
     ExpectValues(withComputed, Last(withComputed), {1000.0, 2010.0, 100.25});
 }
 
-// A raw V2.00 book in ddd.mmss, northing first, with the coordinates that the instrument computed (CC)
-// after each side shot. Constructed: K1 (1250, 2180, 102.4) and S1 (1000, 2000, 100) uploaded; S1, HI
-// 1.562, its circle 37.4150 gr off the bearings, backsight on K1, then 101, 102, S2 and 103 (face II,
-// target 1.800); S2 (1080, 1940, 97.5), HI 1.485, circle 312.6600 gr off, backsight on S1 in both faces,
-// then 201 and 202 (face II, target 2.000). The observations were rounded as written (1", mm) and the
-// recorded coordinates computed from them, the instrument oriented on its backsight's coordinates.
-TEST(LectNikon, RadiatedShotsFindTheInstrumentsOwnCoordinates) {
-    NikonRun run;
-    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("nikon-raw-calcule.raw");
-    EXPECT_EQ(ReportText(run), "");
-    EXPECT_TRUE(AgreesWithInstrument(read, 9)); // K1, 101, 102, S2, 103; S1 in both faces, 201, 202
-}
-
 // The same survey in grads, easting first, S1 oriented on an azimuth alone: its station record names no
 // backsight point, gives the azimuth 60.2735 gr told to the instrument and the reading 22.8585 gr set on
 // it, and its backsight shot names no point and measures no distance. The instrument computed with V0 =

@@ -4,7 +4,6 @@
 // 100 gr) read at 50 gr on the circle. Every expected value is worked out by hand from the text written:
 // 1 ft = 0.3048 m, 1° = 10/9 gr, 1 mil = 1/16 gr, 123.758333° = 137.509259 gr.
 #include "FieldBookTestSupport.h"
-#include "RadiationCheck.h"
 #include "core/TextEncoding.h"
 #include "fieldbook/LectSokkia.h"
 #include "geobase/GeoFile.h"
@@ -198,24 +197,6 @@ TEST(LectSokkia, ReferenceSightings) {
     ExpectValues(read, 2, {U, 10.0, 100.0, 10.0});
     ExpectValues(read, 3, {U, 12.3456, U, U});
     ExpectValues(read, 4, {U, U, 100.0});
-}
-
-// Books as a collector writes them when it also stores the coordinates that it computed (08TP) after each
-// observation: SDR33 in grads, east before north, and SDR2x in decimal degrees, north first, its reals
-// touching. Constructed: K1 (1250, 2180, 102.4) known; S1 (1000, 2000, 100), HI 1.562, its circle 37.4150
-// gr off the bearings, backsight on K1, then 101, 102, S2 and 103 (face II, target 1.800); S2 (1080, 1940,
-// 97.5), HI 1.485, circle 312.6600 gr off, backsight on S1 in both faces, then 201 and 202 (face II,
-// target 2.000). The observations were rounded as written (0.1 mgon or what the 10 characters hold, mm),
-// and the recorded coordinates computed from them as written, the instrument oriented on its backsight's
-// coordinates: radiated from the GéoBase, every point falls within the mm of the book.
-TEST(LectSokkia, RadiatedObservationsFindTheCollectorsOwnCoordinates) {
-    for (const char* book : {"sokkia-sdr33-calcule.sdr", "sokkia-sdr2x-calcule.sdr"}) {
-        SCOPED_TRACE(book);
-        SokkiaRun run;
-        const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile(book);
-        EXPECT_EQ(ReportText(run), "");
-        EXPECT_TRUE(AgreesWithInstrument(read, 9)); // K1, 101, 102, S2, 103; S1 in both faces, 201, 202
-    }
 }
 
 // Blanks are values the instrument did not record: they stay missing, never 0. The point computed after an

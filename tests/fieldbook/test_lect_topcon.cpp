@@ -4,7 +4,6 @@
 // horizontal distance of 30 m with a height difference of 40 m is the 3-4-5 triangle, slope distance
 // 50 m and zenith angle atan(3/4) = 36.869898° = 40.96655 gr; one foot is 0.3048 m.
 #include "FieldBookTestSupport.h"
-#include "RadiationCheck.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectTopcon.h"
@@ -43,20 +42,6 @@ TEST(LectTopcon, AMetreAndDmsFieldBookGivesItsStationReferenceAndSightings) {
     ExpectValues(read, 12, {1.3, 137.50926, 97.22685, 25.1234}); // to the 0.1 mm written
     ExpectValues(read, 13, {1.3, 50.0, 40.96655, 50.0});         // HD 30, VD 40: the 3-4-5 triangle
     ExpectValues(read, 15, {1.3, 399.99997, 300.0, kNone});      // face II kept as read
-}
-
-// A GTS-7 book in metres and ddd.mmsss, with the coordinates that the instrument computed (XYZ, east then
-// north) after each measured point. Constructed: K1 (1250, 2180, 102.4) known; S1 (1000, 2000, 100), HI
-// 1.562, its circle 37.4150 gr off the bearings, backsight on K1, then 101, 102 (an HD line: horizontal
-// distance and height from the tilting axis to the prism), S2 and 103 (face II, target 1.800); S2 (1080,
-// 1940, 97.5), HI 1.485, circle 312.6600 gr off, backsight on S1 in both faces, then 201 and 202 (face II,
-// target 2.000). The observations were rounded as written (0.1", 0.1 mm) and the recorded coordinates
-// computed from them, the instrument oriented on its backsight's coordinates.
-TEST(LectTopcon, RadiatedObservationsFindTheInstrumentsOwnCoordinates) {
-    TopconRun run;
-    const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile("topcon-calcule.gts7");
-    EXPECT_EQ(ReportText(run), "");
-    EXPECT_TRUE(AgreesWithInstrument(read, 9)); // K1, 101, 102, S2, 103; S1 in both faces, 201, 202
 }
 
 TEST(LectTopcon, AFeetAndGradsFieldBookIsReadInMetres) {
