@@ -65,7 +65,6 @@ protected:
 
 TEST_F(ReadingForm, OkWithAMissingFieldBookKeepsTheDialogOpenOnTheFieldBook) {
     frontEnd.scripts.push_back([this](ui::Form& form) {
-        EXPECT_EQ(form.Caption(), "Lecture du carnet Wild");
         EXPECT_TRUE(form.State(Form::kGeoBase).visible && form.State(Form::kEditParams).visible);
         EXPECT_FALSE(form.State(Form::kCodeTable).enabled || form.State(Form::kInstrument).enabled);
         EXPECT_EQ(form.State(Form::kParamFile).text, install + "Config/Wild.ini");
@@ -120,7 +119,6 @@ TEST_F(ReadingForm, TheFormatsSettingsAreChosenInADialogOfTheirOwn) {
     });
     frontEnd.scripts.push_back([&](ui::Form& form) {
         auto& settings = static_cast<CParamDriverForm&>(form);
-        EXPECT_EQ(form.Caption(), "Paramétrage du carnet Wild");
         EXPECT_EQ(form.State(settings.ControlOf(kKeyUniteAngles)).current, 0);
         form.Act(frontEnd, settings.ControlOf(kKeyUniteAngles), {EventKind::Select, 1, false, {}});
         form.Act(frontEnd, settings.ControlOf(kKeyPointsCalcules), {EventKind::Check, -1, true, {}});
@@ -129,9 +127,7 @@ TEST_F(ReadingForm, TheFormatsSettingsAreChosenInADialogOfTheirOwn) {
         EXPECT_EQ(form.Ended(), DialogResult::Ok);
     });
     ASSERT_EQ(Convert(), DialogResult::Ok) << MessageTexts(frontEnd);
-    EXPECT_EQ(frontEnd.questions.at(0),
-              "Le fichier de paramétrage indiqué n'existe pas !\nVoulez-vous en créer un "
-              "nouveau ?");
+    EXPECT_EQ(frontEnd.questions.size(), 1u); // to create the file
     const std::string written = ReadBytes(file);
     for (const char* line : {"; Paramètres de lecture des carnets Wild", "UniteAngles=degres\n",
                              "PointsCalcules=1\n", "CodesStation=2, 21, 7\n"})
@@ -143,8 +139,6 @@ TEST_F(ReadingForm, TheFormatsSettingsAreChosenInADialogOfTheirOwn) {
     auto form = dialog.MakeForm();
     auto& settings = static_cast<CParamDriverForm&>(*form);
     ASSERT_TRUE(form->Open(frontEnd));
-    EXPECT_EQ(form->State(settings.ControlOf(kKeySeparateurDecimal)).items,
-              (std::vector<std::string>{"point (.)", "virgule (,)"}));
     Type(frontEnd, *form, settings.ControlOf(kKeyChampsVisee), "TYPE,HP,AH");
     frontEnd.messages.clear();
     form->Act(frontEnd, ui::kIdOk, {});
