@@ -1,6 +1,7 @@
 // The computations' dialogs used as a person uses them, through their widgets: the point or the V0 found
 // is the one the geometry gives, and the same as the same actions on the model give. The GéoBases are
 // built from exact coordinates.
+#include "Capture.h"
 #include "FormDialog.h"
 #include "TestSupport.h"
 #include "calc/CalcInters.h"
@@ -13,6 +14,7 @@
 
 #include <QCheckBox>
 #include <QComboBox>
+#include <QDir>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
@@ -24,6 +26,13 @@ namespace pyr::test {
 namespace {
 
 constexpr double kTenthMm = 1e-4;
+
+// The dialog as the person sees it at that moment, kept beside the pictures of the build for a review.
+void Picture(QWidget& dialog, const char* name) {
+    const QString folder = QT_TESTCASE_BUILDDIR "/../captures";
+    QDir().mkpath(folder);
+    EXPECT_TRUE(bureau::SaveCapture(dialog, folder + "/" + name));
+}
 
 template <class Widget>
 Widget& Find(QWidget& dialog, const char* name) {
@@ -69,6 +78,7 @@ TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog
     EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneePremiere").text().toStdString(), "");
     Find<QCheckBox>(dialog, "calculPlani").click();
 
+    Picture(dialog, "CalInter-point-calcule.png");
     Click(dialog, "ecrire");
     frontEnd.answers = {ui::Answer::Yes}; // the modified GéoBase saved on leaving
     Click(dialog, "finListing");
@@ -113,6 +123,7 @@ TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     EXPECT_EQ(Find<QListWidget>(dialog, "references").count(), 4);
     Click(dialog, "calculer");
     EXPECT_NEAR(Find<QLineEdit>(dialog, "v0").text().toDouble(), 50.0, 1e-4);
+    Picture(dialog, "CalculV0-station-orientee.png");
     frontEnd.answers = {ui::Answer::No}; // no listing
     Click(dialog, "enregistrer");
     EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
