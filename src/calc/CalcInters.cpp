@@ -247,7 +247,7 @@ bool CCalcInters::CanFinish() const {
 }
 
 std::string CCalcInters::Coordinate(double value, int decimals) const {
-    return IsKnown(value) ? Sprintf("%.*f", decimals, value) : std::string();
+    return IsKnown(value) ? FormatFixedShown(value, decimals) : std::string();
 }
 
 std::string CCalcInters::XText() const {

@@ -28,9 +28,9 @@ std::string Shown(const std::string& text) {
     return text.empty() ? std::string("-") : text;
 }
 
-// A linear residual to the tenth of a millimetre, rounded first so that a zero shows no sign.
+// A linear residual to the tenth of a millimetre, a zero without its sign.
 std::string Metres(double metres) {
-    return IsKnown(metres) ? FormatFixed(RoundToDecimals(metres, 4) + 0.0, 4) : std::string("-");
+    return IsKnown(metres) ? FormatFixedShown(metres, 4) : std::string("-");
 }
 
 } // namespace

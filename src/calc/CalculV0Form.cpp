@@ -23,7 +23,7 @@ constexpr const char* kMsgNotANumber = "« %s » n'est pas un nombre !";
 constexpr const char* kColumns[] = {"Référence", "Gis.", "DH", "AH", "V0", "eV0 Gr"};
 
 std::string Fixed(double value, int decimals) {
-    return IsKnown(value) ? FormatFixed(value, decimals) : std::string();
+    return IsKnown(value) ? FormatFixedShown(value, decimals) : std::string();
 }
 
 // An angle of the GéoBase's decimals; a direction or a bearing in [0, 400), a full turn shown as 0.
@@ -34,7 +34,7 @@ std::string Angle(double grads, bool wrap = false) {
         grads = WrapGrads(grads);
         if (RoundToDecimals(grads, decimals) >= 400.0) grads = 0.0;
     }
-    return FormatFixed(grads, decimals);
+    return FormatFixedShown(grads, decimals);
 }
 
 std::string Cell(std::string text) {

@@ -22,7 +22,7 @@ namespace pyr {
 namespace {
 
 std::string AngleText(double grads) {
-    return IsKnown(grads) ? FormatFixed(grads, CStation::DeciAng()) : std::string("-");
+    return IsKnown(grads) ? FormatFixedShown(grads, CStation::DeciAng()) : std::string("-");
 }
 
 } // namespace

@@ -30,6 +30,12 @@ std::string FormatFixed(double value, int decimals) {
     return ToChars(value, std::chars_format::fixed, decimals);
 }
 
+std::string FormatFixedShown(double value, int decimals) {
+    std::string text = FormatFixed(value, decimals);
+    if (text[0] == '-' && text.find_first_not_of("-0.") == std::string::npos) text.erase(0, 1);
+    return text;
+}
+
 std::string FormatGeneral(double value) {
     return ToChars(value, std::chars_format::general, 6);
 }

@@ -16,9 +16,7 @@ constexpr const char* kUndefinedText = "-"; // a value never measured or compute
 
 // The value with `decimals` decimals; a value that rounds to zero is written without a minus sign.
 std::string Fixed(double value, int decimals) {
-    std::string text = FormatFixed(value, std::clamp(decimals, 0, kMaxDecimals));
-    if (text[0] == '-' && text.find_first_not_of("-0.") == std::string::npos) text.erase(0, 1);
-    return text;
+    return FormatFixedShown(value, std::clamp(decimals, 0, kMaxDecimals));
 }
 
 } // namespace
