@@ -85,11 +85,6 @@ TEST(ConsoleAnswers, AQuestionTakesWhatIsTypedItsDefaultOnEnterOrCtrlDAndEscapeC
         // The question on its own line, then what the keys answered.
         EXPECT_EQ(terminal.Said(), std::string("PYRALIS : Remplacer ?\n") + c.said) << c.what;
     }
-    Terminal yesNo({}), withCancel({});
-    yesNo.console.Ask("?", ui::kCaption, Buttons::YesNo, Answer::Yes);
-    withCancel.console.Ask("?", ui::kCaption, Buttons::YesNoCancel, Answer::Cancel);
-    EXPECT_EQ(yesNo.reader.prompts.at(0), "(o)ui / (n)on [Oui] ? ");
-    EXPECT_EQ(withCancel.reader.prompts.at(0), "(o)ui / (n)on / (a)nnuler [Annuler] ? ");
 }
 
 TEST(ConsoleAnswers, AFileChoiceOffersItsStartPathAndEscapeChoosesNone) {
