@@ -102,10 +102,13 @@ TEST_F(OptionForm, ARefusedValueIsSaidAndTheFieldKeepsItsValueAndCancelWritesNot
     EXPECT_FALSE(std::filesystem::exists(path));
 }
 
-// Every field has a label whose accelerator is its own on its page: the pages are shown one at a time.
-TEST_F(OptionForm, EveryFieldHasALabelAndAnAcceleratorOfItsOwnOnItsPage) {
+// Every key has its control, every field a label whose accelerator is its own on its page: the pages are
+// shown one at a time.
+TEST_F(OptionForm, EveryKeyHasAFieldWithALabelAndAnAcceleratorOfItsOwnOnItsPage) {
     auto sheet = Sheet();
     auto form = sheet->MakeForm();
+    for (const auto& entry : CalcOptionTable())
+        EXPECT_NE(static_cast<Form&>(*form).ControlOf(entry.section, entry.key), 0) << entry.key;
     const auto controls = form->Controls();
     std::map<int, int> parentOf;
     std::map<int, int> labelled; // a field and its label
