@@ -83,7 +83,6 @@ TEST_F(CarnetProjection, ARefusalSaysWhyAndChangesNothing) {
         EXPECT_FALSE(c.Projection(from, to, &fe)) << from << " -> " << to;
         ASSERT_EQ(fe.messages.size(), 1u);
         EXPECT_EQ(fe.messages[0].text, message);
-        EXPECT_EQ(fe.messages[0].caption, "PYRALIS");
         EXPECT_EQ(fe.messages[0].icon, ui::kIconWarning);
         EXPECT_EQ(Text(), before) << from << " -> " << to;
     }
