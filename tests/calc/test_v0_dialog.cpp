@@ -100,45 +100,17 @@ TEST_F(V0Dialog, OneStationIsOrientedWrittenBackListedAndJournalled) {
               " - Calcul des V0 de stations\nStation   S1(1) : V0 =  50.00000");
     EXPECT_EQ(frontEnd.questions, std::vector<std::string>{kListingQuestionV0});
 
+    // The listing's layout is its writer's; here, the values computed for it: every reference's bearing,
+    // distance and partial V0, D without one, its residual against the tolerance of four references.
     ASSERT_EQ(listing, dir / "chantier.cv0");
-    // Below the heading that every listing shares:
     const std::string text = ReadBytes(listing);
-    EXPECT_EQ(text.substr(text.find("Tolérances normales")),
-              "Tolérances normales :\n"
-              "  V0 sur n références : 0.0043 Gr x racine((n - 1) / n)\n"
-              "  distances           : (3 + D / 1000) cm\n"
-              "  dénivelées          : 0.01 x racine((d + 3)² sin²z + 80 d² cos²z + d⁴ / 1 + 4) m, d = D "
-              "/ 1000\n"
-              "Options : pondération par les distances : oui ; références choisies forcées : non\n"
-              "\n"
-              "| Calcul de la station S1, reprise 1 |\n"
-              "\n"
-              "Coordonnées des points d'appui\n"
-              "------------------------------\n"
-              "|           | Matricule       |     X     |     Y     |    Z    |\n"
-              "| Station   | S1              | 1000.0000 | 2000.0000 | 100.000 |\n"
-              "| Référence | A               | 1000.0000 | 2100.0000 | 101.000 |\n"
-              "| Référence | B               | 1200.0000 | 2000.0000 |  99.250 |\n"
-              "| Référence | C               |  700.0000 | 2000.0000 | 104.500 |\n"
-              "| Référence | D               | 1000.0000 | 1900.0000 | 100.000 |\n"
-              "\n"
-              "| Valeur précédente du V0 = 49.50000 |\n"
-              "\n"
-              "Calcul du V0 de la station (tolérance = 0.00351 Gr)\n"
-              "---------------------------------------------------\n"
-              "| Référence |   Gis.    |    DH    |    AH     |    V0    | eV0 Gr  |\n"
-              "| A         |   0.00000 | 100.0000 | 350.00000 | 50.00000 | 0.00000 |\n"
-              "| B         | 100.00000 | 200.0000 |  50.00000 | 50.00000 | 0.00000 |\n"
-              "| C         | 300.00000 | 300.0000 | 250.00000 | 50.00000 | 0.00000 |\n"
-              "| D         | 200.00000 | 100.0000 | 149.98000 |        - |       - |\n"
-              "\n"
-              "| Valeur du V0 avant calcul             : 49.50000 |\n"
-              "| Valeur du V0 après calcul pondéré     : 50.00000 |\n"
-              "\n"
-              "| Remarques |\n"
-              " -> V0 hors tolérance pour la référence <D> !\n"
-              "    (écart = 0.01714 Gr > 0.00372 Gr)\n"
-              "--------------------------------------------------------------------------------\n");
+    for (const char* row : {"| A         |   0.00000 | 100.0000 | 350.00000 | 50.00000 | 0.00000 |",
+                            "| B         | 100.00000 | 200.0000 |  50.00000 | 50.00000 | 0.00000 |",
+                            "| C         | 300.00000 | 300.0000 | 250.00000 | 50.00000 | 0.00000 |",
+                            "| D         | 200.00000 | 100.0000 | 149.98000 |        - |       - |",
+                            "| Valeur du V0 après calcul pondéré     : 50.00000 |",
+                            " -> V0 hors tolérance pour la référence <D> !\n    (écart = 0.01714 Gr > 0.00372 Gr)"})
+        EXPECT_NE(text.find(row), std::string::npos) << row << "\n" << text;
 }
 
 // A listing or a journal that cannot be written does not undo what was saved: each is a failure of the
