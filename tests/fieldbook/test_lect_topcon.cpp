@@ -5,6 +5,7 @@
 // 50 m and zenith angle atan(3/4) = 36.869898° = 40.96655 gr; one foot is 0.3048 m.
 #include "FieldBookTestSupport.h"
 #include "core/Strings.h"
+#include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/LectTopcon.h"
 
 #include <gtest/gtest.h>
@@ -66,9 +67,7 @@ TEST(LectTopcon, UnitsComeFromTheFieldBookElseFromTheParameterFile) {
         double ah, av, di;
     };
     const Case cases[] = {
-        {"grades", "metres", "", "123.4567,99.1234,10.000", 123.4567, 99.1234, 10.0},
         {"dms", "metres", "", "123.45300,90.00000,10.000", 137.50926, 100.0, 10.0},
-        {"degres", "metres", "", "90.0,180.0,10.000", 100.0, 200.0, 10.0},
         {"mils", "pieds", "", "1600,3200,10.000", 100.0, 200.0, 3.048},
         {"dms", "pieds", "UNITS   M,G\n", "123.4567,99.1234,10.000", 123.4567, 99.1234, 10.0},
         {"grades", "metres", "UNITS   f,d\n", "0.00010,90.00000,10.000", 0.00031, 100.0, 3.048},
@@ -157,4 +156,14 @@ TEST(LectTopcon, EveryLineIsReadOrReportedWithItsNumber) {
         run.Read(text);
         EXPECT_EQ(ReportHeads(run), heads) << text;
     }
+}
+
+// This reader's own message: the field book named, then the reason in words.
+TEST(LectTopcon, AFieldBookThatCannotBeOpenedIsNamedInTheMessage) {
+    TopconRun run;
+    const std::string path = FieldBookData("topcon-absent.gts7");
+    EXPECT_FALSE(run.reader.Read(path, run.result));
+    EXPECT_EQ(MessageTexts(run.frontEnd), Sprintf(fb::kMsgCannotOpenCarnetForReading, path.c_str()) +
+                                              "\n(fichier ou dossier inexistant)");
+    EXPECT_EQ(run.result.GetSize(), 0);
 }
