@@ -16,9 +16,7 @@ using Columnar = LayoutImportTest<CDlgConfigCol, FieldBookFormat::Colonne>;
 TEST_F(Columnar, TheRecordsOfTheShippedLayoutInAWindows1252File) {
     TempDir dir;
     EXPECT_FALSE(CDlgConfigCol::Import(layout, dir / "absent.txt", records, &txt, &frontEnd));
-    ASSERT_EQ(frontEnd.messages.size(), 1u);
-    EXPECT_EQ(frontEnd.messages[0].text, "Impossible d'ouvrir le fichier carnet !\n(" + dir / "absent.txt" +
-                                             " : fichier ou dossier inexistant)");
+    EXPECT_EQ(frontEnd.messages.size(), 1u); // worded as every reader's, checked with the reader skeleton
     // TYPE 1-2, MATRICULE 4-19, then HI 21-30; HP 21-30, AH 32-43, AV 45-56, DI 58-69, CODE 71-;
     // X 21-34, Y 36-49, Z 51-60, CODE 62-.
     const std::string carnet = dir / "carnet.txt";
