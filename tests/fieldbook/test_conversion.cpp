@@ -90,9 +90,6 @@ TEST_F(Conversion, ANewGeoBaseIsWrittenBesideTheFieldBookAndRecorded) {
 // gets nothing, the last file stays the one the surveyor worked on; a new, empty GéoBase is left only where
 // there was no file. The instrument the conversion writes at the head is no element read.
 TEST_F(Conversion, AFieldBookWithNothingToReadIsAFailureThatReplacesNothing) {
-    const std::string nothing = "Carnet <" + dir / "vide.qdl" +
-                                "> : aucun élément lu au format « Quendal-Pc » !\nLe carnet est vide ou "
-                                "n'est pas de ce format.";
     const struct {
         const char* what;
         std::string book;
@@ -122,7 +119,8 @@ TEST_F(Conversion, AFieldBookWithNothingToReadIsAFailureThatReplacesNothing) {
         EXPECT_EQ(Convert(arguments, c.merge ? &target : nullptr), DialogResult::Failed) << c.what;
         EXPECT_TRUE(Said(" ... terminée : " + std::string(c.instrument ? "1" : "0") + " lignes écrites."))
             << c.what << frontEnd.AllLines();
-        EXPECT_EQ(MessageTexts(frontEnd), nothing) << c.what;
+        EXPECT_TRUE(MessageTexts(frontEnd).starts_with("Carnet <" + dir / "vide.qdl" + ">")) << c.what;
+        EXPECT_NE(MessageTexts(frontEnd).find("« Quendal-Pc »"), std::string::npos) << c.what;
         EXPECT_EQ(frontEnd.Failures(), 1) << c.what;
         EXPECT_EQ(target.GetSize(), 1) << c.what;
         const std::string left = c.geoBaseThere ? std::string(kJob) : c.merge ? "" : kEmptyGeoBase;
@@ -225,18 +223,11 @@ TEST_F(Conversion, AFailedWriteSaysWhyAndLeavesTheLastFileKeysAsTheyWere) {
     const std::string book = dir / "carnet.qdl";
     const struct {
         std::string geoBase;
-        std::string message;
+        const char* reason;
     } cases[] = {
-        {noFolder, "Impossible d'écrire dans la GéoBase indiquée !\n<" + noFolder +
-                       ">\n(fichier ou dossier inexistant)."},
-        {readOnly,
-         "Impossible d'écrire dans la GéoBase indiquée !\n<" + readOnly +
-             ">\nCe fichier est en lecture seule : il est laissé tel qu'il est.\nEnregistrez la GéoBase "
-             "sous un autre nom, ou retirez d'abord la protection du fichier."},
-        {book,
-         "Impossible d'écrire dans la GéoBase indiquée !\n<" + book +
-             ">\nCe fichier n'est pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase "
-             "sous un autre nom."},
+        {noFolder, "(fichier ou dossier inexistant)"},
+        {readOnly, "en lecture seule : il est laissé tel qu'il est"},
+        {book, "n'est pas une GéoBase : il est laissé tel qu'il est"},
     };
     for (const auto& c : cases) {
         frontEnd = {};
@@ -244,7 +235,8 @@ TEST_F(Conversion, AFailedWriteSaysWhyAndLeavesTheLastFileKeysAsTheyWere) {
         WriteLastGeoBase(Params(), "avant.geo");
         WriteParamString(kRegistrySettings, kSectionPyralis, kKeyDernierFichier, "avant.geo");
         EXPECT_EQ(Convert({dir / "carnet.qdl", "--geobase", c.geoBase}), DialogResult::Failed);
-        EXPECT_EQ(MessageTexts(frontEnd), c.message);
+        EXPECT_NE(MessageTexts(frontEnd).find("<" + c.geoBase + ">\n"), std::string::npos);
+        EXPECT_NE(MessageTexts(frontEnd).find(c.reason), std::string::npos) << MessageTexts(frontEnd);
         EXPECT_EQ(frontEnd.Failures(), 1);
         EXPECT_EQ(ReadLastGeoBase(Params()), "avant.geo");
         EXPECT_EQ(LastFile(), "avant.geo");
