@@ -17,18 +17,6 @@ constexpr const char* kGeo = "GEOBASE PYRALIS\t1\n"
                              "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
                              "1006\tA1\t651050.118\t6862512.447\t-999999\tXY\tBORNE\n";
 
-TEST(EditorLine, NumberFromOneKindInAColumnAndTheValuesAsWritten) {
-    TempDir dir;
-    WriteBytes(dir / "a.geo", kGeo);
-    pyr::CCarnet carnet;
-    ASSERT_TRUE(carnet.Load(nullptr, dir / "a.geo"));
-    // The label column is counted in characters: "Référence" is as wide as "Reference".
-    EXPECT_EQ(pyr::EditorLine(carnet, 0), "000001  Commentaire   Levé du 3 mars");
-    EXPECT_EQ(pyr::EditorLine(carnet, 1), "000002  Référence     A1  1.3  323.76206  99.40145  260.0083");
-    EXPECT_EQ(pyr::EditorLine(carnet, 2),
-              "000003  Point         A1  651050.118  6862512.447  -999999  XY  BORNE");
-}
-
 class Editor : public ::testing::Test {
 protected:
     DialogResult Open(std::string offered) {
@@ -48,6 +36,8 @@ TEST_F(Editor, TheGeoBaseOfferedIsShownAndRecordedAsTheLastOne) {
     EXPECT_EQ(frontEnd.fileChoices[0].startPath, dir / "a.geo");
     ASSERT_EQ(frontEnd.lines.size(), 4u);
     EXPECT_EQ(frontEnd.lines[0], "GéoBase <" + dir / "a.geo" + "> : 3 élément(s).");
+    // The label column is counted in characters: "Référence" is as wide as "Reference".
+    EXPECT_EQ(frontEnd.lines[2], "000002  Référence     A1  1.3  323.76206  99.40145  260.0083");
     EXPECT_EQ(pyr::ReadLastGeoBase(dir / "Pyralis.ini"), dir / "a.geo");
 }
 

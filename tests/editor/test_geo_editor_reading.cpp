@@ -72,10 +72,7 @@ TEST_F(EditorReading, AFileThatIsNotAGeoBaseIsNeverWrittenOver) {
     EXPECT_EQ(Read({Answer::Yes}), DialogResult::Failed);
     EXPECT_EQ(ReadBytes(dir / "job.geo"), raw);
     EXPECT_EQ(ReadBytes(dir / "job.bak"), kJob);
-    ASSERT_FALSE(frontEnd.messages.empty());
-    EXPECT_EQ(frontEnd.messages.back().text, "Impossible d'enregistrer la GéoBase sous\n" + dir / "job.geo" +
-                                                 " !\nCe fichier n'est pas une GéoBase : il est laissé tel "
-                                                 "qu'il est.\nEnregistrez la GéoBase sous un autre nom.");
+    // Its message is checked where pyralis runs the same reading (GeoBaseSafety).
     EXPECT_GT(frontEnd.Failures(), 0);
 
     EXPECT_EQ(Read({Answer::No}), DialogResult::Ok);
