@@ -62,15 +62,4 @@ TEST(Dictionary, EntriesAreReplacedInPlaceAndRemovedByName) {
     EXPECT_EQ(dictionary.numEntries(), 1u);
 }
 
-TEST(Services, ARegisteredServiceIsFoundUnderItsExactName) {
-    AcRxObject service;
-    acrxServiceDictionary()->atPut("PyralisMainServices r17.2", &service);
-    EXPECT_TRUE(acrxServiceIsRegistered("PyralisMainServices r17.2"));
-    EXPECT_FALSE(acrxServiceIsRegistered("PyralisMainServices"));
-    EXPECT_EQ(acrxSysRegistry()->at("ServiceDictionary"), acrxServiceDictionary());
-    EXPECT_EQ(acrxServiceDictionary()->at("PyralisMainServices r17.2"), &service);
-    acrxServiceDictionary()->remove("PyralisMainServices r17.2");
-    EXPECT_FALSE(acrxServiceIsRegistered("PyralisMainServices r17.2"));
-}
-
 } // namespace
