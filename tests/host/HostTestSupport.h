@@ -17,6 +17,15 @@
 #include <unistd.h>
 #include <vector>
 
+// A small Quendal-Pc field book, and the lines it adds to a GéoBase.
+constexpr const char* kQuendalBook = "QUENDAL-PC;1\n"
+                                     "STATION;S1;1.562\n"
+                                     "REFERENCE;A1;1.3;323.76206;99.40145;260.0083\n"
+                                     "MESURE;102;1.8;388.64623;99.18242;111.5994;POTEAU\n";
+constexpr const char* kQuendalLines = "1001\tS1\t1.562\t-999999\n"
+                                      "1002\tA1\t1.3\t323.76206\t99.40145\t260.0083\n"
+                                      "1003\t102\t1.8\t388.64623\t99.18242\t111.5994\tPOTEAU\n";
+
 inline std::string ProgramFile(const char* name) {
     return std::string(PYR_PROGRAM_DIR) + "/" + name;
 }
