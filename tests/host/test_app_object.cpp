@@ -1,11 +1,9 @@
 // The application object and the command table, taken directly (without loading the module).
 #include "HostTestSupport.h"
 #include "host/CommandContext.h"
-#include "host/CommandTable.h"
 #include "host/PyrAppModul.h"
 
 #include <gtest/gtest.h>
-#include <set>
 
 namespace {
 
@@ -52,21 +50,6 @@ TEST(AppObject, AFailedInitialisationIsAnErrorAndRegistersNothing) {
     EXPECT_EQ(aborts, std::vector<std::string>{"Impossible de trouver le module <Pyr2000Srv.arx>!!!"});
     EXPECT_EQ(acedRegCmds()->lookupCmd("CalInter"), nullptr);
     pyr::SetAbortHandler({});
-}
-
-TEST(CommandTable, TheEightExportsShareOneHandlerAndSoDoTheTwoEditors) {
-    const auto table = CommandTable();
-    ASSERT_EQ(table.size(), 37u);
-    // Commands 14 to 21 (counted from 1) differ only by their title, which chooses the format.
-    std::set<std::string> exportTitles;
-    for (size_t i = 13; i < 21; ++i) {
-        EXPECT_EQ(table[i].handler, table[13].handler) << table[i].globalName;
-        exportTitles.insert(table[i].title);
-    }
-    EXPECT_EQ(exportTitles.size(), 8u);
-    EXPECT_NE(table[12].handler, table[13].handler);
-    EXPECT_NE(table[21].handler, table[13].handler);
-    EXPECT_EQ(table[21].handler, table[22].handler);
 }
 
 // The echo and the UCS following during a dialog are seen through the module's tests; here, what only

@@ -1,6 +1,7 @@
 // The module PyrCalTopo15.arx as its host sees it: loaded through the dynamic linker, with the real
 // services module beside it, its commands run from the host's command stack.
 #include "HostTestSupport.h"
+#include "host/CommandTable.h"
 #include "settings/ParamStore.h"
 
 #include <gtest/gtest.h>
@@ -50,20 +51,11 @@ TEST_F(Module, InitialisationLoadsTheServicesInstallsTheToolbarAndRegistersTheCo
     ASSERT_NE(RegisteredServices(), nullptr);
     EXPECT_TRUE(RegisteredServices()->IsModuleRegistered("PyrCalTopo15"));
     EXPECT_TRUE(RegisteredServices()->IsToolbarVisible(kToolbarGroup));
-    EXPECT_EQ(Group(), (std::vector<std::string>{
-                           "PyrCalTopo15 PyrCalTopo15", "PyraCalcOpt CalcOpt",    "PyraLGeodim LGeodim",
-                           "PyraLNikPsi LNikPsi",       "PyraLNikAtl LNikAtl",    "PyraLNikKps LNikKps",
-                           "PyraLSokkia LSokkia",       "PyraLQuenda LQuenda",    "PyraLSeparat LSeparat",
-                           "PyraLColonne LColonne",     "PyraLTopcon LTopcon",    "PyraLecWild LecWild",
-                           "PyraLZeiss1 LZeiss1",       "PyraEPoints EPoints",    "PyraEGeoBase EGeoBase",
-                           "PyraESeparat ESeparat",     "PyraEColonne EColonne",  "PyraEQuendal EQuendal",
-                           "PyraELeica ELeica",         "PyraESpectra ESpectra",  "PyraESokkia ESokkia",
-                           "PyraGeoEdit GeoEdit",       "PyraGeoEdit2 GeoEdit2",  "PyraCalInter CalInter",
-                           "PyraCalRelev CalRelev",     "PyraCalRecou CalRecou",  "PyraCalExcen CalExcen",
-                           "PyraCalTrian CalTrian",     "PyraCalculV0 CalculV0",  "PyraCalChem CalChem",
-                           "PyraCalRayon CalRayon",     "PyraCalBloc CalBloc",    "PyraCalNivSm CalNivSm",
-                           "PyraCalNivSt CalNivSt",     "PyraAsmCode CalAsmCode", "PyraTabCode CalTabCode",
-                           "PyraDesCode CalDesCode"}));
+    // Every command of the table, in its order; their names are those pyralis lists and runs.
+    std::vector<std::string> table;
+    for (const pyr::host::CommandEntry& command : pyr::host::CommandTable())
+        table.push_back(std::string(command.globalName) + " " + command.localName);
+    EXPECT_EQ(Group(), table);
 
     // Unloading takes the commands, the toolbar and the titles back.
     pyr::host::CPyrMainServices* services = RegisteredServices();
@@ -79,9 +71,7 @@ TEST_F(Module, ACommandAnswersToItsGlobalAndLocalNamesInAnyCase) {
         ASSERT_TRUE(Run(name)) << name;
     // Not built yet: the command says so, and counts as refused.
     ASSERT_EQ(frontEnd.messages.size(), 3u);
-    EXPECT_EQ(frontEnd.messages[0].text,
-              "La commande CalRelev (calcul d'un point par relèvement) "
-              "n'est pas encore disponible dans cette version de PYRALIS Calculs Topo.");
+    EXPECT_TRUE(Has(frontEnd.messages[0].text, "n'est pas encore disponible")) << frontEnd.messages[0].text;
     EXPECT_EQ(frontEnd.results, std::vector<DialogResult>(3, DialogResult::Failed));
 }
 

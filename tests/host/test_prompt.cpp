@@ -99,13 +99,6 @@ public:
     }
     // Everything the program wrote, for the messages of failed expectations.
     const std::string& Screen() const { return m_screen; }
-    // How many times `text` was written.
-    int Count(std::string_view text) const {
-        int count = 0;
-        for (std::size_t at = m_screen.find(text); at != std::string::npos; at = m_screen.find(text, at + 1))
-            ++count;
-        return count;
-    }
 
 private:
     bool ReadSome(Clock::time_point deadline) {

@@ -43,27 +43,20 @@ protected:
 
 const std::string kServices = ProgramFile(kMainServicesModule);
 
-TEST_F(ServicesLookup, TheBareNameIsPreferredToTheProgramsFolders) {
+// The bare name first, then the programs folder beside the working folder, then the one inside it.
+TEST_F(ServicesLookup, TheBareNameThenTheProgramsFolderBesideThenInsideTheWorkingFolder) {
     const std::string bare = Install("Travail", kServices);
-    Install("Programmes", kServices);
-    Install("Travail/Programmes", kServices);
-    AcRxObject* services = GetMainServices(kMainServicesModule, kMainServicesName);
-    ASSERT_NE(services, nullptr);
-    EXPECT_EQ(services, acrxServiceDictionary()->at(kMainServicesName));
-    EXPECT_EQ(Loaded(), std::vector<std::string>{bare});
-    EXPECT_TRUE(aborts.empty());
-}
-
-TEST_F(ServicesLookup, TheProgramsFolderBesideThenInsideTheWorkingFolder) {
     const std::string sibling = Install("Programmes", kServices);
     const std::string child = Install("Travail/Programmes", kServices);
-    ASSERT_NE(GetMainServices(kMainServicesModule, kMainServicesName), nullptr);
-    EXPECT_EQ(Loaded(), std::vector<std::string>{sibling});
-
-    acrxDynamicLinker()->unloadAll();
-    fs::remove(sibling);
-    ASSERT_NE(GetMainServices(kMainServicesModule, kMainServicesName), nullptr);
-    EXPECT_EQ(Loaded(), std::vector<std::string>{child});
+    for (const std::string& expected : {bare, sibling, child}) {
+        AcRxObject* services = GetMainServices(kMainServicesModule, kMainServicesName);
+        ASSERT_NE(services, nullptr) << expected;
+        EXPECT_EQ(services, acrxServiceDictionary()->at(kMainServicesName));
+        EXPECT_EQ(Loaded(), std::vector<std::string>{expected});
+        acrxDynamicLinker()->unloadAll();
+        fs::remove(expected);
+    }
+    EXPECT_TRUE(aborts.empty());
 }
 
 TEST_F(ServicesLookup, ARegisteredServiceIsUsedWithoutSearchOrLoad) {
@@ -90,12 +83,6 @@ TEST_F(ServicesLookup, EachFailureAbortsWithItsMessage) {
                                                 "Impossible de charger le module <Pyr2000Srv.arx>!!!",
                                                 "Pas de service <PyralisMainServices r17.2>\n"
                                                 "enregistré par le module <Pyr2000Srv.arx>!!!"}));
-}
-
-TEST_F(ServicesLookup, AMissingModuleEndsTheHostProgram) {
-    pyr::SetAbortHandler({});
-    EXPECT_EXIT(GetMainServices(kMainServicesModule, kMainServicesName), ::testing::ExitedWithCode(1),
-                "Impossible de trouver le module <Pyr2000Srv\\.arx>!!!");
 }
 
 } // namespace
