@@ -81,6 +81,13 @@ public:
     void Type(std::string_view keys) {
         ASSERT_EQ(write(m_master, keys.data(), keys.size()), ssize_t(keys.size()));
     }
+    // Types `keys` (none when empty), then waits for `text`; a failure shows the screen.
+    ::testing::AssertionResult Shows(std::string_view keys, std::string_view text) {
+        if (!keys.empty()) Type(keys);
+        if (WaitFor(text)) return ::testing::AssertionSuccess();
+        return ::testing::AssertionFailure() << "« " << text << " » not shown after « " << keys << " »:\n"
+                                             << m_screen;
+    }
 
     // The program's exit status once it has ended (what it still writes is read meanwhile), -1 when it does
     // not end by the deadline.
@@ -155,17 +162,14 @@ TEST_F(Prompt, ACommandTypedRunsAndEnterOnAnEmptyLineRunsItAgain) {
     {
         Terminal terminal(dir, {});
         ASSERT_TRUE(terminal.Started());
-        ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
-        terminal.Type(std::string("pyrcaltopo15") + kEnter);
-        ASSERT_TRUE(terminal.WaitFor(shown)) << terminal.Screen();
-        ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
-        terminal.Type(kEnter);
-        ASSERT_TRUE(terminal.WaitFor(shown)) << "run again: " << terminal.Screen();
-        ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+        ASSERT_TRUE(terminal.Shows("", kPrompt));
+        ASSERT_TRUE(terminal.Shows(std::string("pyrcaltopo15") + kEnter, shown));
+        ASSERT_TRUE(terminal.Shows("", kPrompt));
+        ASSERT_TRUE(terminal.Shows(kEnter, shown)) << "run again";
+        ASSERT_TRUE(terminal.Shows("", kPrompt));
         // Tab completes a command's name.
-        terminal.Type(std::string("CalcO\t--afficher") + kEnter);
-        ASSERT_TRUE(terminal.WaitFor("RayonTerre=")) << terminal.Screen();
-        ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+        ASSERT_TRUE(terminal.Shows(std::string("CalcO\t--afficher") + kEnter, "RayonTerre="));
+        ASSERT_TRUE(terminal.Shows("", kPrompt));
         terminal.Type(std::string("FIN") + kEnter);
         EXPECT_EQ(terminal.Status(), 0) << terminal.Screen();
     }
@@ -174,10 +178,9 @@ TEST_F(Prompt, ACommandTypedRunsAndEnterOnAnEmptyLineRunsItAgain) {
 
     // The next session finds the commands of the earlier one: Up twice, then Enter.
     Terminal next(dir, {});
-    ASSERT_TRUE(next.WaitFor(kPrompt)) << next.Screen();
-    next.Type(std::string(kUp) + kUp + kEnter);
-    ASSERT_TRUE(next.WaitFor(shown)) << next.Screen();
-    ASSERT_TRUE(next.WaitFor(kPrompt)) << next.Screen();
+    ASSERT_TRUE(next.Shows("", kPrompt));
+    ASSERT_TRUE(next.Shows(std::string(kUp) + kUp + kEnter, shown));
+    ASSERT_TRUE(next.Shows("", kPrompt));
     // Ctrl-D on an empty line ends the session.
     next.Type(kCtrlD);
     EXPECT_EQ(next.Status(), 0) << next.Screen();
@@ -185,26 +188,21 @@ TEST_F(Prompt, ACommandTypedRunsAndEnterOnAnEmptyLineRunsItAgain) {
 
 TEST_F(Prompt, CtrlCAtAQuestionCancelsTheCommandAndLeavesTheGeoBaseAsItWas) {
     Terminal terminal(dir, {});
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
     // Ctrl-C on a line being typed cancels the line alone.
     terminal.Type("CalInter --bidon");
-    terminal.Type(kCtrlC);
-    ASSERT_TRUE(terminal.WaitFor("*Annulé*")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(kCtrlC, "*Annulé*"));
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
 
-    terminal.Type(readFieldBook + kEnter);
-    ASSERT_TRUE(terminal.WaitFor("(o)ui / (n)on / (a)nnuler [Annuler] ? ")) << terminal.Screen();
-    terminal.Type(kCtrlC);
-    ASSERT_TRUE(terminal.WaitFor("*Annulé*")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(readFieldBook + kEnter, "(o)ui / (n)on / (a)nnuler [Annuler] ? "));
+    ASSERT_TRUE(terminal.Shows(kCtrlC, "*Annulé*"));
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
     EXPECT_EQ(ReadBytes(Geo()), original);
     EXPECT_EQ(Files(), untouched);
 
     // The prompt goes on as before: the same command, answered this time.
-    terminal.Type(kEnter);
-    ASSERT_TRUE(terminal.WaitFor("(a)nnuler [Annuler] ? ")) << terminal.Screen();
-    terminal.Type(std::string("o") + kEnter);
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(kEnter, "(a)nnuler [Annuler] ? "));
+    ASSERT_TRUE(terminal.Shows(std::string("o") + kEnter, kPrompt));
     EXPECT_GT(ReadBytes(Geo()).size(), original.size()) << "the field book added: " << terminal.Screen();
     terminal.Type(std::string("FIN") + kEnter);
     EXPECT_EQ(terminal.Status(), 0) << terminal.Screen();
@@ -212,38 +210,30 @@ TEST_F(Prompt, CtrlCAtAQuestionCancelsTheCommandAndLeavesTheGeoBaseAsItWas) {
 
 TEST_F(Prompt, EscapeCancelsAQuestionAndCtrlDTakesItsDefault) {
     Terminal terminal(dir, {});
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
     // Escape at the prompt abandons the line.
     terminal.Type("GeoEdit");
-    terminal.Type(kEscape);
-    ASSERT_TRUE(terminal.WaitFor("*Annulé*")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(kEscape, "*Annulé*"));
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
 
     // A yes/no/cancel question: Escape answers Cancel, though Oui is typed after it.
-    terminal.Type(readFieldBook + kEnter);
-    ASSERT_TRUE(terminal.WaitFor("[Annuler] ? ")) << terminal.Screen();
-    terminal.Type(std::string("o") + kEscape);
-    ASSERT_TRUE(terminal.WaitFor("Réponse : Annuler")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(readFieldBook + kEnter, "[Annuler] ? "));
+    ASSERT_TRUE(terminal.Shows(std::string("o") + kEscape, "Réponse : Annuler"));
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
     EXPECT_EQ(ReadBytes(Geo()), original);
     EXPECT_EQ(Files(), untouched);
 
     // Non makes a new GéoBase, named after the field book; a second time it asks whether to replace it,
     // Non by default, which Ctrl-D takes.
-    terminal.Type(readFieldBook + kEnter);
-    ASSERT_TRUE(terminal.WaitFor("[Annuler] ? ")) << terminal.Screen();
-    terminal.Type(std::string("n") + kEnter);
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(readFieldBook + kEnter, "[Annuler] ? "));
+    ASSERT_TRUE(terminal.Shows(std::string("n") + kEnter, kPrompt));
     const std::string made = ReadBytes(dir / "carnet.geo");
     ASSERT_FALSE(made.empty()) << terminal.Screen();
     fs::resize_file(dir / "carnet.geo", 10);
-    terminal.Type(kEnter);
-    ASSERT_TRUE(terminal.WaitFor("[Annuler] ? ")) << terminal.Screen();
-    terminal.Type(std::string("n") + kEnter);
-    ASSERT_TRUE(terminal.WaitFor("(o)ui / (n)on [Non] ? ")) << terminal.Screen();
-    terminal.Type(kCtrlD);
-    ASSERT_TRUE(terminal.WaitFor("Réponse : Non")) << terminal.Screen();
-    ASSERT_TRUE(terminal.WaitFor(kPrompt)) << terminal.Screen();
+    ASSERT_TRUE(terminal.Shows(kEnter, "[Annuler] ? "));
+    ASSERT_TRUE(terminal.Shows(std::string("n") + kEnter, "(o)ui / (n)on [Non] ? "));
+    ASSERT_TRUE(terminal.Shows(kCtrlD, "Réponse : Non"));
+    ASSERT_TRUE(terminal.Shows("", kPrompt));
     EXPECT_EQ(fs::file_size(dir / "carnet.geo"), 10u) << "not replaced";
     EXPECT_EQ(ReadBytes(Geo()), original);
     terminal.Type(kCtrlD);
@@ -255,13 +245,13 @@ TEST_F(Prompt, EscapeCancelsAQuestionAndCtrlDTakesItsDefault) {
 TEST_F(Prompt, WithoutThePromptCtrlCAndSigtermEndTheProgram) {
     {
         Terminal terminal(dir, {"GeoEdit", "demo.geo", "--lecture", "Quendal-Pc", "carnet.qdl"});
-        ASSERT_TRUE(terminal.WaitFor("[Annuler] ? ")) << terminal.Screen();
+        ASSERT_TRUE(terminal.Shows("", "[Annuler] ? "));
         terminal.Type(kCtrlC);
         EXPECT_EQ(terminal.Status(), 130) << terminal.Screen();
     }
     {
         Terminal terminal(dir, {"GeoEdit", "demo.geo", "--lecture", "Quendal-Pc", "carnet.qdl"});
-        ASSERT_TRUE(terminal.WaitFor("[Annuler] ? ")) << terminal.Screen();
+        ASSERT_TRUE(terminal.Shows("", "[Annuler] ? "));
         kill(terminal.Pid(), SIGTERM);
         EXPECT_EQ(terminal.Status(), 143) << terminal.Screen();
     }
