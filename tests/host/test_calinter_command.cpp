@@ -87,20 +87,15 @@ TEST_F(CalInterCommand, EveryComputablePointOfASelectionAndTheSightingsOfSomeSta
 }
 
 TEST_F(CalInterCommand, BadRequestsAreRefusedWithAFrenchMessage) {
-    Outcome outcome = Inter("--point ZZ");
-    EXPECT_EQ(outcome.status, 1);
-    EXPECT_TRUE(Has(outcome.err, "Le point <ZZ> n'est visé depuis aucune station orientée")) << outcome.err;
-
-    outcome = Inter("");
-    EXPECT_EQ(outcome.status, 1);
-    EXPECT_TRUE(Has(outcome.err, "Aucun point à calculer : indiquez --point ou --points.")) << outcome.err;
-
-    outcome = RunPyralis(dir.Root(), "CalInter --geobase absente.geo --point P");
-    EXPECT_EQ(outcome.status, 1);
-    EXPECT_TRUE(Has(outcome.err, "absente.geo")) << outcome.err;
-
-    outcome = Inter("--point P --plani 2");
-    EXPECT_NE(outcome.status, 0);
+    for (const auto& [arguments, said] :
+         {std::pair{"chantier.geo --point ZZ", "Le point <ZZ> n'est visé depuis aucune station orientée"},
+          {"chantier.geo", "Aucun point à calculer : indiquez --point ou --points."},
+          {"absente.geo --point P", "absente.geo"},
+          {"chantier.geo --point P --plani 2", "--plani : 0 ou 1 attendu, et non « 2 »."}}) {
+        const Outcome outcome = RunPyralis(dir.Root(), std::string("CalInter --geobase ") + arguments);
+        EXPECT_EQ(outcome.status, 1) << arguments;
+        EXPECT_TRUE(Has(outcome.err, said)) << arguments << "\n" << outcome.err;
+    }
 }
 
 TEST_F(CalInterCommand, InvariantCoordinatesAreKeptOnNo) {
