@@ -9,13 +9,12 @@ namespace {
 
 using namespace pyr::host;
 
-TEST(EntryPoint, WithoutAnApplicationObjectEveryMessageIsAnError) {
+// Without an application object every message is an error; with one, messages it does not know are
+// answered zero and change nothing.
+TEST(AppObject, UnknownMessagesAreAnsweredZeroAndChangeNothing) {
     ASSERT_EQ(TheApp(), nullptr);
     for (int message : {1, 2, 3, 4, 42})
         EXPECT_EQ(ModuleEntryPoint(message, nullptr), AcRx::kRetError) << message;
-}
-
-TEST(AppObject, UnknownMessagesAreAnsweredZeroAndChangeNothing) {
     CPyrAppModul app;
     SetTheApp(&app);
     const size_t commands = acedRegCmds()->commands().size();
