@@ -53,7 +53,7 @@ TEST_F(ReadingCommands, TheHelpNamesTheFieldBookAndTheParameterFileWhereThereIsO
     EXPECT_TRUE(Has(Run("LecWild --help").out, "--parametrage FICHIER"));
 }
 
-TEST_F(ReadingCommands, TheEditorAppendsAFieldBookToItsGeoBaseWhenTold) {
+TEST_F(ReadingCommands, TheEditorAppendsAFieldBookToItsGeoBaseOrMakesANewOne) {
     WriteBytes(dir / "job.geo", kJob);
     const Outcome appended = Run("--oui GeoEdit job.geo --lecture quendal-pc carnet.qdl");
     EXPECT_EQ(appended.status, 0) << appended.err;
@@ -62,17 +62,15 @@ TEST_F(ReadingCommands, TheEditorAppendsAFieldBookToItsGeoBaseWhenTold) {
                                   "000002  Station       S1  1.562  -999999\n"))
         << appended.out;
 
+    // A GéoBase named that does not exist yet is made by the reading, without a question.
+    const Outcome made = Run("GeoEdit neuve.geo --lecture LQuenda carnet.qdl");
+    EXPECT_EQ(made.status, 0) << made.err;
+    EXPECT_EQ(ReadBytes(dir / "neuve.geo"), std::string("GEOBASE PYRALIS\t1\n") + kQuendalLines);
+    EXPECT_FALSE(Has(made.err, "n'est pas vide"));
+
     const Outcome unknown = Run("GeoEdit job.geo --lecture Inconnu carnet.qdl");
     EXPECT_EQ(unknown.status, 1);
     EXPECT_TRUE(Has(unknown.err, "Format de carnet inconnu : « Inconnu »")) << unknown.err;
-}
-
-// A GéoBase named that does not exist yet is made by the reading, without a question.
-TEST_F(ReadingCommands, TheEditorMakesANewGeoBaseFromAFieldBook) {
-    const Outcome outcome = Run("GeoEdit neuve.geo --lecture LQuenda carnet.qdl");
-    EXPECT_EQ(outcome.status, 0) << outcome.err;
-    EXPECT_TRUE(Has(ReadBytes(dir / "neuve.geo"), "1003\t102\t"));
-    EXPECT_FALSE(Has(outcome.err, "n'est pas vide"));
 }
 
 // A field book from which nothing is read (empty, junk, another format) fails with a message that names
@@ -125,13 +123,14 @@ TEST_F(ReadingCommands, ATruncatedLastLineIsReportedWithItsNumber) {
 
 // The reading dialog names the file it did not find.
 TEST_F(ReadingCommands, TheMissingFileMessagesNameTheFile) {
-    const Outcome book = Run("LQuenda absent.qdl");
-    EXPECT_EQ(book.status, 1);
-    EXPECT_TRUE(Has(book.err, "Le fichier carnet indiqué n'existe pas !\n(absent.qdl)")) << book.err;
-    const Outcome settings = Run("LecWild carnet.qdl --parametrage absent.ini");
-    EXPECT_EQ(settings.status, 1);
-    EXPECT_TRUE(Has(settings.err, "Le fichier de paramétrage indiqué n'existe pas !\n(absent.ini)"))
-        << settings.err;
+    for (const auto& [arguments, said] :
+         {std::pair{"LQuenda absent.qdl", "Le fichier carnet indiqué n'existe pas !\n(absent.qdl)"},
+          {"LecWild carnet.qdl --parametrage absent.ini",
+           "Le fichier de paramétrage indiqué n'existe pas !\n(absent.ini)"}}) {
+        const Outcome outcome = Run(arguments);
+        EXPECT_EQ(outcome.status, 1) << arguments;
+        EXPECT_TRUE(Has(outcome.err, said)) << outcome.err;
+    }
 }
 
 namespace {
