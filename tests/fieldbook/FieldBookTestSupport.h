@@ -110,6 +110,19 @@ inline std::string SightingKinds(const pyr::CCarnet& carnet) {
     return kinds;
 }
 
+// The sighting kinds of `book` read with "References" at aucune, premiere and codes (the codes `codes`),
+// one string each: which sightings the format takes as references, and which the settings add.
+template <class Reader, pyr::FieldBookFormat kFormat>
+std::vector<std::string> KindsByMarking(const std::string& book, const char* codes) {
+    std::vector<std::string> kinds;
+    for (const char* marking : {"aucune", "premiere", "codes"}) {
+        DriverRun<Reader, kFormat> run;
+        kinds.push_back(SightingKinds(run.Set(pyr::kKeyReferences, marking).Set(pyr::kKeyCodesReference, codes).Read(book)));
+        EXPECT_EQ(ReportText(run), "") << marking;
+    }
+    return kinds;
+}
+
 // Each element as "kind name; ": the text of a comment, the word and parameters of a command.
 inline std::string ElementsSummary(const pyr::CCarnet& carnet) {
     std::string lines;
