@@ -92,19 +92,12 @@ TEST(LectGeodim, UnitsComeFromLabel23BeforeTheSettings) {
 // References: the point a station is oriented on (62), a point known earlier in the field book, or the
 // settings; everything else is measured.
 TEST(LectGeodim, ReferencesAreTheOrientationKnownPointsOrWhatTheSettingsSay) {
-    const std::string book = "5=K\n38=10\n37=20\n2=S\n62=R\n5=R\n7=1\n5=K\n7=2\n5=M\n4=AV\n7=3\n5=N\n7=4\n";
-    const std::tuple<const char*, const char*, std::string> cases[] = {
-        {"aucune", "", "1006 K; 1001 S; 1002 R; 1002 K; 1009 AV; 1003 M; 1003 N; "},
-        {"codes", "av,X", "1006 K; 1001 S; 1002 R; 1002 K; 1009 AV; 1002 M; 1003 N; "},
-    };
-    for (const auto& [marking, codes, elements] : cases) {
-        GeodimRun run;
-        run.Set(kKeyReferences, marking).Set(kKeyCodesReference, codes);
-        EXPECT_EQ(ElementsSummary(run.Read(book)), elements) << marking;
-    }
-    GeodimRun first;
-    EXPECT_EQ(ElementsSummary(first.Set(kKeyReferences, "premiere").Read("2=S\n5=A\n7=1\n5=B\n7=2\n")),
-              "1001 S; 1002 A; 1003 B; ");
+    // Station T, its sightings unmarked, shows the first sighting marked.
+    const std::string book = "5=K\n38=10\n37=20\n2=S\n62=R\n5=R\n7=1\n5=K\n7=2\n5=M\n4=AV\n7=3\n5=N\n7=4\n"
+                             "2=T\n5=A\n7=1\n5=B\n7=2\n";
+    EXPECT_EQ((KindsByMarking<CLectGeodim, FieldBookFormat::Geotronics>(book, "av,X")),
+              (std::vector<std::string>{"1002 1002 1003 1003 1003 1003 ", "1002 1002 1003 1003 1002 1003 ",
+                                        "1002 1002 1002 1003 1003 1003 "}));
 }
 
 // The area file: negative coordinates, a code in front of its point, planimetry or altimetry alone.
