@@ -184,17 +184,8 @@ TEST(LectNikon, TheAxisOrderOfTheFileWinsOverTheSettings) {
 TEST(LectNikon, ReferenceSightingsAreTheBacksightsAndWhatTheSettingsMark) {
     const char* book = "MP,K,,5.000,5.000,0.000,\nST,S1,,,,1.500,,\nSS,P1,1.3,10,0,100,10:00:00,\n"
                        "SS,P2,1.3,10,0,100,10:00:00,REF\nSS,K,1.3,10,0,100,10:00:00,\n";
-    const std::tuple<const char*, std::string> cases[] = {
-        {"aucune", "1003 1003 1002 "},
-        {"premiere", "1002 1003 1002 "},
-        {"codes", "1003 1002 1002 "},
-    };
-    for (const auto& [marking, kinds] : cases) {
-        NikonRun run;
-        EXPECT_EQ(SightingKinds(run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "REF").Read(book)),
-                  kinds)
-            << marking;
-    }
+    EXPECT_EQ((KindsByMarking<CLectNikon, FieldBookFormat::NikonAtlas>(book, "REF")),
+              (std::vector<std::string>{"1003 1003 1002 ", "1002 1003 1002 ", "1003 1002 1002 "}));
 }
 
 TEST(LectNikon, EveryLineIsReadOrReportedWithItsNumber) {
