@@ -118,18 +118,8 @@ TEST(LectTopcon, ReferencesAreBacksightsOrMarkedBySettings) {
     const std::string text =
         kStation + "BKB     A1,0.0,0.0\nSS      1,1.3,\nHV      0,100\nFS      A1,1.3,\n"
                    "HV      0,100\nBS      B2,1.3\nHV      0,100\nSS      3,1.3,ref\nHV      0,100\n";
-    const std::pair<const char*, const char*> cases[] = {
-        {"aucune", "1003 1002 1002 1003 "},
-        {"premiere", "1002 1002 1002 1003 "},
-        {"codes", "1003 1002 1002 1002 "},
-    };
-    for (const auto& [marking, kinds] : cases) {
-        SCOPED_TRACE(marking);
-        TopconRun run;
-        const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "REF,99").Read(text);
-        EXPECT_EQ(SightingKinds(read), kinds);
-        EXPECT_EQ(ReportText(run), "");
-    }
+    EXPECT_EQ((KindsByMarking<CLectTopcon, FieldBookFormat::TopconGT7>(text, "REF,99")),
+              (std::vector<std::string>{"1003 1002 1002 1003 ", "1002 1002 1002 1003 ", "1003 1002 1002 1002 "}));
 }
 
 // Each report by its line and gravity: the wordings are the reader's constants.
