@@ -172,16 +172,9 @@ TEST(LectWild, ReferencesAreKnownPointsOrMarkedByTheirCodes) {
                              "110006+00000204 21.102+10000000 71....+00000ARB \n"
                              "110007+00000205 81..10+00001000 82..10+00002000 \n"
                              "110008+00000205 21.102+10000000 \n";
-    const std::pair<const char*, const char*> cases[] = {{"codes", "1002 1002 1002 1003 1002 "},
-                                                         {"aucune", "1003 1003 1003 1003 1002 "},
-                                                         {"premiere", "1002 1003 1003 1003 1002 "}};
-    for (const auto& [marking, kinds] : cases) {
-        WildRun run;
-        const CCarnet& read =
-            run.Set(kKeyReferences, marking).Set(kKeyCodesReference, " REF, 99 ,").Read(text);
-        EXPECT_EQ(ReportText(run), "") << marking;
-        EXPECT_EQ(Sightings(read), kinds) << marking;
-    }
+    EXPECT_EQ((KindsByMarking<CLectWild, FieldBookFormat::Wild>(text, " REF, 99 ,")),
+              (std::vector<std::string>{"1003 1003 1003 1003 1002 ", "1002 1003 1003 1003 1002 ",
+                                        "1002 1002 1002 1003 1002 "}));
 }
 
 // Ids are kept as written but for their padding, and so they stay in the GéoBase written and read back.
