@@ -124,18 +124,10 @@ TEST(LectZeiss, ReferencesComeFromSetUpProgramsOrTheSettings) {
                              M5(4, "TI", "POLAR") + "\n" +
                              M5(5, "PI1", Pi("1", "REF"), {{"Hz", "20.0000", "gon"}}) + "\n" +
                              M5(6, "PI1", Pi("2", "ARB"), {{"Hz", "30.0000", "gon"}}) + "\n";
-    const std::pair<const char*, const char*> cases[] = {
-        {"aucune", "1002 R1; 1000 POLAR; 1009 REF; 1003 1; 1009 ARB; 1003 2; "},
-        {"codes", "1002 R1; 1000 POLAR; 1009 REF; 1002 1; 1009 ARB; 1003 2; "},
-        {"premiere", "1002 R1; 1000 POLAR; 1009 REF; 1003 1; 1009 ARB; 1003 2; "}, // R1 was the first
-    };
-    for (const auto& [marking, kinds] : cases) {
-        ZeissRun run;
-        const CCarnet& read = run.Set(kKeyReferences, marking).Set(kKeyCodesReference, "ref").Read(text);
-        EXPECT_EQ(ReportText(run), "") << marking;
-        EXPECT_TRUE(ElementsSummary(read).ends_with(kinds)) << marking << ": " << ElementsSummary(read);
-        EXPECT_EQ(read.v0At(2), kUndefined) << "only a known-station set-up is oriented";
-    }
+    EXPECT_EQ((KindsByMarking<CLectZeiss, FieldBookFormat::Zeiss>(text, "ref")),
+              (std::vector<std::string>{"1002 1003 1003 ", "1002 1003 1003 ", "1002 1002 1003 "})); // R1 first
+    ZeissRun run;
+    EXPECT_EQ(run.Read(text).v0At(2), kUndefined) << "only a known-station set-up is oriented";
 }
 
 // An instrument height given before the station's first sighting is the station's when a sighting comes
