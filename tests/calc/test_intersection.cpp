@@ -102,8 +102,9 @@ TEST(Rays, MeetAtTheConstructedPointAndFoldTheirAngle) {
     EXPECT_EQ(y, 7.0);
 
     // Folded to [0, 200]: across the zero, beyond 200, opposite, past 400, equal.
+    // clang-format off
     for (auto [a, b, angle] : {std::tuple{10.0, 110.0, 100.0}, {110.0, 10.0, 100.0}, {10.0, 390.0, 20.0},
-                               {50.0, 180.0, 70.0}, {30.0, 230.0, 0.0}, {399.0, 401.0, 2.0}, {120.0, 120.0, 0.0}})
+             {50.0, 180.0, 70.0}, {30.0, 230.0, 0.0}, {399.0, 401.0, 2.0}, {120.0, 120.0, 0.0}}) // clang-format on
         EXPECT_DOUBLE_EQ(IntersectionAngle(a, b), angle) << a << " " << b;
 }
 
