@@ -31,11 +31,7 @@ TEST(SightingReduction, TheStationIsPlacedWithItsOwnVerticalOffsetAndItsSetUp) {
     EXPECT_NEAR(second.hi, 1.72, 1e-12); // 1.6 + 0.12
     EXPECT_FALSE(second.IsOriented());
     EXPECT_DOUBLE_EQ(second.z, 100.0);
-
-    const StationPlace first = StationPlaceAt(r.geo, 1);
-    EXPECT_TRUE(first.IsOriented() && first.HasPlace());
-    EXPECT_DOUBLE_EQ(first.hi, 1.5);
-    EXPECT_DOUBLE_EQ(first.v0, 12.5);
+    EXPECT_TRUE(StationPlaceAt(r.geo, 1).IsOriented());
 }
 
 // Collimation 0.002 gr and prism constant 0.03 m of the instrument in force; the options' default
@@ -108,10 +104,8 @@ TEST(SightingReduction, HorizontalDistancesAreScaledAndMissingOnesStayUnknown) {
     for (int i : {3, 4, 5}) // no distance; no zenith angle; vertical
         EXPECT_EQ(r.At(i, options).dh, kUndefined) << i;
     EXPECT_EQ(r.At(6).index, -1); // a comment is no sighting
-}
 
-// 100 / tan(99 gr) + 1.5 − 1.3 + 100² × 0.84 / 12 768 000 = 1.771583 m, worked with a calculator.
-TEST(SightingReduction, TrigonometricHeightDifferenceWithCurvatureAndRefraction) {
+    // 100 / tan(99 gr) + 1.5 − 1.3 + 100² × 0.84 / 12 768 000 = 1.771583 m, worked with a calculator.
     EXPECT_NEAR(TrigonometricHeightDifference(100.0, 99.0, 1.5, 1.3), 1.7715834, 1e-6);
     EXPECT_NEAR(TrigonometricHeightDifference(1000.0, 100.0, 0.0, 0.0), 0.0657895, 1e-6);
 }
