@@ -53,7 +53,6 @@ TEST_F(Pyralis, TheEditorShowsTheGeoBaseAndTheSecondEditorFindsItAgain) {
     ASSERT_EQ(first.status, 0) << first.err;
     const auto lines = first.OutLines();
     ASSERT_GT(lines.size(), 30u);
-    EXPECT_EQ(lines[1].substr(0, 8), "000001  ");
     EXPECT_EQ(lines[3], "000003  Appareil      Appareil Standard  0  0  0.0003  0.0003  0.002  2");
     EXPECT_TRUE(Has(ReadBytes(Params()), "Derniere=" + demo));
 
