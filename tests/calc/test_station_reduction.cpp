@@ -137,9 +137,8 @@ TEST(ReductionOptionsFile, InstrumentCorrectionsAreFoldedInAndTheSwitchesKept) {
         EXPECT_EQ(geo.avAt(4), kUndefined); // nothing to correct
         EXPECT_EQ(geo.diAt(4), 0.0);
         EXPECT_EQ(frontEnd.messages.size(), 1u); // the warning on the codes
-        // VisComm by default, Suppress from the command line, DoMeans held to 1.
-        for (const char* line : {"VisComm=1", "V0BasedOn=0", "OtherSight=0", "Suppress=0", "DoMeans=1",
-                                 "InExcent=0", "InAppareil=1"})
+        // Suppress from the command line, DoMeans held to 1.
+        for (const char* line : {"Suppress=0", "DoMeans=1"})
             EXPECT_NE(ReadBytes(ini).find(line), std::string::npos) << line;
     }
 }
