@@ -45,23 +45,6 @@ TEST_F(Pyralis, ExitStatusSaysWhetherTheCommandRanWasRefusedOrMisused) {
     }
 }
 
-TEST_F(Pyralis, TheEditorShowsTheGeoBaseAndTheSecondEditorFindsItAgain) {
-    const std::string demo = dir / "demo.geo";
-    std::filesystem::copy_file(std::string(PYR_SOURCE_DIR) + "/data/chantier-demo.geo", demo);
-    // Named from the folder it lies in: recorded whole all the same.
-    const Outcome first = Run("GeoEdit --geobase demo.geo");
-    ASSERT_EQ(first.status, 0) << first.err;
-    const auto lines = first.OutLines();
-    ASSERT_GT(lines.size(), 30u);
-    EXPECT_EQ(lines[3], "000003  Appareil      Appareil Standard  0  0  0.0003  0.0003  0.002  2");
-    EXPECT_TRUE(Has(ReadBytes(Params()), "Derniere=" + demo));
-
-    const Outcome second = Run("geoedit2");
-    EXPECT_EQ(second.status, 0) << second.err;
-    auto elements = [](const Outcome& outcome) { return outcome.out.substr(outcome.out.find("000001")); };
-    EXPECT_EQ(elements(second), elements(first));
-}
-
 TEST_F(Pyralis, CalcOptRefusesAnOptionOutOfItsLimitsAndSetsOneWithin) {
     const Outcome refused = Run("CalcOpt --regler Options_Corrections/RayonTerre=5000");
     EXPECT_EQ(refused.status, 1);
