@@ -223,18 +223,14 @@ TEST_F(Prompt, EscapeCancelsAQuestionAndCtrlDTakesItsDefault) {
     EXPECT_EQ(ReadBytes(Geo()), original);
     EXPECT_EQ(Files(), untouched);
 
-    // Non makes a new GéoBase, named after the field book; a second time it asks whether to replace it,
-    // Non by default, which Ctrl-D takes.
+    // Non asks for a new GéoBase, named after the field book; as one of that name exists, whether to
+    // replace it, Non by default, which Ctrl-D takes.
+    WriteBytes(dir / "carnet.geo", "à garder\n");
     ASSERT_TRUE(terminal.Shows(readFieldBook + kEnter, "[Annuler] ? "));
-    ASSERT_TRUE(terminal.Shows(std::string("n") + kEnter, kPrompt));
-    const std::string made = ReadBytes(dir / "carnet.geo");
-    ASSERT_FALSE(made.empty()) << terminal.Screen();
-    fs::resize_file(dir / "carnet.geo", 10);
-    ASSERT_TRUE(terminal.Shows(kEnter, "[Annuler] ? "));
     ASSERT_TRUE(terminal.Shows(std::string("n") + kEnter, "(o)ui / (n)on [Non] ? "));
     ASSERT_TRUE(terminal.Shows(kCtrlD, "Réponse : Non"));
     ASSERT_TRUE(terminal.Shows("", kPrompt));
-    EXPECT_EQ(fs::file_size(dir / "carnet.geo"), 10u) << "not replaced";
+    EXPECT_EQ(ReadBytes(dir / "carnet.geo"), "à garder\n") << "not replaced";
     EXPECT_EQ(ReadBytes(Geo()), original);
     terminal.Type(kCtrlD);
     EXPECT_EQ(terminal.Status(), 0) << terminal.Screen();
