@@ -86,7 +86,7 @@ struct TwoReferences : Job {
     }
 };
 
-TEST(StationV0, PartialV0StraddlingTheFullTurnAverageNearZero) {
+TEST(StationV0, TwoReferencesAcrossTheFullTurnOrOneOutOfTolerance) {
     for (bool weighted : {true, false}) {
         // 0.02 gr apart: both out of tolerance, both kept when forced.
         const V0Result result = TwoReferences(399.99, 0.01).Compute(weighted, true);
@@ -96,22 +96,21 @@ TEST(StationV0, PartialV0StraddlingTheFullTurnAverageNearZero) {
         EXPECT_EQ(result.used, 2);
         EXPECT_EQ(result.remarks.size(), 4u) << "two remarks for each reference";
     }
-}
+    EXPECT_EQ(TwoReferences(399.9999997, 399.9999997).Compute().v0, 0.0); // a mean of 399.9999997
 
-TEST(StationV0, WithTwoReferencesTheWorstOutOfToleranceGoesAndTheOtherAloneGivesTheV0) {
-    // Weighted mean 50 + 0.008 x 100 / 400 = 50.002: A is 0.006 away, B 0.002, T_V0 = 0.00304.
+    // Weighted mean 50 + 0.008 x 100 / 400 = 50.002: A is 0.006 away, B 0.002, T_V0 = 0.00304. The worst
+    // goes, and the other alone gives the V0.
     const V0Result result = TwoReferences(50.008, 50.0).Compute();
     ASSERT_TRUE(result.computed);
     EXPECT_NEAR(result.v0, 50.0, kCentimilligon);
     EXPECT_EQ(result.used, 1);
-    EXPECT_FALSE(result.references[0].valid);
     EXPECT_EQ(result.references[0].residual, kUndefined);
     EXPECT_EQ(result.remarks, (std::vector<std::string>{
                                   " -> V0 hors tolérance pour la référence <A> !",
                                   Sprintf("    (écart = 0.00600 Gr > %.5f Gr)", std::sqrt(0.5) * 0.0043)}));
 }
 
-TEST(StationV0, AReferenceAtTheStationsOwnPlaceIsDropped) {
+TEST(StationV0, AReferenceAtTheStationsOwnPlaceIsDroppedAndTheV0Rounded) {
     Job job(75.0);
     AddPoint(job.carnet, "S1BIS", {kStation.x + 0.00005, kStation.y, kStation.z});
     job.sightings.insert(job.sightings.begin(),
@@ -123,13 +122,10 @@ TEST(StationV0, AReferenceAtTheStationsOwnPlaceIsDropped) {
     EXPECT_FALSE(result.references[0].valid);
     EXPECT_EQ(result.remarks,
               std::vector<std::string>{"La référence <S1BIS> est confondue avec la station !"});
-}
-
-TEST(StationV0, RoundedToSixDecimalsAndAFullTurnIsZero) {
+    // Rounded to six decimals, a full turn being 0.
     EXPECT_NEAR(RoundV0(123.4567894), 123.456789, 1e-12);
     EXPECT_NEAR(RoundV0(-0.5), 399.5, 1e-12);
     EXPECT_EQ(RoundV0(-0.0000001), 0.0);
-    EXPECT_EQ(TwoReferences(399.9999997, 399.9999997).Compute().v0, 0.0); // a mean of 399.9999997
 }
 
 TEST(StationV0, DistanceAndHeightChecksWarnButKeepTheReference) {
