@@ -27,14 +27,6 @@ protected:
     AcRxDynamicLinker* linker = acrxDynamicLinker();
 };
 
-TEST_F(Modules, TheSystemRegistryHoldsTheHostsThreeObjects) {
-    AcRxDictionary* registry = acrxSysRegistry();
-    EXPECT_EQ(registry->names(), (Events{"DynamicLinker", "ServiceDictionary", "ACAD_REGISTERED_COMMANDS"}));
-    EXPECT_EQ(registry->at("DynamicLinker"), linker);
-    EXPECT_EQ(registry->at("ServiceDictionary"), acrxServiceDictionary());
-    EXPECT_EQ(registry->at("ACAD_REGISTERED_COMMANDS"), acedRegCmds());
-}
-
 TEST_F(Modules, LifeOfAModuleFromLoadToUnload) {
     ASSERT_TRUE(linker->loadModule(PYR_TEST_MODULE_A)) << linker->lastError();
     EXPECT_EQ(journal.events, Events{"A 1"});
