@@ -21,7 +21,10 @@ constexpr const char* kKeyTargetHeights = "IntersAvecHp";
 } // namespace
 
 CCalcInters::CCalcInters()
-    : m_session({kJournalIntersection, session::kQuestionInvariantXY, session::kQuestionInvariantZ}) {}
+    : CSightingComputation(
+          {{kJournalIntersection, session::kQuestionInvariantXY, session::kQuestionInvariantZ},
+           inters::kSection,
+           ListingKind::Intersection}) {}
 
 std::string CCalcInters::Caption() const {
     return m_point.empty() ? Inputs().title : Sprintf(inters::kCaption, m_point.c_str());
@@ -30,13 +33,7 @@ std::string CCalcInters::Caption() const {
 // ---- Opening and closing --------------------------------------------------------------------------------
 
 bool CCalcInters::Open(ui::FrontEnd& frontEnd) {
-    m_frontEnd = &frontEnd;
-    const std::string_view path = Inputs().paramPath;
-    int plani = 1, alti = 1;
-    ReadParamInt(path, inters::kSection, inters::kKeyPlani, 1, 0, 1, plani);
-    ReadParamInt(path, inters::kSection, inters::kKeyAlti, 1, 0, 1, alti);
-    m_plani = plani != 0, m_alti = alti != 0;
-    if (!m_session.Open(frontEnd, *this)) return false;
+    if (!OpenSession(frontEnd)) return false;
     SightingReductionOptions& reduction = m_session.Reduction();
     reduction.instrumentConstants = true;
     reduction.targetHeights =
@@ -47,48 +44,15 @@ bool CCalcInters::Open(ui::FrontEnd& frontEnd) {
                             ui::kIconWarning);
         return false;
     }
-    Notify(kPartPoints | kPartSwitches);
+    Notify(kPartSubject | kPartSwitches);
     return true;
 }
 
-std::string CCalcInters::Close(bool listingAsked, std::string listingPath) {
-    if (!m_frontEnd) return {};
-    WriteParamInt(Inputs().paramPath, inters::kSection, inters::kKeyPlani, m_plani ? 1 : 0);
-    WriteParamInt(Inputs().paramPath, inters::kSection, inters::kKeyAlti, m_alti ? 1 : 0);
-    m_session.OfferSave();
-    ListingRequest request;
-    request.kind = ListingKind::Intersection;
-    request.resultCount = m_results.size();
-    request.writeResult = [this](CDlgCfgListing& listing, std::size_t i) {
-        WriteIntersectionResult(listing, m_results[i]);
-    };
-    request.ask = !listingAsked;
-    request.path = std::move(listingPath);
-    return m_session.Close(std::move(request));
-}
-
-// ---- Switches -------------------------------------------------------------------------------------------
-
-void CCalcInters::SetPlani(bool on) {
-    m_plani = on;
-    Notify(kPartSwitches);
-    Recompute();
-}
-
-void CCalcInters::SetAlti(bool on) {
-    m_alti = on;
-    Notify(kPartSwitches);
-    Recompute();
+void CCalcInters::WriteResult(CDlgCfgListing& listing, std::size_t index) const {
+    WriteIntersectionResult(listing, m_results.All()[index]);
 }
 
 // ---- The combo and the lists ----------------------------------------------------------------------------
-
-const StationPlace& CCalcInters::PlaceOf(int station) {
-    auto found = m_places.find(station);
-    if (found == m_places.end())
-        found = m_places.emplace(station, StationPlaceAt(m_session.Carnet(), station)).first;
-    return found->second;
-}
 
 // Points measured from at least one station whose place and orientation are known, in the order they
 // were first sighted.
@@ -139,38 +103,6 @@ bool CCalcInters::ChoosePoint(std::string_view mat) {
     return true;
 }
 
-void CCalcInters::HighlightAvailable(int rank) {
-    m_lists.HighlightAvailable(rank);
-    Notify(kPartLists);
-}
-
-void CCalcInters::HighlightSelected(int rank) {
-    m_lists.HighlightSelected(rank);
-    Notify(kPartLists);
-}
-
-void CCalcInters::Moved(bool moved) {
-    if (!moved) return;
-    Notify(kPartLists);
-    Recompute();
-}
-
-void CCalcInters::AddOne() {
-    Moved(m_lists.AddOne());
-}
-
-void CCalcInters::AddAll() {
-    Moved(m_lists.AddAll());
-}
-
-void CCalcInters::RemoveOne() {
-    Moved(m_lists.RemoveOne());
-}
-
-void CCalcInters::RemoveAll() {
-    Moved(m_lists.RemoveAll());
-}
-
 bool CCalcInters::SelectStations(std::string_view selection) {
     const std::optional<CSelection> parsed = CSelection::Parse(selection);
     if (!parsed) return false;
@@ -201,41 +133,28 @@ InterSighting CCalcInters::Gather(const Line& line) {
     return sighting;
 }
 
-void CCalcInters::Clear() {
-    m_result = InterResult();
-    m_result.mat = m_point;
-}
-
 bool CCalcInters::Computed() const {
     return (m_result.flags & kInterComputed) != 0 || IsKnown(m_result.z);
 }
 
 void CCalcInters::Recompute() {
-    Clear();
+    m_result = InterResult();
+    m_result.mat = m_point;
     if (m_point.empty() || m_lists.Selected().empty()) {
         Notify(kPartResult);
         return;
     }
     for (const Line& line : m_lists.Selected())
         m_result.sightings.push_back(Gather(line));
-    const int flags = ComputeIntersection(m_result, m_plani, m_alti);
+    const int flags = ComputeIntersection(m_result, Plani(), Alti());
     if ((flags & kInterTooClose) && (flags & kInterComputed) && m_frontEnd)
         m_frontEnd->MessageBox(inters::kMsgTooClose, ui::kCaption, ui::kIconWarning);
     if (Computed()) {
-        Keep();
+        m_results.Keep(m_result.mat, m_result);
     } else if (!(flags & (kInterTooFew | kInterParallel)) && m_frontEnd) {
         m_frontEnd->MessageBox(inters::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
     }
     Notify(kPartResult);
-}
-
-// A point computed again replaces its earlier result, in its place.
-void CCalcInters::Keep() {
-    const auto [at, added] = m_resultOf.try_emplace(m_result.mat, m_results.size());
-    if (added)
-        m_results.push_back(m_result);
-    else
-        m_results[at->second] = m_result;
 }
 
 bool CCalcInters::CanWrite() const {
@@ -246,27 +165,23 @@ bool CCalcInters::CanFinish() const {
     return m_lists.Count() >= 2;
 }
 
-std::string CCalcInters::Coordinate(double value, int decimals) const {
-    return IsKnown(value) ? FormatFixedShown(value, decimals) : std::string();
-}
-
 std::string CCalcInters::XText() const {
-    return Coordinate(m_result.x, CPointGen::DeciXY());
+    return Shown(m_result.x, CPointGen::DeciXY());
 }
 std::string CCalcInters::YText() const {
-    return Coordinate(m_result.y, CPointGen::DeciXY());
+    return Shown(m_result.y, CPointGen::DeciXY());
 }
 std::string CCalcInters::EmqXText() const {
-    return Coordinate(m_result.emqX, CPointGen::DeciXY());
+    return Shown(m_result.emqX, CPointGen::DeciXY());
 }
 std::string CCalcInters::EmqYText() const {
-    return Coordinate(m_result.emqY, CPointGen::DeciXY());
+    return Shown(m_result.emqY, CPointGen::DeciXY());
 }
 std::string CCalcInters::ZText() const {
-    return Coordinate(m_result.z, CPointGen::DeciZ());
+    return Shown(m_result.z, CPointGen::DeciZ());
 }
 std::string CCalcInters::EmqZText() const {
-    return Coordinate(m_result.emqZ, CPointGen::DeciZ());
+    return Shown(m_result.emqZ, CPointGen::DeciZ());
 }
 
 // ---- Writing --------------------------------------------------------------------------------------------
@@ -274,7 +189,7 @@ std::string CCalcInters::EmqZText() const {
 bool CCalcInters::WritePoint() {
     if (!CanWrite() || !m_session.IsOpen()) return false;
     const bool written = m_session.WritePoint(m_result.mat, m_result.x, m_result.y, m_result.z);
-    m_places.clear(); // a station on the point written is placed by it from now on
+    ForgetPlaces(); // a station on the point written is placed by it from now on
     Notify(kPartResult);
     return written;
 }

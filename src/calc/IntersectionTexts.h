@@ -15,8 +15,6 @@ inline constexpr const char* kMsgTooClose =
 
 // The dialog.
 inline constexpr const char* kSection = "Calcul Intersection";
-inline constexpr const char* kKeyPlani = "CalculPlani";
-inline constexpr const char* kKeyAlti = "CalculAlti";
 inline constexpr const char* kCaption = "Calcul du point %s par intersection";
 inline constexpr const char* kTooltip = "%s %s : %s";
 inline constexpr const char* kLine = "%s  %s"; // the station's designation, the point sighted

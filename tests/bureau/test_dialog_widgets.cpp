@@ -61,7 +61,7 @@ TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog
     ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
 
     // The point's name typed into the combo, then every sighting taken.
-    auto& point = Find<QComboBox>(dialog, "point");
+    auto& point = Find<QComboBox>(dialog, "sujet");
     point.setFocus();
     point.lineEdit()->selectAll();
     QTest::keyClicks(point.lineEdit(), "P");
@@ -70,12 +70,12 @@ TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog
     EXPECT_FALSE(Find<QPushButton>(dialog, "ecrire").isEnabled());
     Click(dialog, "ajouterToutes");
     EXPECT_EQ(Find<QListWidget>(dialog, "retenues").count(), 3);
-    EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneePremiere").text().toStdString(), "1050.0000");
-    EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneeSeconde").text().toStdString(), "2080.0000");
+    EXPECT_EQ(Find<QLineEdit>(dialog, "valeurPremiere").text().toStdString(), "1050.0000");
+    EXPECT_EQ(Find<QLineEdit>(dialog, "valeurSeconde").text().toStdString(), "2080.0000");
 
     // Planimetry switched off leaves the altitude alone, and back on.
     Find<QCheckBox>(dialog, "calculPlani").click();
-    EXPECT_EQ(Find<QLineEdit>(dialog, "coordonneePremiere").text().toStdString(), "");
+    EXPECT_EQ(Find<QLineEdit>(dialog, "valeurPremiere").text().toStdString(), "");
     Find<QCheckBox>(dialog, "calculPlani").click();
 
     Picture(dialog, "CalInter-point-calcule.png");

@@ -92,9 +92,9 @@ TEST_F(IntersectionForm, PointChosenSightingsMovedWrittenThenFinishedWithTheList
     const auto form = dialog.MakeForm();
     Person person{*form, frontEnd};
     ASSERT_TRUE(form->Open(frontEnd));
-    EXPECT_EQ(person[F::kPoint].items, (std::vector<std::string>{"P", "Q"}));
+    EXPECT_EQ(person[F::kSubject].items, (std::vector<std::string>{"P", "Q"}));
 
-    person.Select(F::kPoint, 0);
+    person.Select(F::kSubject, 0);
     EXPECT_EQ(form->Caption(), "Calcul du point P par intersection");
     const ui::ControlState available = person[F::kAvailable];
     ASSERT_EQ(available.items.size(), 3u);
@@ -104,12 +104,12 @@ TEST_F(IntersectionForm, PointChosenSightingsMovedWrittenThenFinishedWithTheList
     EXPECT_EQ(person[F::kSelected].items, std::vector<std::string>{available.items[1]});
 
     person.Click(F::kAddAll);
-    EXPECT_EQ(person[F::kFirst].text, "1050.0000");
-    EXPECT_EQ(person[F::kSecond].text, "2080.0000");
-    EXPECT_EQ(person[F::kZ].text, "103.200");
+    EXPECT_EQ(person[F::ResultValue(F::kLineFirst)].text, "1050.0000");
+    EXPECT_EQ(person[F::ResultValue(F::kLineSecond)].text, "2080.0000");
+    EXPECT_EQ(person[F::ResultValue(F::kLineZ)].text, "103.200");
     person.Check(F::kPlani, false); // the altitude alone
-    EXPECT_EQ(person[F::kFirst].text, "");
-    EXPECT_EQ(person[F::kZ].text, "103.200");
+    EXPECT_EQ(person[F::ResultValue(F::kLineFirst)].text, "");
+    EXPECT_EQ(person[F::ResultValue(F::kLineZ)].text, "103.200");
     person.Check(F::kPlani, true);
     person.Click(F::kWrite);
 
@@ -136,7 +136,7 @@ TEST_F(IntersectionForm, ClosedWithoutWritingTheListingIsOfferedAndNothingSaved)
     const auto form = dialog.MakeForm();
     Person person{*form, frontEnd};
     ASSERT_TRUE(form->Open(frontEnd));
-    person.Type(CCalcIntersForm::kPoint, "P"); // typed in the combo
+    person.Type(CCalcIntersForm::kSubject, "P"); // typed in the combo
     form->Act(frontEnd, CCalcIntersForm::kAvailable, {EventKind::Activate, 2, false, {}}); // double-click
     EXPECT_EQ(person[CCalcIntersForm::kSelected].items.size(), 1u);
     frontEnd.answers = {ui::Answer::No}; // no listing

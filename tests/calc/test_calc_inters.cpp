@@ -70,7 +70,7 @@ TEST_F(Intersection, PointsOfferedThenComputedAgainOnEveryMove) {
     EXPECT_NE(dialog.Available()[1].tooltip.find(" P : "), std::string::npos);
     EXPECT_TRUE(dialog.CanAddAll() && dialog.CanFinish());
     EXPECT_FALSE(dialog.CanAddOne() || dialog.CanRemoveOne() || dialog.CanRemoveAll() || dialog.CanWrite());
-    EXPECT_TRUE(notices & CCalcInters::kPartPoints && notices & CCalcInters::kPartLists);
+    EXPECT_TRUE(notices & CCalcInters::kPartSubject && notices & CCalcInters::kPartLists);
 
     dialog.HighlightAvailable(0);
     ASSERT_TRUE(dialog.CanAddOne());
@@ -174,7 +174,7 @@ TEST_F(Intersection, WrittenWithTheInvariantQuestionsJournalledAndSavedOnLeaving
         std::string::npos);
     EXPECT_NE(ReadBytes(listing).find("Calcul du point P"), std::string::npos);
     int plani = 0;
-    ReadParamInt(params, inters::kSection, inters::kKeyPlani, 0, 0, 1, plani);
+    ReadParamInt(params, inters::kSection, kKeyCalculPlani, 0, 0, 1, plani);
     EXPECT_EQ(plani, 1);
 }
 
