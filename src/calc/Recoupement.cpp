@@ -1,0 +1,314 @@
+#include "calc/Recoupement.h"
+
+#include "calc/Corrections.h"
+#include "calc/Rays.h"
+#include "calc/RecoupementTexts.h"
+#include "core/Angles.h"
+
+#include <cmath>
+#include <vector>
+
+namespace pyr {
+
+namespace {
+
+// A place that sees its two known points under an angle that differs from the measured one by more than
+// this (gr) lies on the other arc of the circle: there the angle is the measured one plus 200.
+constexpr double kMaxAngleGap = 100.0;
+
+void ResetOutputs(StationResult& result) {
+    result.x0 = result.y0 = result.v0Approx = kUndefined;
+    result.x = result.y = result.v0 = kUndefined;
+    result.emqX = result.emqY = result.emqV0 = result.sigma0 = kUndefined;
+    result.crossing = kUndefined;
+    result.altitudes = 0;
+    result.z0 = result.z = result.emqZ = kUndefined;
+    result.flags = 0;
+    result.status.clear();
+    for (StationSighting& s : result.sightings) {
+        s.used = false;
+        s.v0 = s.v = s.e = s.vz = s.ez = s.zi = kUndefined;
+    }
+}
+
+// A direction difference brought within [-200, 200] gr.
+double Centred(double grads) {
+    const double w = WrapGrads(grads);
+    return w > 200.0 ? w - 400.0 : w;
+}
+
+void Fail(StationResult& result, int flag, const char* status) {
+    result.flags = flag;
+    result.status = status;
+}
+
+// A sighting that takes part in the planimetry: its known end placed and its direction read; for an
+// intersection sighting, the orientation of the station that took it.
+bool UsableInPlanimetry(const StationSighting& s) {
+    if (IsUndefined(s.x) || IsUndefined(s.y) || IsUndefined(s.ah)) return false;
+    return !s.onStation || IsKnown(s.v0s);
+}
+
+// The circle of the places from which B is seen at `gamma` gr clockwise from A. Its centre lies on the
+// perpendicular bisector of AB, at (d / 2) cot(gamma) from the midpoint on the right of A -> B (the
+// bisector makes 100 - gamma / 2 with AB at A), and its radius is (d / 2) / |sin(gamma)|. A and B on one
+// place, or an angle within 0.06 mgon of 0 or 200 (the station on the line AB), give no circle.
+struct Circle {
+    double xc = 0.0, yc = 0.0, r = 0.0;
+};
+bool SeeingCircle(double xa, double ya, double xb, double yb, double gamma, Circle& circle) {
+    const double bx = xb - xa, by = yb - ya;
+    const double d = std::hypot(bx, by);
+    const double sine = SinGrads(gamma);
+    if (!(d > 0.0) || std::fabs(sine) < kParallelRaysSine) return false;
+    const double halfCot = 0.5 * CosGrads(gamma) / sine;
+    // (by, -bx) / d points to the right of A -> B, at the bearing G(A -> B) + 100.
+    circle.xc = 0.5 * (xa + xb) + halfCot * by;
+    circle.yc = 0.5 * (ya + yb) - halfCot * bx;
+    circle.r = 0.5 * d / std::fabs(sine);
+    return std::isfinite(circle.xc) && std::isfinite(circle.yc) && std::isfinite(circle.r);
+}
+
+// One approximate place: where the line of an intersection sighting meets the circle of a pair of
+// resection sightings, with the angle under which they cross, gr, in [0, 100].
+struct Candidate {
+    double x, y;
+    double quality;
+    int line, first, second; // ranks of the three sightings in result.sightings
+};
+
+// Every place that the lines and the circles give and that the checks keep: intersection sightings in
+// list order, then the pairs of resection sightings in list order, then the places along the line from
+// the station that sighted.
+std::vector<Candidate> Candidates(const StationResult& result, const std::vector<int>& lines,
+                                  const std::vector<int>& known) {
+    std::vector<Candidate> candidates;
+    for (int i : lines) {
+        const StationSighting& s = result.sightings[i];
+        const double g = WrapGrads(s.v0s + s.ah);
+        // The line from the sighting station, given by that station and the point 100 m along it.
+        const double x2 = s.x + 100.0 * SinGrads(g), y2 = s.y + 100.0 * CosGrads(g);
+        for (std::size_t p = 0; p < known.size(); ++p)
+            for (std::size_t q = p + 1; q < known.size(); ++q) {
+                const StationSighting& a = result.sightings[known[p]];
+                const StationSighting& b = result.sightings[known[q]];
+                const double gamma = WrapGrads(b.ah - a.ah);
+                Circle c;
+                if (!SeeingCircle(a.x, a.y, b.x, b.y, gamma, c)) continue;
+                const LineCircle cut = IntersectLineCircle(s.x, s.y, x2, y2, c.xc, c.yc, c.r);
+                for (int k = 0; k < cut.count; ++k) {
+                    const double x = cut.x[k], y = cut.y[k];
+                    if (std::hypot(x - a.x, y - a.y) <= kRecoupNearKnown ||
+                        std::hypot(x - b.x, y - b.y) <= kRecoupNearKnown)
+                        continue;
+                    const double seen = Bearing(x, y, b.x, b.y) - Bearing(x, y, a.x, a.y);
+                    if (std::fabs(Centred(seen - gamma)) > kMaxAngleGap) continue;
+                    // The circle runs across its radius: its tangent at the place is 100 gr off the
+                    // bearing from the centre.
+                    const double tangent = Bearing(c.xc, c.yc, x, y) + 100.0;
+                    candidates.push_back({x, y, IntersectionAngle(g, tangent), i, known[p], known[q]});
+                }
+            }
+    }
+    return candidates;
+}
+
+// The place that most others agree with. The places are grouped in order: each joins the first group
+// whose representative lies within kRecoupAgreement, and replaces it when it crosses under a strictly
+// wider angle. The largest group wins (the first on a tie), provided it holds two places at least,
+// unless only one place was found in all. The rank of the chosen place, or -1.
+int ChooseCandidate(const std::vector<Candidate>& candidates) {
+    struct Group {
+        int representative;
+        int members;
+    };
+    std::vector<Group> groups;
+    for (std::size_t i = 0; i < candidates.size(); ++i) {
+        const Candidate& c = candidates[i];
+        bool joined = false;
+        for (Group& group : groups) {
+            const Candidate& r = candidates[group.representative];
+            if (std::hypot(c.x - r.x, c.y - r.y) > kRecoupAgreement) continue;
+            ++group.members;
+            if (c.quality > r.quality) group.representative = static_cast<int>(i);
+            joined = true;
+            break;
+        }
+        if (!joined) groups.push_back({static_cast<int>(i), 1});
+    }
+    const int least = candidates.size() == 1 ? 1 : 2;
+    int chosen = -1, most = 0;
+    for (const Group& group : groups)
+        if (group.members >= least && group.members > most) {
+            most = group.members;
+            chosen = group.representative;
+        }
+    return chosen;
+}
+
+void ComputePlanimetry(StationResult& result) {
+    std::vector<int> lines, known;
+    for (std::size_t i = 0; i < result.sightings.size(); ++i) {
+        const StationSighting& s = result.sightings[i];
+        if (!UsableInPlanimetry(s)) continue;
+        (s.onStation ? lines : known).push_back(static_cast<int>(i));
+    }
+    if (lines.empty() || known.size() < 2) return Fail(result, kStationTooFew, recoup::kMsgTooFew);
+
+    const std::vector<Candidate> candidates = Candidates(result, lines, known);
+    const int chosen = ChooseCandidate(candidates);
+    // A crossing of exactly 0 gr is a line that touches its circle: the place along it is not fixed.
+    if (chosen < 0 || candidates[chosen].quality == 0.0)
+        return Fail(result, kStationFailed, recoup::kMsgNotComputed);
+    const Candidate& c = candidates[chosen];
+    result.sightings[c.line].used = true;
+    result.sightings[c.first].used = true;
+    result.sightings[c.second].used = true;
+    result.x0 = c.x;
+    result.y0 = c.y;
+    result.crossing = c.quality;
+
+    if (!ApproximateOrientation(result)) {
+        result.x0 = result.y0 = result.crossing = kUndefined;
+        return Fail(result, kStationFailed, recoup::kMsgNotComputed);
+    }
+    AdjustStation(result);
+    result.flags = kStationComputed;
+    if (c.quality < kRecoupMinCrossing) result.flags |= kStationWeakCrossing;
+}
+
+// The zenith angle of a sighting: after the turn to face left it lies in [0, 200]; a face-right one is
+// folded.
+double FoldedZenith(const StationSighting& s) {
+    return s.av > 200.0 ? 400.0 - s.av : s.av;
+}
+
+// The height relation of a sighting with the station's altitude Z. The line of sight rises from the
+// instrument to the target by `sign` x Z + `base`: for a resection sighting from the station (Z + HI) to
+// the point (Zpoint + HP), sign -1; for an intersection sighting from the other station (ZS + HIS) to
+// the target on this one (Z + HP), sign +1.
+struct Levelling {
+    double sign;
+    double base;
+};
+bool LevellingOf(const StationSighting& s, double hi, Levelling& l) {
+    if (IsUndefined(s.z) || IsUndefined(s.hp)) return false;
+    if (s.onStation) {
+        if (IsUndefined(s.his)) return false;
+        l = {1.0, s.hp - s.z - s.his};
+    } else {
+        if (IsUndefined(hi)) return false;
+        l = {-1.0, s.z + s.hp - hi};
+    }
+    return true;
+}
+
+// The zenith angle under which the sighting would be read were the station at altitude z, and its
+// coefficient a: the change of that angle for a metre of altitude, negated, in gr/m. The curvature and
+// refraction lower the target's apparent height by the same term the altitudes take into account.
+struct Zenith {
+    double angle;
+    double a;
+};
+Zenith ZenithAt(const StationSighting& s, const Levelling& l, double z) {
+    const double h = (l.sign * z + l.base - CurvatureRefraction(s.dh)) / s.dh;
+    const double zc = 100.0 - RadiansToGrads(std::atan(h));
+    const double sine = SinGrads(zc);
+    return {zc, l.sign * RadiansToGrads(sine * sine / s.dh)};
+}
+
+// Altimetry over both kinds of sightings. Each sighting with a zenith angle and a horizontal distance
+// gives the station's altitude: DH / tan z + the curvature and refraction is the rise of its line of
+// sight. Their mean starts one least-squares step on the zenith angles, all of one precision. Each
+// angle's coefficient a is (200/pi) sin² z / DH with the sign of the kind: negative for a resection
+// sighting (a higher station sees its point lower), positive for an intersection sighting (a higher
+// station is seen higher). The unweighted step on the angles is thus the mean of the altitudes weighted
+// by a², the inverse variance of a height difference DH / tan z for an error of the zenith angle: short
+// and level sightings count most. On exact data every altitude is the same and the step is zero.
+void ComputeAltimetry(StationResult& result) {
+    struct Used {
+        StationSighting* s;
+        Levelling l;
+    };
+    std::vector<Used> used;
+    double sum = 0.0;
+    for (StationSighting& s : result.sightings) {
+        Levelling l;
+        if (IsUndefined(s.av) || IsUndefined(s.dh) || !(s.dh > 0.0) || !LevellingOf(s, result.hi, l))
+            continue;
+        const double zenith = FoldedZenith(s);
+        const double sine = SinGrads(zenith);
+        if (sine == 0.0) continue; // vertical: no height difference from a horizontal distance
+        const double rise = s.dh * CosGrads(zenith) / sine + CurvatureRefraction(s.dh);
+        const double zi = l.sign * (rise - l.base);
+        if (!std::isfinite(zi)) continue;
+        s.zi = zi;
+        sum += zi;
+        used.push_back({&s, l});
+    }
+    if (used.empty()) return;
+    const int m = static_cast<int>(used.size());
+    result.altitudes = m;
+    result.z0 = sum / m;
+    result.z = result.z0;
+    if (m == 1) return;
+
+    double saa = 0.0, sar = 0.0;
+    for (const Used& u : used) {
+        const Zenith c = ZenithAt(*u.s, u.l, result.z0);
+        saa += c.a * c.a;
+        sar += c.a * (c.angle - FoldedZenith(*u.s));
+    }
+    if (saa > 0.0 && std::isfinite(result.z0 + sar / saa)) result.z = result.z0 + sar / saa;
+
+    // The residuals and the error from the computed altitude.
+    saa = 0.0;
+    double svv = 0.0;
+    for (const Used& u : used) {
+        const Zenith c = ZenithAt(*u.s, u.l, result.z);
+        saa += c.a * c.a;
+        u.s->vz = c.angle - FoldedZenith(*u.s);
+        u.s->ez = (CosGrads(c.angle) - CosGrads(u.s->av)) * u.s->dh;
+        svv += u.s->vz * u.s->vz;
+    }
+    if (saa > 0.0) result.emqZ = std::sqrt(1.0 / saa) * std::sqrt(svv / (m - 1));
+}
+
+} // namespace
+
+LineCircle IntersectLineCircle(double x1, double y1, double x2, double y2, double xc, double yc, double r) {
+    LineCircle cut;
+    const double length = std::hypot(x2 - x1, y2 - y1);
+    if (!(length > 0.0) || !(r > 0.0) || !std::isfinite(length) || !std::isfinite(r)) return cut;
+    // Unit vector along the line; the foot of the perpendicular from the centre lies at t0 along it from
+    // the first point, and the centre at the distance |h| from the line.
+    const double ux = (x2 - x1) / length, uy = (y2 - y1) / length;
+    const double wx = xc - x1, wy = yc - y1;
+    const double t0 = wx * ux + wy * uy;
+    const double h = std::fabs(wx * uy - wy * ux);
+    if (h > r + kTangentTolerance) return cut;
+    if (std::fabs(h - r) <= kTangentTolerance) {
+        cut.count = 1;
+        cut.x[0] = x1 + t0 * ux;
+        cut.y[0] = y1 + t0 * uy;
+        return cut;
+    }
+    // Half the chord; (r - h)(r + h) keeps its precision when h is close to r.
+    const double half = std::sqrt((r - h) * (r + h));
+    cut.count = 2;
+    for (int k = 0; k < 2; ++k) {
+        const double t = k == 0 ? t0 - half : t0 + half;
+        cut.x[k] = x1 + t * ux;
+        cut.y[k] = y1 + t * uy;
+    }
+    return cut;
+}
+
+int ComputeRecoupement(StationResult& result, bool plani, bool alti) {
+    ResetOutputs(result);
+    if (plani) ComputePlanimetry(result);
+    if (alti) ComputeAltimetry(result);
+    return result.flags;
+}
+
+} // namespace pyr
