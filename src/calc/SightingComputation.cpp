@@ -67,6 +67,15 @@ const StationPlace& CSightingComputation::PlaceOf(int station) {
     return found->second;
 }
 
+bool CSightingComputation::WriteStation(int stationIndex, double x, double y, double z, double v0) {
+    const StationPlace place = PlaceOf(stationIndex);
+    bool written = m_session.WritePoint(place.name, x, y, z);
+    if (written && IsKnown(v0)) written = m_session.WriteStationV0(stationIndex, place.Designation(), v0);
+    ForgetPlaces(); // the station, and what it sighted, are placed by what was written from now on
+    Notify(kPartResult);
+    return written;
+}
+
 std::string CSightingComputation::Shown(double value, int decimals) {
     return IsKnown(value) ? FormatFixedShown(value, decimals) : std::string();
 }

@@ -101,6 +101,10 @@ protected:
     // changes them (Forget).
     const StationPlace& PlaceOf(int station);
     void ForgetPlaces() { m_places.clear(); }
+    // Writes a computed station into the GéoBase (not saved yet): its point receives X and Y, Z (any of
+    // them kUndefined is left alone; invariant ones are replaced only when the person agrees), the station
+    // its V0 when known. False when the GéoBase refused it.
+    bool WriteStation(int stationIndex, double x, double y, double z, double v0);
     // A value with that many decimals, "" when unknown.
     static std::string Shown(double value, int decimals);
 

@@ -1,6 +1,7 @@
 #include "host/CommandHandlers.h"
 
 #include "calc/CalcIntersDriver.h"
+#include "calc/StationComputationDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
@@ -61,6 +62,14 @@ void OnCalculV0(const CommandEntry& command) {
 
 void OnCalInter(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CCalcIntersDriver>(); });
+}
+
+void OnCalRelev(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcRelevDriver>(); });
+}
+
+void OnCalRecou(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcRecoupDriver>(); });
 }
 
 void OnReadFieldBook(const CommandEntry& command) {

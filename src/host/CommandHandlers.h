@@ -16,6 +16,10 @@ void OnCalcOpt(const CommandEntry& command);
 void OnCalculV0(const CommandEntry& command);
 // "CalInter": a point by intersection.
 void OnCalInter(const CommandEntry& command);
+// "CalRelev": a station by resection.
+void OnCalRelev(const CommandEntry& command);
+// "CalRecou": a station by the combined method.
+void OnCalRecou(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);

@@ -1,0 +1,19 @@
+#pragma once
+
+#include "calc/StationComputation.h"
+
+namespace pyr {
+
+// The dialog "Calcul de la station %s par relèvement": a station occurrence placed, oriented and given
+// its altitude by its sightings on three or more known points. Its switches are kept in the section
+// "Calcul Relevement".
+class CCalcRelev : public CStationComputation {
+public:
+    CCalcRelev();
+
+private:
+    int Compute(StationResult& result, bool plani, bool alti) const override;
+    void WriteResult(CDlgCfgListing& listing, std::size_t index) const override;
+};
+
+} // namespace pyr

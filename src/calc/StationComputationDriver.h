@@ -1,0 +1,62 @@
+#pragma once
+
+#include "calc/CalcRecoup.h"
+#include "calc/CalcRelev.h"
+#include "calc/ComputationOptions.h"
+#include "ui/Dialog.h"
+
+#include <memory>
+#include <optional>
+#include <string>
+
+namespace pyr {
+
+// A station computed from a command line: "--station NOM" (or "NOM(2)" for an occurrence), "--visees
+// SELECTION" (the points, or the sighting stations, whose lines are taken; by default every line the
+// dialog offers), "--plani 0|1", "--alti 0|1", "--enregistrer" (the station's point and V0 written and
+// the GéoBase saved), "--listing [FICHIER]". The result is printed as the dialog shows it; the run fails
+// when the station could not be computed.
+class CStationComputationDriver : public ui::Dialog {
+public:
+    std::string Caption() const override { return m_model.Caption(); }
+    ui::DialogModel& Model() override { return m_model; }
+    void DeclareOptions(ui::DialogOptions& options) override;
+    ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    std::unique_ptr<ui::Form> MakeForm() override;
+
+protected:
+    // `model` is the derived driver's own member: only kept here, used once the driver is built.
+    explicit CStationComputationDriver(CStationComputation& model) : m_model(model) {}
+
+private:
+    bool ComputeStation(ui::FrontEnd& frontEnd);
+    void Print(ui::FrontEnd& frontEnd);
+
+    CStationComputation& m_model;
+    struct Requests {
+        std::optional<std::string> station;
+        std::optional<std::string> sightings;
+        std::optional<bool> plani, alti;
+        ComputationRequests computation;
+    } m_requests;
+};
+
+// "CalRelev".
+class CCalcRelevDriver final : public CStationComputationDriver {
+public:
+    CCalcRelevDriver() : CStationComputationDriver(m_relev) {}
+
+private:
+    CCalcRelev m_relev;
+};
+
+// "CalRecou".
+class CCalcRecoupDriver final : public CStationComputationDriver {
+public:
+    CCalcRecoupDriver() : CStationComputationDriver(m_recoup) {}
+
+private:
+    CCalcRecoup m_recoup;
+};
+
+} // namespace pyr
