@@ -41,8 +41,8 @@ struct EccentricSighting {
 // Flags of a computation, in EccentricResult::flags.
 enum : int {
     kExcentComputed = 1, // E and V0 were computed
-    kExcentIncomplete =
-        8, // no reference sighting on a point with X and Y, no distance to C, or C without X, Y
+    // No reference sighting on a point with X and Y, no distance to C, or C without X and Y.
+    kExcentIncomplete = 8,
     // E and V0 did not settle within kExcentMaxIterations passes, or E came onto every reference point,
     // from where none has a bearing.
     kExcentNoConvergence = 0x400,

@@ -4,9 +4,9 @@
 #include "calc/EccentricStation.h"
 #include "calc/EccentricTexts.h"
 
+#include <array>
 #include <cmath>
 #include <gtest/gtest.h>
-#include <initializer_list>
 #include <string>
 #include <utility>
 
@@ -45,17 +45,16 @@ double Centred(double grads) {
 struct Reading {
     double ah, av, di, dh;
 };
-Reading Read(const Place& p, double hp, bool bent, double v0 = kV0) {
+Reading Read(const Place& p, double hp, bool bent) {
     const double dx = p.x - kE.x, dy = p.y - kE.y, horizontal = std::hypot(dx, dy);
     const double rise = (p.z + hp) - (kE.z + kHi) - (bent ? kCurvature * horizontal * horizontal : 0.0);
-    return {std::fmod(std::atan2(dx, dy) * kGonPerRadian - v0 + 800.0, 400.0),
+    return {std::fmod(std::atan2(dx, dy) * kGonPerRadian - kV0 + 800.0, 400.0),
             std::atan2(horizontal, rise) * kGonPerRadian, std::hypot(horizontal, rise), horizontal};
 }
 
 // The station with the centre C at `offset` from E and its three references; C has an altitude when
 // `centreZ`. `noise` is added to the references' directions, gr.
-EccentricResult Job(double offsetX, double offsetY, bool centreZ,
-                    std::initializer_list<double> noise = {0.0, 0.0, 0.0}) {
+EccentricResult Job(double offsetX, double offsetY, bool centreZ, std::array<double, 3> noise = {}) {
     EccentricResult result;
     result.station = "E";
     result.hi = kHi;
@@ -64,13 +63,12 @@ EccentricResult Job(double offsetX, double offsetY, bool centreZ,
     result.centre = "C";
     result.xC = c.x, result.yC = c.y, result.zC = centreZ ? c.z : kUndefined;
     result.hpC = 0.20, result.ahC = onC.ah, result.avC = onC.av, result.diC = onC.di, result.dhC = onC.dh;
-    const double* delta = noise.begin();
     for (int i = 0; i < 3; ++i) {
         const Reading r = Read(kRefs[i], kRefHp[i], false);
         EccentricSighting s;
         s.reference = "R" + std::to_string(i + 1);
         s.x = kRefs[i].x, s.y = kRefs[i].y, s.z = kRefs[i].z, s.hp = kRefHp[i];
-        s.ah = r.ah + delta[i], s.av = r.av, s.di = r.di;
+        s.ah = r.ah + noise[i], s.av = r.av, s.di = r.di;
         result.sightings.push_back(s);
     }
     return result;
@@ -96,9 +94,7 @@ TEST(EccentricStation, ExactSightingsGiveThePlaceOrientationAndAltitudeBack) {
             EXPECT_NEAR(r.x, kE.x, kTenthMm);
             EXPECT_NEAR(r.y, kE.y, kTenthMm);
             EXPECT_NEAR(Centred(r.v0 - kV0), 0.0, kHundredthMgon);
-            EXPECT_GE(r.v0, 0.0);
-            EXPECT_GT(r.iterations, 1);
-            EXPECT_LT(r.iterations, 100);
+            EXPECT_TRUE(r.v0 >= 0.0 && r.iterations > 1 && r.iterations < 100) << r.v0 << " " << r.iterations;
             for (int i = 0; i < 3; ++i) {
                 EXPECT_NEAR(r.sightings[i].d, kRefDistances[i], kTenthMm);
                 EXPECT_NEAR(r.sightings[i].ev0, 0.0, kHundredthMgon);
@@ -107,18 +103,15 @@ TEST(EccentricStation, ExactSightingsGiveThePlaceOrientationAndAltitudeBack) {
             EXPECT_NEAR(r.z, kE.z, centreZ ? 1e-5 : kTenthMm);
             // Without C's altitude the three references give it, each exactly, with no spread.
             EXPECT_EQ(r.altitudes, centreZ ? 0 : 3);
-            if (!centreZ) {
-                EXPECT_NEAR(r.sightings[1].zi, kE.z, kTenthMm);
-                EXPECT_NEAR(r.emqZ, 0.0, 1e-6);
-            }
+            EXPECT_NEAR(r.emqZ, centreZ ? kUndefined : 0.0, 1e-6);
             ExpectAllFinite(r);
         }
 }
 
 TEST(EccentricStation, NoisyDirectionsAreAveragedByDistanceSoTheNearestWeighsLeast) {
     // On the references 35, 480 and 2 100 m away, gr; the second's V0 passes the zero, at 0.0005 gr.
-    const double noise[] = {0.010, -0.001, 0.0005};
-    EccentricResult r = Job(-16.0, -12.0, true, {noise[0], noise[1], noise[2]});
+    const std::array<double, 3> noise = {0.010, -0.001, 0.0005};
+    EccentricResult r = Job(-16.0, -12.0, true, noise);
     ASSERT_EQ(ComputeEccentricStation(r, true, true), kExcentComputed);
 
     // At the place found: each reference's V0 from plain atan2, their mean weighted by the distances.
