@@ -169,6 +169,8 @@ void ComputePlanimetry(StationResult& result) {
     result.crossing = c.quality;
 
     if (!ApproximateOrientation(result)) {
+        for (StationSighting& s : result.sightings)
+            s.used = false;
         result.x0 = result.y0 = result.crossing = kUndefined;
         return Fail(result, kStationFailed, recoup::kMsgNotComputed);
     }
