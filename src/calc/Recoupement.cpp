@@ -103,7 +103,7 @@ std::vector<Candidate> Candidates(const StationResult& result, const std::vector
                         continue;
                     const double seen = Bearing(x, y, b.x, b.y) - Bearing(x, y, a.x, a.y);
                     if (std::fabs(Centred(seen - gamma)) > kMaxAngleGap) continue;
-                    // The circle runs across its radius: its tangent at the place is 100 gr off the
+                    // The tangent to the circle at the place is square to the radius: 100 gr off the
                     // bearing from the centre.
                     const double tangent = Bearing(c.xc, c.yc, x, y) + 100.0;
                     candidates.push_back({x, y, IntersectionAngle(g, tangent), i, known[p], known[q]});
