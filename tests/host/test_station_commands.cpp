@@ -118,6 +118,24 @@ TEST_F(StationCommands, InvariantCoordinatesOfTheStationAreKeptOnNo) {
     EXPECT_NEAR(saved.v0At(saved.findStaRep("E", 1)), kV0E, 1e-9) << "the V0 is no coordinate";
 }
 
+TEST_F(StationCommands, TheCombinedMethodTakesTheSightingsOnTheStationToo) {
+    Outcome outcome = Run("CalRecou", "--station E --enregistrer --listing recoup.crc --oui");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    ExpectInOrder(outcome.out, {"Station E (1) : X = 1040.0000  Y = 2030.0000", "Station E (1) : V0 = 37.5000",
+                                "Station E (1) : Z = 101.500", "---> A", "<--- A (1)"});
+    const CCarnet saved = Saved();
+    EXPECT_NEAR(saved.yAt(saved.findMat("E")), kE.y, 1e-9);
+    ExpectInOrder(ReadBytes(dir / "recoup.crc"),
+                  {"CALCUL PAR RECOUPEMENT", "Calcul de la station E, reprise 1", "Matricule visée R", "<-- A (1)",
+                   "Calcul en altimétrie", "<-- A (1)"});
+    ExpectInOrder(ReadBytes(dir / "chantier.jnl"), {" - Calcul de points par recoupement\nPoint       E", "\nStation    E(1)"});
+
+    // Resection sightings alone are not enough.
+    outcome = Run("CalRecou", "--station E --visees B,C,D");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.out, "1 visée d'intersection et 2 visées de relèvement minimun")) << outcome.out;
+}
+
 // Root writes into a read-only file: this runs again as an unprivileged person.
 class StationCommandsAsUser : public StationCommands {};
 
