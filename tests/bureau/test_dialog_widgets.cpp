@@ -7,6 +7,7 @@
 #include "calc/CalcInters.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalculV0Driver.h"
+#include "calc/StationComputationDriver.h"
 #include "calc/IntersectionJob.h"
 #include "settings/OptionPages.h"
 #include "ui/Form.h"
@@ -132,6 +133,59 @@ TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     const int station = saved.findStaRep("S1", 1);
     ASSERT_GE(station, 0);
     EXPECT_NEAR(saved.v0At(station), 50.0, 1e-4);
+}
+
+TEST(DialogWidgets, AStationIsComputedAndWrittenThroughTheCombinedDialog) {
+    // E, unknown, sights A, B and C; S, set up on A and oriented, sights E.
+    const Place e{1040.0, 2030.0, 101.5};
+    const Place a{1000.0, 2100.0, 100.0}, b{1120.0, 2080.0, 102.0}, c{1090.0, 1950.0, 99.0};
+    CCarnet job;
+    for (const auto& [name, place] : {std::pair{"A", a}, {"B", b}, {"C", c}})
+        AddPoint(job, name, place);
+    AddStation(job, "E", 1.55);
+    for (const auto& [name, place] : {std::pair{"A", a}, {"B", b}, {"C", c}})
+        AddSighting(job, name, e, 1.55, place, 1.3, 37.5);
+    AddStation(job, "A", 1.6, 50.0);
+    AddSighting(job, "E", a, 1.6, e, 1.4, 50.0, kKindMesure);
+    TempDir dir;
+    WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
+    ASSERT_EQ(job.Save(dir / "chantier.geo"), 1);
+
+    ui::ScriptedFrontEnd frontEnd;
+    CCalcRecoupDriver driver;
+    driver.SetInputs({dir / "chantier.geo", dir / "Pyralis.ini", "", "calcul d'un point par recoupement"});
+    const std::unique_ptr<ui::Form> form = driver.MakeForm();
+    ASSERT_TRUE(form->Open(frontEnd));
+    bureau::FormDialog dialog(*form, frontEnd);
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
+    auto& station = Find<QComboBox>(dialog, "sujet");
+    ASSERT_EQ(station.count(), 1);
+    EXPECT_EQ(station.itemText(0).toStdString(), "E (1)");
+    station.setFocus();
+    station.lineEdit()->selectAll();
+    QTest::keyClicks(station.lineEdit(), "E");
+    QTest::keyClick(station.lineEdit(), Qt::Key_Return);
+    auto& available = Find<QListWidget>(dialog, "disponibles");
+    ASSERT_EQ(available.count(), 4);
+    EXPECT_EQ(available.item(0)->text().toStdString(), "---> A");
+    EXPECT_EQ(available.item(3)->text().toStdString(), "<--- A (1)");
+    Click(dialog, "ajouterToutes");
+    EXPECT_NEAR(Find<QLineEdit>(dialog, "valeurPremiere").text().toDouble(), e.x, kTenthMm);
+    EXPECT_NEAR(Find<QLineEdit>(dialog, "valeurSeconde").text().toDouble(), e.y, kTenthMm);
+    EXPECT_NEAR(Find<QLineEdit>(dialog, "valeurV0").text().toDouble(), 37.5, 1e-4);
+    EXPECT_EQ(dialog.windowTitle().toStdString(), "Calcul de la station E par recoupement");
+    Picture(dialog, "CalRecou-station-calculee.png");
+    Click(dialog, "ecrire");
+    frontEnd.answers = {ui::Answer::Yes, ui::Answer::No}; // saved, no listing
+    Click(dialog, "fermer");
+    CCarnet saved;
+    saved.Load(nullptr, dir / "chantier.geo");
+    const int point = saved.findMat("E");
+    ASSERT_GE(point, 0);
+    EXPECT_NEAR(saved.xAt(point), e.x, kTenthMm);
+    EXPECT_NEAR(saved.zAt(point), e.z, kTenthMm);
+    EXPECT_NEAR(saved.v0At(saved.findStaRep("E", 1)), 37.5, 1e-4);
 }
 
 TEST(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWrite) {
