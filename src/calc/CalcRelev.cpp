@@ -1,8 +1,10 @@
 #include "calc/CalcRelev.h"
 
+#include "calc/ResectionTexts.h"
 #include "calc/SessionTexts.h"
 #include "calc/StationListing.h"
 #include "settings/Journal.h"
+#include "ui/FrontEnd.h"
 
 namespace pyr {
 
@@ -16,6 +18,12 @@ CCalcRelev::CCalcRelev()
 
 int CCalcRelev::Compute(StationResult& result, bool plani, bool alti) const {
     return ComputeResection(result, plani, alti);
+}
+
+// Fewer than three sightings taken is said at once, as well as in the status line: no triple, no place.
+void CCalcRelev::Warn(int flags) {
+    if ((flags & kStationTooFew) && m_frontEnd)
+        m_frontEnd->MessageBox(resec::kMsgTooFew, ui::kCaption, ui::kIconWarning);
 }
 
 void CCalcRelev::WriteResult(CDlgCfgListing& listing, std::size_t index) const {

@@ -13,6 +13,7 @@ public:
 
 private:
     int Compute(StationResult& result, bool plani, bool alti) const override;
+    void Warn(int flags) override;
     void WriteResult(CDlgCfgListing& listing, std::size_t index) const override;
 };
 

@@ -91,6 +91,7 @@ TEST_F(StationCommands, SomeSightingsOnlyAndTooFew) {
     outcome = Run("CalRelev", "--station E --visees A,B");
     EXPECT_EQ(outcome.status, 1);
     EXPECT_TRUE(Has(outcome.out, "Calcul impossible : il faut au moins trois visées !")) << outcome.out;
+    EXPECT_TRUE(Has(outcome.err, "Calcul impossible : il faut au moins trois visées !")) << outcome.err;
 }
 
 TEST_F(StationCommands, BadRequestsAreRefusedWithAFrenchMessage) {
