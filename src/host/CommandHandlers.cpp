@@ -1,8 +1,9 @@
 #include "host/CommandHandlers.h"
 
+#include "calc/CalcExcentDriver.h"
 #include "calc/CalcIntersDriver.h"
-#include "calc/StationComputationDriver.h"
 #include "calc/CalculV0Driver.h"
+#include "calc/StationComputationDriver.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
 #include "fieldbook/ReadingCommand.h"
@@ -70,6 +71,10 @@ void OnCalRelev(const CommandEntry& command) {
 
 void OnCalRecou(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CCalcRecoupDriver>(); });
+}
+
+void OnCalExcen(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcExcentDriver>(); });
 }
 
 void OnReadFieldBook(const CommandEntry& command) {

@@ -20,6 +20,8 @@ void OnCalInter(const CommandEntry& command);
 void OnCalRelev(const CommandEntry& command);
 // "CalRecou": a station by the combined method.
 void OnCalRecou(const CommandEntry& command);
+// "CalExcen": an eccentric station.
+void OnCalExcen(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);

@@ -39,7 +39,7 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraCalInter", "CalInter", "calcul d'un point par intersections de visées", OnCalInter},
     {"PyraCalRelev", "CalRelev", "calcul d'un point par relèvement", OnCalRelev},
     {"PyraCalRecou", "CalRecou", "calcul d'un point par recoupement", OnCalRecou},
-    {"PyraCalExcen", "CalExcen", "calcul d'une station excentrée", OnPending},
+    {"PyraCalExcen", "CalExcen", "calcul d'une station excentrée", OnCalExcen},
     {"PyraCalTrian", "CalTrian", "calcul d'un point par triangulation", OnPending},
     {"PyraCalculV0", "CalculV0", "calcul du V0 d'une station", OnCalculV0},
     {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnPending},

@@ -1,0 +1,134 @@
+#include "calc/CalcExcentDriver.h"
+
+#include "calc/CalcExcentForm.h"
+#include "calc/EccentricTexts.h"
+#include "calc/IntersectionListing.h"
+#include "calc/StationTexts.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/Elements.h"
+#include "geobase/GeoBaseMessages.h"
+#include "geobase/Selection.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+namespace pyr {
+
+namespace {
+
+constexpr const char* kHelpStation =
+    "la station excentrée à calculer : NOM, ou NOM(2) pour sa deuxième mise en station";
+constexpr const char* kHelpCentre =
+    "le point connu, visé avec une distance, à côté duquel la station est faite";
+constexpr const char* kHelpReferences =
+    "les points d'appui dont les visées sont prises (par défaut tous ceux que vise la station)";
+constexpr const char* kHelpPlani =
+    "calculer la planimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
+constexpr const char* kHelpAlti = "calculer l'altimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
+constexpr const char* kHelpSave = "écrire la station calculée (point et V0) dans la GéoBase et l'enregistrer";
+
+// A field of the dialog as the text window shows it: "-" when it is empty.
+std::string Dashed(const std::string& text) {
+    return text.empty() ? std::string("-") : text;
+}
+
+} // namespace
+
+void CCalcExcentDriver::DeclareOptions(ui::DialogOptions& options) {
+    options.Value("station", "NOM", kHelpStation, [this](const std::string& name) {
+        m_requests.station = name;
+        return std::string();
+    });
+    options.Value("centre", "C", kHelpCentre, [this](const std::string& mat) {
+        m_requests.centre = mat;
+        return std::string();
+    });
+    options.Value("appuis", "SELECTION", kHelpReferences, [this](const std::string& selection) {
+        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
+        m_requests.references = selection;
+        return std::string();
+    });
+    options.ZeroOrOne("plani", kHelpPlani, [this](bool on) { m_requests.plani = on; });
+    options.ZeroOrOne("alti", kHelpAlti, [this](bool on) { m_requests.alti = on; });
+    DeclareComputationOptions(options, m_requests.computation, kHelpSave);
+}
+
+// The result as the dialog shows it: the centre, the fields, then the residuals of each reference taken.
+void CCalcExcentDriver::Print(ui::FrontEnd& frontEnd) {
+    CPyrTxtWnd txt(frontEnd);
+    const EccentricResult& result = m_model.Result();
+    const std::string name = m_model.Station();
+    const char* station = name.c_str();
+    const std::string dhC = IsKnown(result.dhC) ? FormatFixedShown(result.dhC, CPointGen::DeciXY()) : "-";
+    txt.Print(excent::kLineCentre, station, result.centre.c_str(), dhC.c_str());
+    if (!result.status.empty()) txt.Print(station::kLineStatus, station, result.status.c_str());
+    if (IsKnown(result.x)) {
+        const bool swap = CPointGen::SwapXY();
+        const std::string x = m_model.XText(), y = m_model.YText();
+        txt.Print(excent::kLinePlace, station, swap ? station::kLabelY : station::kLabelX,
+                  (swap ? y : x).c_str(), swap ? station::kLabelX : station::kLabelY, (swap ? x : y).c_str());
+        txt.Print(excent::kLineV0, station, m_model.V0Text().c_str());
+    }
+    if (IsKnown(result.z)) {
+        if (result.altitudes == 0)
+            txt.Print(excent::kLineAltitudeFromCentre, station, m_model.ZText().c_str(),
+                      result.centre.c_str());
+        else
+            txt.Print(excent::kLineAltitude, station, m_model.ZText().c_str(),
+                      Dashed(m_model.EmqZText()).c_str(), result.altitudes);
+    }
+    for (const EccentricSighting& s : result.sightings)
+        txt.Print(excent::kLineReference, Sprintf(station::kLineResection, s.reference.c_str()).c_str(),
+                  Milligrads(s.ev0).c_str(), Milligrads(s.eav).c_str());
+}
+
+bool CCalcExcentDriver::ComputeStation(ui::FrontEnd& frontEnd) {
+    if (!m_requests.station || !m_requests.centre) {
+        frontEnd.MessageBox(m_requests.station ? excent::kMsgNoCentreAsked : station::kMsgNoStationAsked,
+                            ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    if (!m_model.ChooseStation(*m_requests.station) || !m_model.ChooseCentre(*m_requests.centre))
+        return false;
+    const std::string& chosen = m_model.Station();
+    if (m_requests.references) {
+        if (!m_model.SelectReferences(*m_requests.references)) {
+            frontEnd.MessageBox(
+                Sprintf(station::kMsgNoSightingKept, chosen.c_str(), m_requests.references->c_str()),
+                ui::kCaption, ui::kIconWarning);
+            return false;
+        }
+    } else {
+        m_model.AddAll();
+    }
+    if (m_model.Selected().empty()) {
+        frontEnd.MessageBox(Sprintf(excent::kMsgNoReference, chosen.c_str(), m_model.Centre().c_str()),
+                            ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    Print(frontEnd);
+    // A station is computed when its planimetry is, or its altitude when only the altimetry is asked.
+    const EccentricResult& result = m_model.Result();
+    if (m_model.Plani() ? !(result.flags & kExcentComputed) : !IsKnown(result.z)) return false;
+    return !m_requests.computation.save || m_model.WriteStation();
+}
+
+ui::DialogResult CCalcExcentDriver::Run(ui::FrontEnd& frontEnd) {
+    m_model.SetInputs(Inputs());
+    if (GeoBaseNamed()) m_model.SetGeoBase(GeoBase());
+    if (!m_model.Open(frontEnd))
+        return m_model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
+    if (m_requests.plani) m_model.SetPlani(*m_requests.plani);
+    if (m_requests.alti) m_model.SetAlti(*m_requests.alti);
+    bool ok = ComputeStation(frontEnd);
+    // "--enregistrer" saves without the question of the closing.
+    if (m_requests.computation.save && m_model.Modified() && !m_model.Save()) ok = false;
+    m_model.Close(m_requests.computation.listing, m_requests.computation.listingPath);
+    return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+std::unique_ptr<ui::Form> CCalcExcentDriver::MakeForm() {
+    return std::make_unique<CCalcExcentForm>(*this, m_model);
+}
+
+} // namespace pyr
