@@ -11,7 +11,6 @@ inline constexpr const char* kMsgNotComputed = "Le point n'a pas pu être calcul
 // ---- The dialog
 inline constexpr const char* kCaption = "Calcul de la station excentrée %s";
 inline constexpr const char* kLabelCentre = "C&entre :";
-inline constexpr const char* kLabelEmqZ = "EMQ (cm)";
 inline constexpr const char* kMsgNoStation =
     "La GéoBase <%s> n'a aucune station qui vise avec une distance un point connu en coordonnées !";
 inline constexpr const char* kMsgStationNotOffered =
