@@ -95,22 +95,39 @@ double Cotangent(double grads) {
 // well), so that it may shut out later triples: the station stays unplaced rather than taken from a
 // weaker triple. The place is the mean of the crossings of the pairs of rays that meet well enough.
 void ApproximatePlace(StationResult& result, const std::vector<int>& known) {
+    // The angle from each sighting's direction to each later one's, and its cotangent, worked out once:
+    // every triple (i, j, k) needs those from i to j and from i to k, and there are n³/6 triples.
+    struct Angle {
+        double grads = 0.0;
+        double cot = 0.0;
+        bool aligned = true;
+    };
+    const std::size_t n = known.size();
+    std::vector<Angle> angles(n * n);
+    for (std::size_t i = 0; i < n; ++i)
+        for (std::size_t j = i + 1; j < n; ++j) {
+            Angle& angle = angles[i * n + j];
+            angle.grads = WrapGrads(result.sightings[known[j]].ah - result.sightings[known[i]].ah);
+            angle.aligned = NearlyAligned(angle.grads);
+            if (!angle.aligned) angle.cot = Cotangent(angle.grads);
+        }
+
     double most = 0.0;
     bool aligned = false, cocyclic = false;
     int chosen[3] = {-1, -1, -1};
-    const std::size_t n = known.size();
     for (std::size_t i = 0; i < n; ++i)
         for (std::size_t j = i + 1; j < n; ++j)
             for (std::size_t k = j + 1; k < n; ++k) {
                 const StationSighting& a = result.sightings[known[i]];
                 const StationSighting& b = result.sightings[known[j]];
                 const StationSighting& c = result.sightings[known[k]];
-                const double alpha = WrapGrads(b.ah - a.ah), beta = WrapGrads(c.ah - a.ah);
-                if (NearlyAligned(alpha) || NearlyAligned(beta)) {
+                const Angle& ab = angles[i * n + j];
+                const Angle& ac = angles[i * n + k];
+                if (ab.aligned || ac.aligned) {
                     aligned = true;
                     continue;
                 }
-                const double cotAlpha = Cotangent(alpha), cotBeta = Cotangent(beta);
+                const double alpha = ab.grads, beta = ac.grads, cotAlpha = ab.cot, cotBeta = ac.cot;
                 const double p = cotAlpha * (b.x - a.x) - cotBeta * (c.x - a.x) + (c.y - b.y);
                 const double q = cotAlpha * (b.y - a.y) - cotBeta * (c.y - a.y) - (c.x - b.x);
                 const double pq = p * p + q * q;
