@@ -23,8 +23,7 @@ constexpr double kCocyclicLimit = 0.001;
 // Two rays whose bearings differ by less than about 0.64 gr (|sine| up to 0.01) from 0 or 200 cross too
 // flatly to place the station.
 constexpr double kPairMinSine = 0.01;
-// The least-squares step needs one sighting more than its three unknowns, and the altitude's error one
-// more than its one.
+// The least-squares step on X, Y and V0 needs one direction more than its three unknowns.
 constexpr int kMinAdjusted = 4;
 
 void ResetOutputs(StationResult& result) {
