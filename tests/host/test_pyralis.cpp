@@ -31,8 +31,8 @@ TEST_F(Pyralis, ExitStatusSaysWhetherTheCommandRanWasRefusedOrMisused) {
         const char* arguments;
         int status;
         const char* said; // on standard error, or on standard output for the help
-    } cases[] = {{"CALRELEV", 1,
-                  "La commande CalRelev (calcul d'un point par relèvement) n'est pas encore disponible"},
+    } cases[] = {{"CALTRIAN", 1,
+                  "La commande CalTrian (calcul d'un point par triangulation) n'est pas encore disponible"},
                  {"CalInconnu", 2, "commande inconnue « CalInconnu »"},
                  {"CalInter --bidon", 2, "--bidon"},
                  {"--bidon CalInter", 2, "--bidon"},
@@ -57,7 +57,7 @@ TEST_F(Pyralis, CalcOptRefusesAnOptionOutOfItsLimitsAndSetsOneWithin) {
 }
 
 TEST_F(Pyralis, APersonTypesCommandsAtThePrompt) {
-    const Outcome outcome = Run("--interactif", "calrelev\n\"PyrCalTopo15\"\nFIN\n");
+    const Outcome outcome = Run("--interactif", "caltrian\n\"PyrCalTopo15\"\nFIN\n");
     EXPECT_EQ(outcome.status, 0);
     EXPECT_TRUE(Has(outcome.err, "Commande : ")) << outcome.err;
     EXPECT_TRUE(Has(outcome.err, "n'est pas encore disponible"));

@@ -1,4 +1,4 @@
-// "pyralis CalRelev", "CalRecou" and "CalExcen" run as a script runs them: the exit status, what is shown,
+// "pyralis CalRelev" and "CalRecou" run as a script runs them: the exit status, what is shown,
 // the GéoBase written back, the listing and the journal, and what is refused. The station E stands at a
 // place known to the test only; every sighting is what a perfect instrument would read.
 #include "HostTestSupport.h"
