@@ -213,7 +213,7 @@ void CCalcExcent::Recompute() {
         m_result.sightings.push_back(Gather(line));
     const int flags = ComputeEccentricStation(m_result, Plani(), Alti());
     if ((flags & (kExcentIncomplete | kExcentNoConvergence)) && m_frontEnd)
-        m_frontEnd->MessageBox(excent::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
+        m_frontEnd->MessageBox(session::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
     if (Computed()) m_results.Keep(m_station, m_result);
     Notify(kPartResult);
 }

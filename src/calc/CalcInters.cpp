@@ -152,7 +152,7 @@ void CCalcInters::Recompute() {
     if (Computed()) {
         m_results.Keep(m_result.mat, m_result);
     } else if (!(flags & (kInterTooFew | kInterParallel)) && m_frontEnd) {
-        m_frontEnd->MessageBox(inters::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
+        m_frontEnd->MessageBox(session::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
     }
     Notify(kPartResult);
 }

@@ -17,6 +17,11 @@ namespace pyr {
 // sighting was turned.
 bool ReduceToFaceLeft(double& ah, double& av);
 
+// A zenith angle as a height difference uses it, in [0, 200] gr: one read face right is folded, 400 - AV.
+constexpr double FoldedZenith(double av) {
+    return av > 200.0 ? 400.0 - av : av;
+}
+
 // Reduces a sighting on an eccentric target to the point itself. The radial offset ER lies along the
 // line of sight (positive beyond the target), the tangential offset ET across it (positive to the right
 // of the line of sight, seen from the station), the vertical offset EV upwards; all in metres.

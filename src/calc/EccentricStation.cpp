@@ -2,6 +2,7 @@
 
 #include "calc/Corrections.h"
 #include "calc/EccentricTexts.h"
+#include "calc/SessionTexts.h"
 #include "core/Angles.h"
 
 #include <cmath>
@@ -30,18 +31,13 @@ void ResetOutputs(EccentricResult& result) {
 
 void Fail(EccentricResult& result, int flag) {
     result.flags = flag;
-    result.status = excent::kMsgNotComputed;
+    result.status = session::kMsgNotComputed;
     for (EccentricSighting& s : result.sightings)
         ResetSightingPlanimetry(s);
 }
 
 bool UsableInPlanimetry(const EccentricSighting& s) {
     return IsKnown(s.x) && IsKnown(s.y) && IsKnown(s.ah);
-}
-
-// The zenith angle turned to face left, in [0, 200].
-double FoldedZenith(double av) {
-    return av > 200.0 ? 400.0 - av : av;
 }
 
 // The orientation of a station set up at (x, y): each reference sighting gives V0i = G(E -> point) - AH,

@@ -26,12 +26,6 @@ void ResetOutputs(InterResult& result) {
         s.v = s.e = s.vz = s.ez = s.zi = kUndefined;
 }
 
-// A direction misclosure or residual brought within [-200, 200] gr.
-double Centred(double grads) {
-    double w = WrapGrads(grads);
-    return w > 200.0 ? w - 400.0 : w;
-}
-
 void Fail(InterResult& result, int flag, const char* status) {
     result.flags = flag;
     result.status = status;
@@ -63,7 +57,7 @@ std::optional<Eigen::Matrix2d> AdjustDirections(InterResult& result, const std::
         a(row, 0) = RadiansToGrads(dy / d2);
         a(row, 1) = -RadiansToGrads(dx / d2);
         // Computed less observed direction.
-        w(row) = Centred(WrapGrads(RadiansToGrads(std::atan2(dx, dy)) - s.v0) - s.ah);
+        w(row) = CentredGrads(WrapGrads(RadiansToGrads(std::atan2(dx, dy)) - s.v0) - s.ah);
     }
     const Eigen::FullPivLU<Eigen::Matrix2d> lu(a.transpose() * a);
     if (!lu.isInvertible()) return std::nullopt;
@@ -118,7 +112,7 @@ void ComputePlanimetry(InterResult& result) {
         if (IsUndefined(s.xs) || IsUndefined(s.ys)) continue;
         s.dh = std::hypot(result.x - s.xs, result.y - s.ys);
         if (s.dh == 0.0 || !UsableInPlanimetry(s)) continue;
-        s.v = Centred(Bearing(s.xs, s.ys, result.x, result.y) - s.ah - s.v0);
+        s.v = CentredGrads(Bearing(s.xs, s.ys, result.x, result.y) - s.ah - s.v0);
         s.e = s.dh * SinGrads(s.v);
     }
 
@@ -143,12 +137,6 @@ void ComputePlanimetry(InterResult& result) {
     if (best < kInterMinAngle) result.flags |= kInterTooClose;
 }
 
-// The zenith angle of a sighting: after the turn to face left it lies in [0, 200]; a face-right one
-// is folded.
-double FoldedZenith(const InterSighting& s) {
-    return s.av > 200.0 ? 400.0 - s.av : s.av;
-}
-
 // The zenith angle, in gr, under which a station sees the point at altitude z, and the derivative of
 // that angle with respect to z, negated (gr per metre). The curvature and refraction lift the point's
 // apparent height by the same term the altitudes add.
@@ -169,7 +157,7 @@ void ComputeAltimetry(InterResult& result) {
     for (InterSighting& s : result.sightings) {
         if (IsUndefined(s.av) || IsUndefined(s.zs) || IsUndefined(s.hi) || IsUndefined(s.hp)) continue;
         if (IsUndefined(s.dh) || !(s.dh > 0.0)) continue;
-        const double zenith = FoldedZenith(s);
+        const double zenith = FoldedZenith(s.av);
         const double sine = SinGrads(zenith);
         if (sine == 0.0) continue; // vertical: no height difference from a horizontal distance
         const double zi = s.zs + s.hi - s.hp + s.dh * CosGrads(zenith) / sine + CurvatureRefraction(s.dh);
@@ -192,7 +180,7 @@ void ComputeAltimetry(InterResult& result) {
         for (const InterSighting* s : used) {
             const Zenith c = ZenithTo(*s, z);
             sff += c.slope * c.slope;
-            sfr += c.slope * (c.angle - FoldedZenith(*s));
+            sfr += c.slope * (c.angle - FoldedZenith(s->av));
         }
         if (!(sff > 0.0)) break;
         const double delta = sfr / sff;
@@ -208,7 +196,7 @@ void ComputeAltimetry(InterResult& result) {
     for (InterSighting* s : used) {
         const Zenith c = ZenithTo(*s, z);
         sff += c.slope * c.slope;
-        s->vz = c.angle - FoldedZenith(*s);
+        s->vz = c.angle - FoldedZenith(s->av);
         s->ez = (CosGrads(c.angle) - CosGrads(s->av)) * s->dh;
         svv += s->vz * s->vz;
     }

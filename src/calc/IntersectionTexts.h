@@ -18,7 +18,6 @@ inline constexpr const char* kSection = "Calcul Intersection";
 inline constexpr const char* kCaption = "Calcul du point %s par intersection";
 inline constexpr const char* kTooltip = "%s %s : %s";
 inline constexpr const char* kLine = "%s  %s"; // the station's designation, the point sighted
-inline constexpr const char* kMsgNotComputed = "Le point n'a pas pu être calculé !";
 inline constexpr const char* kMsgNoPoint =
     "La GéoBase <%s> n'a aucun point visé depuis une station orientée !";
 inline constexpr const char* kMsgPointNotOffered =

@@ -3,6 +3,7 @@
 #include "calc/Corrections.h"
 #include "calc/Rays.h"
 #include "calc/RecoupementTexts.h"
+#include "calc/SessionTexts.h"
 #include "core/Angles.h"
 
 #include <cmath>
@@ -15,32 +16,6 @@ namespace {
 // A place that sees its two known points under an angle that differs from the measured one by more than
 // this (gr) lies on the other arc of the circle: there the angle is the measured one plus 200.
 constexpr double kMaxAngleGap = 100.0;
-
-void ResetOutputs(StationResult& result) {
-    result.x0 = result.y0 = result.v0Approx = kUndefined;
-    result.x = result.y = result.v0 = kUndefined;
-    result.emqX = result.emqY = result.emqV0 = result.sigma0 = kUndefined;
-    result.crossing = kUndefined;
-    result.altitudes = 0;
-    result.z0 = result.z = result.emqZ = kUndefined;
-    result.flags = 0;
-    result.status.clear();
-    for (StationSighting& s : result.sightings) {
-        s.used = false;
-        s.v0 = s.v = s.e = s.vz = s.ez = s.zi = kUndefined;
-    }
-}
-
-// A direction difference brought within [-200, 200] gr.
-double Centred(double grads) {
-    const double w = WrapGrads(grads);
-    return w > 200.0 ? w - 400.0 : w;
-}
-
-void Fail(StationResult& result, int flag, const char* status) {
-    result.flags = flag;
-    result.status = status;
-}
 
 // A sighting that takes part in the planimetry: its known end placed and its direction read; for an
 // intersection sighting, the orientation of the station that took it.
@@ -102,7 +77,7 @@ std::vector<Candidate> Candidates(const StationResult& result, const std::vector
                         std::hypot(x - b.x, y - b.y) <= kRecoupNearKnown)
                         continue;
                     const double seen = Bearing(x, y, b.x, b.y) - Bearing(x, y, a.x, a.y);
-                    if (std::fabs(Centred(seen - gamma)) > kMaxAngleGap) continue;
+                    if (std::fabs(CentredGrads(seen - gamma)) > kMaxAngleGap) continue;
                     // The tangent to the circle at the place is square to the radius: 100 gr off the
                     // bearing from the centre.
                     const double tangent = Bearing(c.xc, c.yc, x, y) + 100.0;
@@ -153,13 +128,13 @@ void ComputePlanimetry(StationResult& result) {
         if (!UsableInPlanimetry(s)) continue;
         (s.onStation ? lines : known).push_back(static_cast<int>(i));
     }
-    if (lines.empty() || known.size() < 2) return Fail(result, kStationTooFew, recoup::kMsgTooFew);
+    if (lines.empty() || known.size() < 2) return FailStation(result, kStationTooFew, recoup::kMsgTooFew);
 
     const std::vector<Candidate> candidates = Candidates(result, lines, known);
     const int chosen = ChooseCandidate(candidates);
     // A crossing of exactly 0 gr is a line that touches its circle: the place along it is not fixed.
     if (chosen < 0 || candidates[chosen].quality == 0.0)
-        return Fail(result, kStationFailed, recoup::kMsgNotComputed);
+        return FailStation(result, kStationFailed, session::kMsgNotComputed);
     const Candidate& c = candidates[chosen];
     result.sightings[c.line].used = true;
     result.sightings[c.first].used = true;
@@ -172,17 +147,11 @@ void ComputePlanimetry(StationResult& result) {
         for (StationSighting& s : result.sightings)
             s.used = false;
         result.x0 = result.y0 = result.crossing = kUndefined;
-        return Fail(result, kStationFailed, recoup::kMsgNotComputed);
+        return FailStation(result, kStationFailed, session::kMsgNotComputed);
     }
     AdjustStation(result);
     result.flags = kStationComputed;
     if (c.quality < kRecoupMinCrossing) result.flags |= kStationWeakCrossing;
-}
-
-// The zenith angle of a sighting: after the turn to face left it lies in [0, 200]; a face-right one is
-// folded.
-double FoldedZenith(const StationSighting& s) {
-    return s.av > 200.0 ? 400.0 - s.av : s.av;
 }
 
 // The height relation of a sighting with the station's altitude Z. The line of sight rises from the
@@ -238,7 +207,7 @@ void ComputeAltimetry(StationResult& result) {
         Levelling l;
         if (IsUndefined(s.av) || IsUndefined(s.dh) || !(s.dh > 0.0) || !LevellingOf(s, result.hi, l))
             continue;
-        const double zenith = FoldedZenith(s);
+        const double zenith = FoldedZenith(s.av);
         const double sine = SinGrads(zenith);
         if (sine == 0.0) continue; // vertical: no height difference from a horizontal distance
         const double rise = s.dh * CosGrads(zenith) / sine + CurvatureRefraction(s.dh);
@@ -259,7 +228,7 @@ void ComputeAltimetry(StationResult& result) {
     for (const Used& u : used) {
         const Zenith c = ZenithAt(*u.s, u.l, result.z0);
         saa += c.a * c.a;
-        sar += c.a * (c.angle - FoldedZenith(*u.s));
+        sar += c.a * (c.angle - FoldedZenith(u.s->av));
     }
     if (saa > 0.0 && std::isfinite(result.z0 + sar / saa)) result.z = result.z0 + sar / saa;
 
@@ -269,7 +238,7 @@ void ComputeAltimetry(StationResult& result) {
     for (const Used& u : used) {
         const Zenith c = ZenithAt(*u.s, u.l, result.z);
         saa += c.a * c.a;
-        u.s->vz = c.angle - FoldedZenith(*u.s);
+        u.s->vz = c.angle - FoldedZenith(u.s->av);
         u.s->ez = (CosGrads(c.angle) - CosGrads(u.s->av)) * u.s->dh;
         svv += u.s->vz * u.s->vz;
     }
@@ -307,7 +276,7 @@ LineCircle IntersectLineCircle(double x1, double y1, double x2, double y2, doubl
 }
 
 int ComputeRecoupement(StationResult& result, bool plani, bool alti) {
-    ResetOutputs(result);
+    ResetStationOutputs(result);
     if (plani) ComputePlanimetry(result);
     if (alti) ComputeAltimetry(result);
     return result.flags;

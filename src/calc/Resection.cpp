@@ -3,6 +3,7 @@
 #include "calc/Corrections.h"
 #include "calc/Rays.h"
 #include "calc/ResectionTexts.h"
+#include "calc/SessionTexts.h"
 #include "core/Angles.h"
 
 #include <Eigen/Dense>
@@ -26,32 +27,6 @@ constexpr double kPairMinSine = 0.01;
 // The least-squares step on X, Y and V0 needs one direction more than its three unknowns.
 constexpr int kMinAdjusted = 4;
 
-void ResetOutputs(StationResult& result) {
-    result.x0 = result.y0 = result.v0Approx = kUndefined;
-    result.x = result.y = result.v0 = kUndefined;
-    result.emqX = result.emqY = result.emqV0 = result.sigma0 = kUndefined;
-    result.crossing = kUndefined;
-    result.altitudes = 0;
-    result.z0 = result.z = result.emqZ = kUndefined;
-    result.flags = 0;
-    result.status.clear();
-    for (StationSighting& s : result.sightings) {
-        s.used = false;
-        s.v0 = s.v = s.e = s.vz = s.ez = s.zi = kUndefined;
-    }
-}
-
-// A direction misclosure or residual brought within [-200, 200] gr.
-double Centred(double grads) {
-    const double w = WrapGrads(grads);
-    return w > 200.0 ? w - 400.0 : w;
-}
-
-void Fail(StationResult& result, int flag, const char* status) {
-    result.flags = flag;
-    result.status = status;
-}
-
 // A sighting from the station on a known point whose direction was read.
 bool IsResectionSighting(const StationSighting& s) {
     return !s.onStation && IsKnown(s.x) && IsKnown(s.y) && IsKnown(s.ah);
@@ -70,8 +45,8 @@ bool GivesDirection(const StationSighting& s) {
 // that station's V0 + AH. Undefined when the station lies on the known end.
 double DirectionGap(const StationSighting& s, double x, double y, double v0) {
     if (s.x == x && s.y == y) return kUndefined;
-    if (s.onStation) return Centred(Bearing(s.x, s.y, x, y) - s.v0s - s.ah);
-    return Centred(Bearing(x, y, s.x, s.y) - v0 - s.ah);
+    if (s.onStation) return CentredGrads(Bearing(s.x, s.y, x, y) - s.v0s - s.ah);
+    return CentredGrads(Bearing(x, y, s.x, s.y) - v0 - s.ah);
 }
 
 bool NearlyAligned(double direction) {
@@ -167,9 +142,9 @@ void ApproximatePlace(StationResult& result, const std::vector<int>& known) {
             }
 
     if (chosen[0] < 0) {
-        if (aligned) return Fail(result, kStationAligned, resec::kMsgAligned);
-        if (cocyclic) return Fail(result, kStationCocyclic, resec::kMsgCocyclic);
-        return Fail(result, kStationFailed, resec::kMsgNotComputed);
+        if (aligned) return FailStation(result, kStationAligned, resec::kMsgAligned);
+        if (cocyclic) return FailStation(result, kStationCocyclic, resec::kMsgCocyclic);
+        return FailStation(result, kStationFailed, session::kMsgNotComputed);
     }
     for (int rank : chosen)
         result.sightings[rank].used = true;
@@ -217,7 +192,7 @@ void ComputePlanimetry(StationResult& result) {
     std::vector<int> known;
     for (std::size_t i = 0; i < result.sightings.size(); ++i)
         if (IsResectionSighting(result.sightings[i])) known.push_back(static_cast<int>(i));
-    if (known.size() < 3) return Fail(result, kStationTooFew, resec::kMsgTooFew);
+    if (known.size() < 3) return FailStation(result, kStationTooFew, resec::kMsgTooFew);
 
     ApproximatePlace(result, known);
     if (result.flags != 0) return;
@@ -225,16 +200,10 @@ void ComputePlanimetry(StationResult& result) {
         for (StationSighting& s : result.sightings)
             s.used = false;
         result.x0 = result.y0 = kUndefined;
-        return Fail(result, kStationFailed, resec::kMsgNotComputed);
+        return FailStation(result, kStationFailed, session::kMsgNotComputed);
     }
     AdjustStation(result);
     result.flags = kStationComputed;
-}
-
-// The zenith angle of a sighting: after the turn to face left it lies in [0, 200]; a face-right one is
-// folded.
-double FoldedZenith(const StationSighting& s) {
-    return s.av > 200.0 ? 400.0 - s.av : s.av;
 }
 
 // The zenith angle under which the station at altitude z would see the sighting's target, and the change
@@ -264,7 +233,7 @@ void ComputeAltimetry(StationResult& result) {
     for (StationSighting& s : result.sightings) {
         if (s.onStation || IsUndefined(s.z) || IsUndefined(s.av) || IsUndefined(s.hp)) continue;
         if (IsUndefined(s.dh) || !(s.dh > 0.0)) continue;
-        const double zenith = FoldedZenith(s);
+        const double zenith = FoldedZenith(s.av);
         const double sine = SinGrads(zenith);
         if (sine == 0.0) continue; // vertical: no height difference from a horizontal distance
         const double zi = s.z + s.hp - result.hi - s.dh * CosGrads(zenith) / sine - CurvatureRefraction(s.dh);
@@ -286,7 +255,7 @@ void ComputeAltimetry(StationResult& result) {
     for (const StationSighting* s : used) {
         const Zenith c = ZenithFrom(*s, result.hi, result.z0);
         sff += c.f * c.f;
-        sfr += c.f * (c.angle - FoldedZenith(*s));
+        sfr += c.f * (c.angle - FoldedZenith(s->av));
     }
     if (sff > 0.0 && std::isfinite(result.z0 + sfr / sff)) result.z = result.z0 + sfr / sff;
 
@@ -296,7 +265,7 @@ void ComputeAltimetry(StationResult& result) {
     for (StationSighting* s : used) {
         const Zenith c = ZenithFrom(*s, result.hi, result.z);
         sff += c.f * c.f;
-        s->vz = c.angle - FoldedZenith(*s);
+        s->vz = c.angle - FoldedZenith(s->av);
         s->ez = (CosGrads(c.angle) - CosGrads(s->av)) * s->dh;
         svv += s->vz * s->vz;
     }
@@ -304,6 +273,26 @@ void ComputeAltimetry(StationResult& result) {
 }
 
 } // namespace
+
+void ResetStationOutputs(StationResult& result) {
+    result.x0 = result.y0 = result.v0Approx = kUndefined;
+    result.x = result.y = result.v0 = kUndefined;
+    result.emqX = result.emqY = result.emqV0 = result.sigma0 = kUndefined;
+    result.crossing = kUndefined;
+    result.altitudes = 0;
+    result.z0 = result.z = result.emqZ = kUndefined;
+    result.flags = 0;
+    result.status.clear();
+    for (StationSighting& s : result.sightings) {
+        s.used = false;
+        s.v0 = s.v = s.e = s.vz = s.ez = s.zi = kUndefined;
+    }
+}
+
+void FailStation(StationResult& result, int flag, const char* status) {
+    result.flags = flag;
+    result.status = status;
+}
 
 bool ApproximateOrientation(StationResult& result) {
     result.v0Approx = kUndefined;
@@ -374,7 +363,7 @@ void AdjustStation(StationResult& result) {
 }
 
 int ComputeResection(StationResult& result, bool plani, bool alti) {
-    ResetOutputs(result);
+    ResetStationOutputs(result);
     if (plani) ComputePlanimetry(result);
     if (alti) ComputeAltimetry(result);
     return result.flags;

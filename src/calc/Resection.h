@@ -62,9 +62,9 @@ enum : int {
 
 // One station and its computation.
 struct StationResult {
-    int stationIndex = -1; // the station element
-    std::string station;   // the station's name: the point that receives X, Y and Z
-    int reprise = 1;       // its occurrence, "%s (%d)"
+    int stationIndex = -1;  // the station element
+    std::string station;    // the station's name: the point that receives X, Y and Z
+    int reprise = 1;        // its occurrence, "%s (%d)"
     double hi = kUndefined; // its instrument height with its vertical offset, m
     std::vector<StationSighting> sightings;
 
@@ -74,11 +74,11 @@ struct StationResult {
     double v0Approx = kUndefined; // approximate orientation, gr
     double x = kUndefined;        // computed place, m
     double y = kUndefined;
-    double v0 = kUndefined; // computed orientation, gr, in [0, 400)
+    double v0 = kUndefined;   // computed orientation, gr, in [0, 400)
     double emqX = kUndefined; // root-mean-square errors, m and gr (four sightings or more)
     double emqY = kUndefined;
     double emqV0 = kUndefined;
-    double sigma0 = kUndefined; // root-mean-square direction residual, gr
+    double sigma0 = kUndefined;   // root-mean-square direction residual, gr
     double crossing = kUndefined; // combined: the angle between the line and the circle, gr, in [0, 100]
 
     // Altimetry.
@@ -97,7 +97,12 @@ struct StationResult {
 // measured horizontal distances and the station's place stays unknown. Returns result.flags.
 int ComputeResection(StationResult& result, bool plani, bool alti);
 
-// ---- Steps the combined method shares, once its approximate place (x0, y0) is found.
+// ---- Steps the combined method shares.
+// Every output of the result and of its sightings back to unknown, the flags and status cleared.
+void ResetStationOutputs(StationResult& result);
+// A planimetry that failed: its flag and the French text of the status line.
+void FailStation(StationResult& result, int flag, const char* status);
+// Once its approximate place (x0, y0) is found:
 // The approximate orientation from the resection sightings: each one's V0 (the bearing from the
 // approximate place to its point, less AH) brought within 200 gr of the first one's, and their mean, in
 // [0, 400). Sets result.v0Approx and each resection sighting's v0; false when no sighting gives one.

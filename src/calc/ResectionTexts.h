@@ -1,7 +1,7 @@
 #pragma once
 
 // The words of the computation of a station by resection (its place, orientation and altitude from its
-// sightings on known points): the failures of its planimetry, and those of its dialog and listing.
+// sightings on known points): the failures of its planimetry.
 // Those with %s or %d are printf formats.
 namespace pyr::resec {
 
@@ -9,6 +9,5 @@ namespace pyr::resec {
 inline constexpr const char* kMsgTooFew = "Calcul impossible : il faut au moins trois visées !";
 inline constexpr const char* kMsgAligned = "Calcul trop imprécis : les visées sont alignées";
 inline constexpr const char* kMsgCocyclic = "Calcul impossible : les points sont cocycliques !";
-inline constexpr const char* kMsgNotComputed = "Le point n'a pas pu être calculé !";
 
 } // namespace pyr::resec

@@ -19,6 +19,8 @@ inline constexpr const char* kQuestionStationInvariantXY =
 inline constexpr const char* kQuestionStationInvariantZ =
     "La station '%s' possède déjà une altitude dans\nla GéoBase. Celle-ci a été déclarée invariante.\n"
     "Voulez-vous quand même la remplacer ?";
+// A computation that failed for a reason its status line does not give.
+inline constexpr const char* kMsgNotComputed = "Le point n'a pas pu être calculé !";
 inline constexpr const char* kMsgWriteRefused = "Impossible de mettre à jour ou de créer le point !";
 inline constexpr const char* kQuestionSaveModified =
     "La GéoBase courante a été modifiée !\nVoulez vous l'enregistrer ?";

@@ -1,5 +1,6 @@
 #include "calc/StationComputation.h"
 
+#include "calc/SessionTexts.h"
 #include "calc/StationTexts.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
@@ -151,7 +152,7 @@ void CStationComputation::Recompute() {
     const int flags = Compute(m_result, Plani(), Alti());
     Warn(flags);
     if ((flags & kStationFailed) && m_frontEnd)
-        m_frontEnd->MessageBox(station::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
+        m_frontEnd->MessageBox(session::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
     if (Computed()) m_results.Keep(m_station, m_result);
     Notify(kPartResult);
 }

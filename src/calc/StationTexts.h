@@ -9,7 +9,6 @@ inline constexpr const char* kLineResection = "---> %s"; // a sighting from the 
 inline constexpr const char* kLineIntersection = "<--- %s (%d)"; // a sighting on it from another station
 inline constexpr const char* kTooltip = "%s %s : %s";
 
-inline constexpr const char* kMsgNotComputed = "Le point n'a pas pu être calculé !";
 inline constexpr const char* kMsgNoStation =
     "La GéoBase <%s> n'a aucune station qui vise des points connus en coordonnées !";
 inline constexpr const char* kMsgStationNotOffered =

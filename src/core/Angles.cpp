@@ -11,6 +11,11 @@ double WrapGrads(double grads) {
     return wrapped >= 400.0 ? 0.0 : wrapped;
 }
 
+double CentredGrads(double grads) {
+    const double w = WrapGrads(grads);
+    return w > 200.0 ? w - 400.0 : w;
+}
+
 double NearGrads(double grads, double reference) {
     double delta = WrapGrads(grads - reference);
     if (delta > 200.0) delta -= 400.0;

@@ -15,6 +15,8 @@ constexpr double RadiansToGrads(double radians) {
 
 // Into [0, 400).
 double WrapGrads(double grads);
+// A difference of directions brought within [-200, 200] gr: a misclosure or a residual.
+double CentredGrads(double grads);
 // The value plus or minus a multiple of 400 that lies within 200 gr of the reference.
 double NearGrads(double grads, double reference);
 

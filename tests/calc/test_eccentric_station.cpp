@@ -3,6 +3,7 @@
 // circle reads 0 along the bearing V0, and C, the centre that cannot be occupied, lies a few metres away.
 #include "calc/EccentricStation.h"
 #include "calc/EccentricTexts.h"
+#include "calc/SessionTexts.h"
 
 #include <array>
 #include <cmath>
@@ -190,7 +191,7 @@ TEST(EccentricStation, ReferenceJustBeyondTheStationNeverSettles) {
     r.sightings[0].x = near.x, r.sightings[0].y = near.y;
     r.sightings[0].ah = Read(near, 0.0, false).ah;
     EXPECT_EQ(ComputeEccentricStation(r, true, true), kExcentNoConvergence);
-    EXPECT_EQ(r.status, excent::kMsgNotComputed);
+    EXPECT_EQ(r.status, session::kMsgNotComputed);
     EXPECT_EQ(r.iterations, kExcentMaxIterations);
     EXPECT_EQ(r.x, kUndefined);
     EXPECT_EQ(r.v0, kUndefined);
@@ -233,7 +234,7 @@ TEST(EccentricStation, MissingDataAndDegenerateGeometryFailOrLeaveUndefinedWitho
         EccentricResult r = Job(1.6, 1.2, true);
         c.spoil(r);
         EXPECT_EQ(ComputeEccentricStation(r, true, true), c.flags) << c.what;
-        EXPECT_EQ(r.status, c.flags == kExcentComputed ? "" : excent::kMsgNotComputed) << c.what;
+        EXPECT_EQ(r.status, c.flags == kExcentComputed ? "" : session::kMsgNotComputed) << c.what;
         EXPECT_NEAR(r.x, c.flags == kExcentComputed ? kE.x : kUndefined, kTenthMm) << c.what;
         EXPECT_NEAR(r.z, c.altitude ? kE.z : kUndefined, kTenthMm) << c.what;
         ExpectAllFinite(r);

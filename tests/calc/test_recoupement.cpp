@@ -5,6 +5,7 @@
 // direction and n the unit radius where they cross.
 #include "calc/Recoupement.h"
 #include "calc/RecoupementTexts.h"
+#include "calc/SessionTexts.h"
 
 #include <cmath>
 #include <gtest/gtest.h>
@@ -202,7 +203,7 @@ TEST(Recoupement, ChoiceOfThePlace) {
             EXPECT_NEAR(r.y0, kSt.y, kTenthMm);
         } else {
             EXPECT_EQ(r.flags, kStationFailed);
-            EXPECT_EQ(r.status, recoup::kMsgNotComputed);
+            EXPECT_EQ(r.status, session::kMsgNotComputed);
             EXPECT_EQ(r.x, kUndefined);
             EXPECT_NEAR(r.z, kSt.z, kTenthMm); // from the measured distances
         }
@@ -236,7 +237,7 @@ TEST(Recoupement, TooFewOrDegenerateSightings) {
     for (Case& c : cases) {
         StationResult& r = c.job;
         EXPECT_EQ(ComputeRecoupement(r, true, true), c.flags) << r.sightings.size();
-        EXPECT_EQ(r.status, c.flags == kStationTooFew ? recoup::kMsgTooFew : recoup::kMsgNotComputed);
+        EXPECT_EQ(r.status, c.flags == kStationTooFew ? recoup::kMsgTooFew : session::kMsgNotComputed);
         EXPECT_TRUE(r.x0 == kUndefined && r.x == kUndefined);
         // The altimetry goes on from the measured distances.
         EXPECT_TRUE(r.altitudes == 0 || std::fabs(r.z - kSt.z) < kTenthMm) << r.z;

@@ -18,10 +18,13 @@ TEST(Angles, WrapIntoOneTurn) {
     EXPECT_LT(WrapGrads(-1e-14), 400.0);
 }
 
-TEST(Angles, NearBringsWithinHalfATurnOfTheReference) {
+TEST(Angles, NearAndCentredBringWithinHalfATurn) {
     EXPECT_EQ(NearGrads(399.0, 1.0), -1.0);
     EXPECT_EQ(NearGrads(1.0, 399.0), 401.0);
     EXPECT_EQ(NearGrads(150.0, 100.0), 150.0);
+    EXPECT_EQ(CentredGrads(399.5), -0.5); // a misclosure across the zero of the circle
+    EXPECT_EQ(CentredGrads(-600.25), -200.25 + 400.0);
+    EXPECT_EQ(CentredGrads(200.0), 200.0);
 }
 
 TEST(Angles, SinesAndCosinesOfQuarterTurnsAreExact) {
