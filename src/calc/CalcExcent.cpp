@@ -29,41 +29,13 @@ bool IsSighting(int kind) {
 } // namespace
 
 CCalcExcent::CCalcExcent()
-    : CSightingComputation(
-          {{kJournalEccentric, session::kQuestionStationInvariantXY, session::kQuestionStationInvariantZ},
-           "Calcul Station exc",
-           ListingKind::EccentricStation}) {}
-
-std::string CCalcExcent::Caption() const {
-    return m_station.empty() ? Inputs().title : Sprintf(excent::kCaption, m_result.station.c_str());
-}
-
-// ---- Opening ---------------------------------------------------------------------------------------------
-
-bool CCalcExcent::Open(ui::FrontEnd& frontEnd) {
-    if (!OpenSession(frontEnd)) return false;
-    // The sightings arrive as the instrument would have read them without its constants, with their
-    // targets' heights and offsets.
-    SightingReductionOptions& reduction = m_session.Reduction();
-    reduction.instrumentConstants = true;
-    reduction.targetHeights = true;
-    FindStations();
-    if (m_stations.Empty()) {
-        frontEnd.MessageBox(Sprintf(excent::kMsgNoStation, m_session.Path().c_str()), ui::kCaption,
-                            ui::kIconWarning);
-        return false;
-    }
-    Notify(kPartSubject | kPartSwitches);
-    return true;
-}
-
-// Every station occurrence that sights a known point with a distance, in GéoBase order.
-void CCalcExcent::FindStations() {
-    const CCarnet& carnet = m_session.Carnet();
-    m_stations.Clear();
-    for (int i = carnet.Find(kKindStation, ""); i >= 0; i = carnet.Find(kKindStation, "", i + 1))
-        if (!CandidatesOf(i).empty()) m_stations.Offer(PlaceOf(i));
-}
+    : CStationComputation(
+          {{{kJournalEccentric, session::kQuestionStationInvariantXY, session::kQuestionStationInvariantZ},
+            "Calcul Station exc",
+            ListingKind::EccentricStation},
+           excent::kCaption,
+           excent::kMsgNoStation,
+           excent::kMsgStationNotOffered}) {}
 
 // The station's sightings, up to the next station, on points with X and Y with a zenith angle and a
 // distance: each point once, by its first such sighting.
@@ -86,34 +58,8 @@ std::vector<CCalcExcent::Candidate> CCalcExcent::CandidatesOf(int stationIndex) 
     return candidates;
 }
 
-std::vector<CCalcExcent::Line> CCalcExcent::LinesOf(int stationIndex, const std::string& centre) {
-    const CCarnet& carnet = m_session.Carnet();
-    const std::string station = PlaceOf(stationIndex).name;
-    std::vector<Line> lines;
-    for (int i = stationIndex + 1; i < carnet.GetSize(); ++i) {
-        const int kind = carnet.GetType(i);
-        if (kind == kKindStation) break;
-        if (!IsSighting(kind)) continue;
-        const std::string mat = carnet.matAt(i);
-        if (mat.empty() || mat == station || mat == centre || !carnet.hasXY(mat)) continue;
-        lines.push_back(
-            {i, stationIndex, Sprintf(station::kLineResection, mat.c_str()),
-             Sprintf(station::kTooltip, carnet.cmdAt(i).c_str(), mat.c_str(), carnet.parAt(i).c_str())});
-    }
-    return lines;
-}
-
-bool CCalcExcent::ChooseStation(std::string_view designation) {
-    const int index = m_stations.Find(designation);
-    if (index < 0) {
-        if (m_frontEnd)
-            m_frontEnd->MessageBox(Sprintf(excent::kMsgStationNotOffered, std::string(designation).c_str()),
-                                   ui::kCaption, ui::kIconWarning);
-        return false;
-    }
-    m_stationIndex = index;
-    m_station = CStationChoice::ShownAs(PlaceOf(index));
-    m_centres = CandidatesOf(index);
+void CCalcExcent::StationChosen() {
+    m_centres = CandidatesOf(StationIndex());
     m_centreNames.clear();
     for (const Candidate& candidate : m_centres)
         m_centreNames.push_back(candidate.mat);
@@ -121,23 +67,22 @@ bool CCalcExcent::ChooseStation(std::string_view designation) {
     // from a point it cannot occupy, while its reference points lie much farther away.
     const auto nearest = std::min_element(m_centres.begin(), m_centres.end(),
                                           [](const Candidate& a, const Candidate& b) { return a.di < b.di; });
-    Notify(kPartCaption);
-    return ChooseCentre(nearest->mat);
+    ChooseCentre(nearest->mat);
 }
 
 bool CCalcExcent::ChooseCentre(std::string_view mat) {
     const auto found = std::find(m_centreNames.begin(), m_centreNames.end(), mat);
     if (found == m_centreNames.end()) {
         if (m_frontEnd)
-            m_frontEnd->MessageBox(Sprintf(excent::kMsgCentreNotSighted, std::string(mat).c_str(),
-                                           m_station.empty() ? "" : m_station.c_str()),
-                                   ui::kCaption, ui::kIconWarning);
+            m_frontEnd->MessageBox(
+                Sprintf(excent::kMsgCentreNotSighted, std::string(mat).c_str(), Station().c_str()),
+                ui::kCaption, ui::kIconWarning);
         return false;
     }
     m_centre = static_cast<int>(found - m_centreNames.begin());
     m_result = EccentricResult();
     m_result.centre = *found;
-    m_lists.Fill(LinesOf(m_stationIndex, *found));
+    m_lists.Fill(SightingsOnKnownPoints(StationIndex(), *found));
     Notify(kPartCentre);
     Moved(true);
     return true;
@@ -174,7 +119,7 @@ void CCalcExcent::GatherCentre() {
     const CCarnet& carnet = m_session.Carnet();
     const Candidate& centre = m_centres[static_cast<std::size_t>(m_centre)];
     const ReducedSighting reduced =
-        ReduceSighting(carnet, PlaceOf(m_stationIndex), centre.index, m_session.Reduction());
+        ReduceSighting(carnet, PlaceOf(StationIndex()), centre.index, m_session.Reduction());
     m_result.centre = centre.mat;
     m_result.hpC = reduced.hp;
     m_result.ahC = reduced.ah, m_result.avC = reduced.av, m_result.diC = reduced.di;
@@ -194,12 +139,12 @@ void CCalcExcent::Recompute() {
     const std::string centre = m_result.centre;
     m_result = EccentricResult();
     m_result.centre = centre;
-    if (m_stationIndex < 0 || m_centre < 0) {
+    if (StationIndex() < 0 || m_centre < 0) {
         Notify(kPartResult);
         return;
     }
-    const StationPlace& place = PlaceOf(m_stationIndex);
-    m_result.stationIndex = m_stationIndex;
+    const StationPlace& place = PlaceOf(StationIndex());
+    m_result.stationIndex = StationIndex();
     m_result.station = place.name;
     m_result.reprise = place.reprise;
     m_result.hi = place.hi;
@@ -214,7 +159,7 @@ void CCalcExcent::Recompute() {
     const int flags = ComputeEccentricStation(m_result, Plani(), Alti());
     if ((flags & (kExcentIncomplete | kExcentNoConvergence)) && m_frontEnd)
         m_frontEnd->MessageBox(session::kMsgNotComputed, ui::kCaption, ui::kIconWarning);
-    if (Computed()) m_results.Keep(m_station, m_result);
+    if (Computed()) m_results.Keep(Station(), m_result);
     Notify(kPartResult);
 }
 
@@ -252,10 +197,8 @@ void CCalcExcent::WriteResult(CDlgCfgListing& listing, std::size_t index) const 
 
 // ---- Writing ---------------------------------------------------------------------------------------------
 
-bool CCalcExcent::WriteStation() {
-    if (!CanWrite() || m_stationIndex < 0) return false;
-    return CSightingComputation::WriteStation(m_stationIndex, m_result.x, m_result.y, m_result.z,
-                                              m_result.v0);
+bool CCalcExcent::Write() {
+    return WriteStation(m_result.x, m_result.y, m_result.z, m_result.v0);
 }
 
 } // namespace pyr

@@ -1,8 +1,7 @@
 #pragma once
 
 #include "calc/EccentricStation.h"
-#include "calc/SightingComputation.h"
-#include "calc/StationChoice.h"
+#include "calc/StationComputation.h"
 
 #include <string>
 #include <string_view>
@@ -17,25 +16,9 @@ namespace pyr {
 // reference sightings ("---> P") in the two lists. Its switches are kept in the section
 // "Calcul Station exc"; its result is written into the GéoBase: the station's point receives X, Y and Z,
 // the station its V0.
-class CCalcExcent : public CSightingComputation {
+class CCalcExcent : public CStationComputation {
 public:
     CCalcExcent();
-
-    std::string Caption() const override;
-
-    // ---- Opening
-    // Offers the last GéoBase, loads it, reads the options and lists the stations that sight a known
-    // point with a distance. False, a message having said why, when there is none or no GéoBase could
-    // be read.
-    bool Open(ui::FrontEnd& frontEnd);
-
-    // ---- The combo of the stations: "S1 (1)", "S1 (2)"...
-    const std::vector<std::string>& Stations() const { return m_stations.Shown(); }
-    // Chooses a station by its name, "NOM" (its first occurrence offered) or "NOM(2)" / "NOM (2)": its
-    // candidates for the centre fill the centre's combo and the nearest is chosen. False, with a
-    // message, for a station that is not offered.
-    bool ChooseStation(std::string_view designation);
-    const std::string& Station() const { return m_station; }
 
     // ---- The combo of the centre: the known points the station sights with a distance.
     const std::vector<std::string>& Centres() const { return m_centreNames; }
@@ -48,12 +31,12 @@ public:
     bool SelectReferences(std::string_view selection);
 
     // ---- Enabling rules
-    bool CanWrite() const;  // the computed X and Y, or Z
-    bool CanFinish() const; // a reference in the two lists, beside the sighting on the centre
+    bool CanWrite() const override;  // the computed X and Y, or Z
+    bool CanFinish() const override; // a reference in the two lists, beside the sighting on the centre
 
     // ---- The result of the chosen station
     const EccentricResult& Result() const { return m_result; }
-    const std::string& Status() const { return m_result.status; }
+    const std::string& Status() const override { return m_result.status; }
     // The fields, with the GéoBase's decimals; "" when unknown.
     std::string XText() const;
     std::string YText() const;
@@ -64,11 +47,9 @@ public:
     // The stations computed since the dialog opened, in the order of their first computation.
     const std::vector<EccentricResult>& Results() const { return m_results.All(); }
 
-    // ---- Writing
     // Writes the station's computed point (X and Y, Z) and its V0 into the GéoBase (not saved yet),
-    // asking before invariant coordinates are replaced. False when there is nothing to write or the
-    // GéoBase refused it.
-    bool WriteStation();
+    // asking before invariant coordinates are replaced.
+    bool Write() override;
 
 private:
     // A candidate for the centre: a sighting with a distance on a known point.
@@ -78,19 +59,16 @@ private:
         double di;       // its slope distance as read, m
     };
 
+    bool Offers(int stationIndex) override { return !CandidatesOf(stationIndex).empty(); }
+    // Its candidates for the centre fill the centre's combo, and the nearest is chosen.
+    void StationChosen() override;
     void Recompute() override;
     std::size_t ResultCount() const override { return m_results.All().size(); }
     void WriteResult(CDlgCfgListing& listing, std::size_t index) const override;
-    void FindStations();
     std::vector<Candidate> CandidatesOf(int stationIndex);
-    // The reference lines of the station: its sightings on known points other than the centre.
-    std::vector<Line> LinesOf(int stationIndex, const std::string& centre);
     EccentricSighting Gather(const Line& line);
     void GatherCentre();
 
-    CStationChoice m_stations;
-    std::string m_station;
-    int m_stationIndex = -1;
     std::vector<Candidate> m_centres;
     std::vector<std::string> m_centreNames;
     int m_centre = -1; // the candidate chosen

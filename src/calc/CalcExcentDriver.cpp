@@ -22,15 +22,7 @@ constexpr const char* kHelpCentre =
     "le point connu, visé avec une distance, à côté duquel la station est faite";
 constexpr const char* kHelpReferences =
     "les points d'appui dont les visées sont prises (par défaut tous ceux que vise la station)";
-constexpr const char* kHelpPlani =
-    "calculer la planimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
-constexpr const char* kHelpAlti = "calculer l'altimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
 constexpr const char* kHelpSave = "écrire la station calculée (point et V0) dans la GéoBase et l'enregistrer";
-
-// A field of the dialog as the text window shows it: "-" when it is empty.
-std::string Dashed(const std::string& text) {
-    return text.empty() ? std::string("-") : text;
-}
 
 } // namespace
 
@@ -48,8 +40,7 @@ void CCalcExcentDriver::DeclareOptions(ui::DialogOptions& options) {
         m_requests.references = selection;
         return std::string();
     });
-    options.ZeroOrOne("plani", kHelpPlani, [this](bool on) { m_requests.plani = on; });
-    options.ZeroOrOne("alti", kHelpAlti, [this](bool on) { m_requests.alti = on; });
+    DeclareSwitchOptions(options, m_requests.computation);
     DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
@@ -110,21 +101,12 @@ bool CCalcExcentDriver::ComputeStation(ui::FrontEnd& frontEnd) {
     // A station is computed when its planimetry is, or its altitude when only the altimetry is asked.
     const EccentricResult& result = m_model.Result();
     if (m_model.Plani() ? !(result.flags & kExcentComputed) : !IsKnown(result.z)) return false;
-    return !m_requests.computation.save || m_model.WriteStation();
+    return !m_requests.computation.save || m_model.Write();
 }
 
 ui::DialogResult CCalcExcentDriver::Run(ui::FrontEnd& frontEnd) {
-    m_model.SetInputs(Inputs());
-    if (GeoBaseNamed()) m_model.SetGeoBase(GeoBase());
-    if (!m_model.Open(frontEnd))
-        return m_model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
-    if (m_requests.plani) m_model.SetPlani(*m_requests.plani);
-    if (m_requests.alti) m_model.SetAlti(*m_requests.alti);
-    bool ok = ComputeStation(frontEnd);
-    // "--enregistrer" saves without the question of the closing.
-    if (m_requests.computation.save && m_model.Modified() && !m_model.Save()) ok = false;
-    m_model.Close(m_requests.computation.listing, m_requests.computation.listingPath);
-    return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+    return RunComputation(*this, m_model, frontEnd, m_requests.computation,
+                          [&] { return ComputeStation(frontEnd); });
 }
 
 std::unique_ptr<ui::Form> CCalcExcentDriver::MakeForm() {

@@ -34,7 +34,6 @@ private:
         std::optional<std::string> station;
         std::optional<std::string> centre;
         std::optional<std::string> references;
-        std::optional<bool> plani, alti;
         ComputationRequests computation;
     } m_requests;
 };

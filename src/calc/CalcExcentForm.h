@@ -2,6 +2,7 @@
 
 #include "calc/CalcExcent.h"
 #include "calc/SightingComputationForm.h"
+#include "calc/StationTexts.h"
 
 namespace pyr {
 
@@ -16,20 +17,11 @@ public:
     enum Own : int { kLabelCentre = kFirstOwn, kCentre };
 
     CCalcExcentForm(const ui::DialogModel& dialog, CCalcExcent& model)
-        : CSightingComputationForm(dialog, model), m_model(model) {}
+        : CSightingComputationForm(dialog, model, station::kLabelStation, station::kLabelWrite),
+          m_model(model) {}
 
 private:
-    bool OpenModel(ui::FrontEnd& frontEnd) override { return m_model.Open(frontEnd); }
-    const char* SubjectLabel() const override { return "&Station :"; }
-    const char* WriteLabel() const override { return "É&crire la station"; }
-    std::vector<std::string> Subjects() const override { return m_model.Stations(); }
-    std::string Subject() const override { return m_model.Station(); }
-    bool ChooseSubject(const std::string& subject) override { return m_model.ChooseStation(subject); }
     std::vector<ResultLine> ResultLines() const override;
-    std::string Status() const override { return m_model.Status(); }
-    bool CanWrite() const override { return m_model.CanWrite(); }
-    bool Write() override { return m_model.WriteStation(); }
-    bool CanFinish() const override { return m_model.CanFinish(); }
     void AddOwnControls(std::vector<ui::Control>& controls) const override;
     ui::ControlState OwnState(int id) const override;
     void OwnAct(ui::FrontEnd& frontEnd, int id, const ui::Event& event) override;

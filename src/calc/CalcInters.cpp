@@ -34,9 +34,7 @@ std::string CCalcInters::Caption() const {
 
 bool CCalcInters::Open(ui::FrontEnd& frontEnd) {
     if (!OpenSession(frontEnd)) return false;
-    SightingReductionOptions& reduction = m_session.Reduction();
-    reduction.instrumentConstants = true;
-    reduction.targetHeights =
+    m_session.Reduction().targetHeights =
         ReadOptionSwitch(m_session.ParamPath(), kSectionCalculations, kKeyTargetHeights);
     FindPoints();
     if (m_points.empty()) {

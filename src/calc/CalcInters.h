@@ -21,10 +21,7 @@ public:
 
     std::string Caption() const override;
 
-    // ---- Opening
-    // Offers the last GéoBase, loads it, reads the options and lists the points that can be computed.
-    // False, a message having said why, when there is none or no GéoBase could be read.
-    bool Open(ui::FrontEnd& frontEnd);
+    bool Open(ui::FrontEnd& frontEnd) override;
 
     // ---- The combo
     const std::vector<std::string>& Points() const { return m_points; }
@@ -32,17 +29,20 @@ public:
     // with a message, for a point that is not in the combo.
     bool ChoosePoint(std::string_view mat);
     const std::string& Point() const { return m_point; }
+    const std::vector<std::string>& Subjects() const override { return m_points; }
+    const std::string& Subject() const override { return m_point; }
+    bool ChooseSubject(std::string_view mat) override { return ChoosePoint(mat); }
     // Takes exactly the sightings of the stations a selection names (their names, every set-up); false
     // when it names none of them.
     bool SelectStations(std::string_view selection);
 
     // ---- Enabling rules
-    bool CanWrite() const;  // the computed X and Y, or Z
-    bool CanFinish() const; // two sightings at least in the two lists
+    bool CanWrite() const override;  // the computed X and Y, or Z
+    bool CanFinish() const override; // two sightings at least in the two lists
 
     // ---- The result of the chosen point
     const InterResult& Result() const { return m_result; }
-    const std::string& Status() const { return m_result.status; }
+    const std::string& Status() const override { return m_result.status; }
     // The fields, with the GéoBase's decimals; "" when unknown.
     std::string XText() const;
     std::string YText() const;
@@ -59,6 +59,7 @@ public:
     // Writes the chosen point's computed coordinates into the GéoBase (not saved yet). False when there
     // is nothing to write or the GéoBase refused it.
     bool WritePoint();
+    bool Write() override { return WritePoint(); }
 
 private:
     void Recompute() override;

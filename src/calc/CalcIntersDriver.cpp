@@ -19,19 +19,7 @@ constexpr const char* kHelpPoint = "le point à calculer (à répéter : chaque 
 constexpr const char* kHelpPoints = "tous les points calculables de la sélection (100-150, P1 P7 ...)";
 constexpr const char* kHelpStations = "les stations dont les visées sont prises (par défaut toutes les "
                                       "stations orientées qui visent le point)";
-constexpr const char* kHelpPlani =
-    "calculer la planimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
-constexpr const char* kHelpAlti = "calculer l'altimétrie (1) ou non (0) ; par défaut, comme la dernière fois";
 constexpr const char* kHelpSave = "écrire chaque point calculé dans la GéoBase et l'enregistrer";
-
-std::string Shown(const std::string& text) {
-    return text.empty() ? std::string("-") : text;
-}
-
-// A linear residual to the tenth of a millimetre, a zero without its sign.
-std::string Metres(double metres) {
-    return IsKnown(metres) ? FormatFixedShown(metres, 4) : std::string("-");
-}
 
 } // namespace
 
@@ -53,8 +41,7 @@ void CCalcIntersDriver::DeclareOptions(ui::DialogOptions& options) {
         m_requests.stations = selection;
         return std::string();
     });
-    options.ZeroOrOne("plani", kHelpPlani, [this](bool on) { m_requests.plani = on; });
-    options.ZeroOrOne("alti", kHelpAlti, [this](bool on) { m_requests.alti = on; });
+    DeclareSwitchOptions(options, m_requests.computation);
     DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
@@ -67,18 +54,18 @@ void CCalcIntersDriver::Print(ui::FrontEnd& frontEnd) {
     if (IsKnown(result.x)) {
         const bool swap = CPointGen::SwapXY();
         const std::string x = m_model.XText(), y = m_model.YText();
-        const std::string emqX = Shown(m_model.EmqXText()), emqY = Shown(m_model.EmqYText());
+        const std::string emqX = Dashed(m_model.EmqXText()), emqY = Dashed(m_model.EmqYText());
         txt.Print(inters::kLinePoint, mat, swap ? inters::kLabelY : inters::kLabelX, (swap ? y : x).c_str(),
                   swap ? inters::kLabelX : inters::kLabelY, (swap ? x : y).c_str(), swap ? "Y" : "X",
                   (swap ? emqY : emqX).c_str(), swap ? "X" : "Y", (swap ? emqX : emqY).c_str());
     }
     if (IsKnown(result.z))
-        txt.Print(inters::kLineAltitude, mat, m_model.ZText().c_str(), Shown(m_model.EmqZText()).c_str(),
+        txt.Print(inters::kLineAltitude, mat, m_model.ZText().c_str(), Dashed(m_model.EmqZText()).c_str(),
                   result.altitudes);
     for (const InterSighting& s : result.sightings)
         txt.Print(inters::kLineSighting, StationPlace{-1, s.station, s.reprise}.Designation().c_str(),
-                  Milligrads(s.v).c_str(), Metres(s.e).c_str(), Milligrads(s.vz).c_str(),
-                  Metres(s.ez).c_str());
+                  Milligrads(s.v).c_str(), DashedMetres(s.e).c_str(), Milligrads(s.vz).c_str(),
+                  DashedMetres(s.ez).c_str());
 }
 
 bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& mat) {
@@ -101,13 +88,12 @@ bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& 
 }
 
 ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
-    m_model.SetInputs(Inputs());
-    if (GeoBaseNamed()) m_model.SetGeoBase(GeoBase());
-    if (!m_model.Open(frontEnd))
-        return m_model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
-    if (m_requests.plani) m_model.SetPlani(*m_requests.plani);
-    if (m_requests.alti) m_model.SetAlti(*m_requests.alti);
+    return RunComputation(*this, m_model, frontEnd, m_requests.computation,
+                          [&] { return ComputePoints(frontEnd); });
+}
 
+// Every point asked, by name or by selection, computed in turn.
+bool CCalcIntersDriver::ComputePoints(ui::FrontEnd& frontEnd) {
     std::vector<std::string> asked = m_requests.points;
     bool ok = true;
     if (m_requests.selection) {
@@ -127,10 +113,7 @@ ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
     }
     for (const std::string& mat : asked)
         ok = ComputePoint(frontEnd, mat) && ok;
-    // "--enregistrer" saves without the question of the closing.
-    if (m_requests.computation.save && m_model.Modified() && !m_model.Save()) ok = false;
-    m_model.Close(m_requests.computation.listing, m_requests.computation.listingPath);
-    return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+    return ok;
 }
 
 std::unique_ptr<ui::Form> CCalcIntersDriver::MakeForm() {

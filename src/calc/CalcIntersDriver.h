@@ -26,6 +26,7 @@ public:
     std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
+    bool ComputePoints(ui::FrontEnd& frontEnd);
     bool ComputePoint(ui::FrontEnd& frontEnd, const std::string& mat);
     void Print(ui::FrontEnd& frontEnd);
 
@@ -34,7 +35,6 @@ private:
         std::vector<std::string> points;
         std::optional<std::string> selection;
         std::optional<std::string> stations;
-        std::optional<bool> plani, alti;
         ComputationRequests computation;
     } m_requests;
 };

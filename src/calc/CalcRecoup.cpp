@@ -4,18 +4,21 @@
 #include "calc/RecoupementTexts.h"
 #include "calc/SessionTexts.h"
 #include "calc/StationListing.h"
+#include "calc/StationTexts.h"
 #include "settings/Journal.h"
 #include "ui/FrontEnd.h"
 
 namespace pyr {
 
 CCalcRecoup::CCalcRecoup()
-    : CStationComputation(
+    : CResectionComputation(
           {{{kJournalRecoupement, session::kQuestionStationInvariantXY, session::kQuestionStationInvariantZ},
             "Calcul Recoupement",
             ListingKind::Recoupement},
            "Calcul de la station %s par recoupement",
-           true}) {}
+           station::kMsgNoStation,
+           station::kMsgStationNotOffered},
+          true) {}
 
 int CCalcRecoup::Compute(StationResult& result, bool plani, bool alti) const {
     return ComputeRecoupement(result, plani, alti);

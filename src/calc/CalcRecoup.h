@@ -1,13 +1,13 @@
 #pragma once
 
-#include "calc/StationComputation.h"
+#include "calc/ResectionComputation.h"
 
 namespace pyr {
 
 // The dialog "Calcul de la station %s par recoupement": a station occurrence placed, oriented and given
 // its altitude by its sightings on known points and the sightings taken on it from other stations
 // already placed and oriented. Its switches are kept in the section "Calcul Recoupement".
-class CCalcRecoup : public CStationComputation {
+class CCalcRecoup : public CResectionComputation {
 public:
     CCalcRecoup();
 

@@ -3,18 +3,21 @@
 #include "calc/ResectionTexts.h"
 #include "calc/SessionTexts.h"
 #include "calc/StationListing.h"
+#include "calc/StationTexts.h"
 #include "settings/Journal.h"
 #include "ui/FrontEnd.h"
 
 namespace pyr {
 
 CCalcRelev::CCalcRelev()
-    : CStationComputation(
+    : CResectionComputation(
           {{{kJournalResection, session::kQuestionStationInvariantXY, session::kQuestionStationInvariantZ},
             "Calcul Relevement",
             ListingKind::Resection},
            "Calcul de la station %s par relèvement",
-           false}) {}
+           station::kMsgNoStation,
+           station::kMsgStationNotOffered},
+          false) {}
 
 int CCalcRelev::Compute(StationResult& result, bool plani, bool alti) const {
     return ComputeResection(result, plani, alti);

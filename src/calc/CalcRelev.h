@@ -1,13 +1,13 @@
 #pragma once
 
-#include "calc/StationComputation.h"
+#include "calc/ResectionComputation.h"
 
 namespace pyr {
 
 // The dialog "Calcul de la station %s par relèvement": a station occurrence placed, oriented and given
 // its altitude by its sightings on three or more known points. Its switches are kept in the section
 // "Calcul Relevement".
-class CCalcRelev : public CStationComputation {
+class CCalcRelev : public CResectionComputation {
 public:
     CCalcRelev();
 

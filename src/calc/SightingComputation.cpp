@@ -15,7 +15,10 @@ bool CSightingComputation::OpenSession(ui::FrontEnd& frontEnd) {
     ReadParamInt(path, m_words.section, kKeyCalculPlani, 1, 0, 1, plani);
     ReadParamInt(path, m_words.section, kKeyCalculAlti, 1, 0, 1, alti);
     m_plani = plani != 0, m_alti = alti != 0;
-    return m_session.Open(frontEnd, *this);
+    if (!m_session.Open(frontEnd, *this)) return false;
+    // The sightings arrive as the instrument would have read them without its constants.
+    m_session.Reduction().instrumentConstants = true;
+    return true;
 }
 
 std::string CSightingComputation::Close(bool listingAsked, std::string listingPath) {
@@ -67,7 +70,7 @@ const StationPlace& CSightingComputation::PlaceOf(int station) {
     return found->second;
 }
 
-bool CSightingComputation::WriteStation(int stationIndex, double x, double y, double z, double v0) {
+bool CSightingComputation::WriteStationAt(int stationIndex, double x, double y, double z, double v0) {
     const StationPlace place = PlaceOf(stationIndex);
     bool written = m_session.WritePoint(place.name, x, y, z);
     if (written && IsKnown(v0)) written = m_session.WriteStationV0(stationIndex, place.Designation(), v0);

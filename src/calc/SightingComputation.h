@@ -7,6 +7,7 @@
 
 #include <cstddef>
 #include <string>
+#include <string_view>
 #include <unordered_map>
 #include <utility>
 #include <vector>
@@ -43,6 +44,24 @@ public:
     };
 
     using Line = CSightingLists::Line;
+
+    // ---- What each computation gives its window and its command line
+    // Offers the last GéoBase, loads it, reads the options and lists the subjects that can be computed.
+    // False, a message having said why, when there is none or no GéoBase could be read.
+    virtual bool Open(ui::FrontEnd& frontEnd) = 0;
+    // The points or stations that can be computed, the one chosen, and the choice of one by its name:
+    // false, with a message, for a name that is not offered.
+    virtual const std::vector<std::string>& Subjects() const = 0;
+    virtual const std::string& Subject() const = 0;
+    virtual bool ChooseSubject(std::string_view name) = 0;
+    // The status line: why the last computation failed, "" otherwise.
+    virtual const std::string& Status() const = 0;
+    // Whether there is a result to write, and its writing into the GéoBase (not saved yet): false when
+    // there is nothing to write or the GéoBase refused it.
+    virtual bool CanWrite() const = 0;
+    virtual bool Write() = 0;
+    // Whether "Fin + Listing" may end the dialog: enough lines in the two lists together.
+    virtual bool CanFinish() const = 0;
 
     bool Cancelled() const { return m_session.Cancelled(); }
     // Leaves the dialog: the switches are kept, a modified GéoBase is offered to be saved, the listing of
@@ -86,8 +105,8 @@ public:
 protected:
     explicit CSightingComputation(ComputationWords words);
 
-    // Reads the switches and opens the session (ComputationSession.h). False, a message having said why,
-    // when no GéoBase could be read.
+    // Reads the switches and opens the session (ComputationSession.h), the sightings reduced with the
+    // instrument's constants. False, a message having said why, when no GéoBase could be read.
     bool OpenSession(ui::FrontEnd& frontEnd);
     // The subject computed again from the sightings taken; notifies kPartResult.
     virtual void Recompute() = 0;
@@ -104,7 +123,7 @@ protected:
     // Writes a computed station into the GéoBase (not saved yet): its point receives X and Y, Z (any of
     // them kUndefined is left alone; invariant ones are replaced only when the person agrees), the station
     // its V0 when known. False when the GéoBase refused it.
-    bool WriteStation(int stationIndex, double x, double y, double z, double v0);
+    bool WriteStationAt(int stationIndex, double x, double y, double z, double v0);
     // A value with that many decimals, "" when unknown.
     static std::string Shown(double value, int decimals);
 

@@ -39,7 +39,7 @@ std::vector<ui::Control> CSightingComputationForm::Controls() const {
     // a frame: a value and its EMQ on each line.
     using K = ControlKind;
     std::vector<Control> controls{
-        Ctl(kLabelSubject, K::Label, "etiquetteSujet", SubjectLabel()).Buddy(kSubject),
+        Ctl(kLabelSubject, K::Label, "etiquetteSujet", m_subjectLabel).Buddy(kSubject),
         Ctl(kSubject, K::EditCombo, "sujet").At(0, 1).Width(12),
         Ctl(kLabelAvailable, K::Label, "etiquetteDisponibles", "Visées &disponibles :")
             .At(1, 0, 1, 2)
@@ -76,7 +76,7 @@ std::vector<ui::Control> CSightingComputationForm::Controls() const {
         ++row;
     }
     controls.push_back(Ctl(kStatus, K::Status, "etat").At(8, 0, 1, 5));
-    controls.push_back(Ctl(kWrite, K::Button, "ecrire", WriteLabel()).At(9, 0, 1, 2));
+    controls.push_back(Ctl(kWrite, K::Button, "ecrire", m_writeLabel).At(9, 0, 1, 2));
     controls.push_back(Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow).Default());
     controls.push_back(Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 1));
     AddOwnControls(controls);
@@ -86,7 +86,7 @@ std::vector<ui::Control> CSightingComputationForm::Controls() const {
 bool CSightingComputationForm::Open(ui::FrontEnd& frontEnd) {
     m_model.SetInputs(m_dialog.Inputs());
     if (m_dialog.GeoBaseNamed()) m_model.SetGeoBase(m_dialog.GeoBase());
-    if (OpenModel(frontEnd)) return true;
+    if (m_model.Open(frontEnd)) return true;
     // No GéoBase chosen is a cancel; any other refusal was told by a message.
     End(m_model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed);
     return false;
@@ -96,8 +96,8 @@ ui::ControlState CSightingComputationForm::State(int id) const {
     ui::ControlState state;
     switch (id) {
     case kSubject: {
-        state.items = Subjects();
-        state.text = Subject();
+        state.items = m_model.Subjects();
+        state.text = m_model.Subject();
         const auto found = std::find(state.items.begin(), state.items.end(), state.text);
         if (!state.text.empty() && found != state.items.end())
             state.current = static_cast<int>(found - state.items.begin());
@@ -132,13 +132,13 @@ ui::ControlState CSightingComputationForm::State(int id) const {
         state.checked = m_model.Alti();
         return state;
     case kStatus:
-        state.text = Status();
+        state.text = m_model.Status();
         return state;
     case kWrite:
-        state.enabled = CanWrite();
+        state.enabled = m_model.CanWrite();
         return state;
     case ui::kIdOk:
-        state.enabled = CanFinish();
+        state.enabled = m_model.CanFinish();
         return state;
     default:
         break;
@@ -166,14 +166,14 @@ ui::ControlState CSightingComputationForm::State(int id) const {
 }
 
 void CSightingComputationForm::Moved() {
-    if (CanFinish()) Focus(ui::kIdOk);
+    if (m_model.CanFinish()) Focus(ui::kIdOk);
 }
 
 void CSightingComputationForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event) {
     using ui::EventKind;
     switch (id) {
     case kSubject: {
-        const std::vector<std::string> subjects = Subjects();
+        const std::vector<std::string>& subjects = m_model.Subjects();
         std::string subject;
         if (event.kind == EventKind::Select && event.rank >= 0 &&
             event.rank < static_cast<int>(subjects.size()))
@@ -181,8 +181,8 @@ void CSightingComputationForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Eve
         else if (event.kind == EventKind::Text)
             subject = Trimmed(event.text);
         // The subject shown again keeps the sightings taken.
-        if (subject.empty() || subject == Subject()) return;
-        if (ChooseSubject(subject)) Focus(kAvailable);
+        if (subject.empty() || subject == m_model.Subject()) return;
+        if (m_model.ChooseSubject(subject)) Focus(kAvailable);
         return;
     }
     case kAvailable:
@@ -220,10 +220,10 @@ void CSightingComputationForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Eve
         if (event.kind == EventKind::Check) m_model.SetAlti(event.on);
         return;
     case kWrite:
-        if (CanWrite() && Write()) m_written = true;
+        if (m_model.CanWrite() && m_model.Write()) m_written = true;
         return;
     case ui::kIdOk:
-        if (!CanFinish()) return;
+        if (!m_model.CanFinish()) return;
         m_model.FinishWithListing();
         End(ui::DialogResult::Ok);
         return;

@@ -48,9 +48,11 @@ public:
     void Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event) override;
 
 protected:
-    // `dialog` gives the command's inputs when the window opens; `model` is the dialog shown.
-    CSightingComputationForm(const ui::DialogModel& dialog, CSightingComputation& model)
-        : m_dialog(dialog), m_model(model) {}
+    // `dialog` gives the command's inputs when the window opens; `model` is the dialog shown. The
+    // labels name the subject ("&Point :") and the writing ("É&crire le point").
+    CSightingComputationForm(const ui::DialogModel& dialog, CSightingComputation& model,
+                             const char* subjectLabel, const char* writeLabel)
+        : m_dialog(dialog), m_model(model), m_subjectLabel(subjectLabel), m_writeLabel(writeLabel) {}
 
     // One line of the results: its label ("X =") and name, its value and its error ("" when unknown);
     // a line without `emq` has no error field.
@@ -62,20 +64,9 @@ protected:
         bool withEmq = true;
     };
 
-    // ---- What each computation says
-    virtual bool OpenModel(ui::FrontEnd& frontEnd) = 0;
-    virtual const char* SubjectLabel() const = 0; // "&Point :"
-    virtual const char* WriteLabel() const = 0;   // "É&crire le point"
-    virtual std::vector<std::string> Subjects() const = 0;
-    virtual std::string Subject() const = 0;
-    // Chooses the subject typed or picked; true when it changed.
-    virtual bool ChooseSubject(const std::string& subject) = 0;
+    // ---- What each computation shows
     // The result lines, in the order of the axes the surveyor reads.
     virtual std::vector<ResultLine> ResultLines() const = 0;
-    virtual std::string Status() const = 0;
-    virtual bool CanWrite() const = 0;
-    virtual bool Write() = 0;
-    virtual bool CanFinish() const = 0;
     // A computation's own controls (ids from kFirstOwn), their states and the actions on them.
     virtual void AddOwnControls(std::vector<ui::Control>&) const {}
     virtual ui::ControlState OwnState(int) const { return {}; }
@@ -87,6 +78,8 @@ protected:
 private:
     const ui::DialogModel& m_dialog;
     CSightingComputation& m_model;
+    const char* m_subjectLabel;
+    const char* m_writeLabel;
     bool m_written = false; // a result was written into the GéoBase
 };
 

@@ -16,6 +16,9 @@ inline constexpr const char* kMsgStationNotOffered =
 inline constexpr const char* kMsgNoSightingKept = "Aucune visée de la station <%s> ne porte sur <%s> !";
 inline constexpr const char* kMsgNoStationAsked = "Aucune station à calculer : indiquez --station.";
 
+// The window.
+inline constexpr const char* kLabelStation = "&Station :";
+inline constexpr const char* kLabelWrite = "É&crire la station";
 inline constexpr const char* kLabelX = "X =";
 inline constexpr const char* kLabelY = "Y =";
 inline constexpr const char* kLabelV0 = "V0 =";

@@ -3,7 +3,7 @@
 #include "calc/CalcExcentDriver.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalculV0Driver.h"
-#include "calc/StationComputationDriver.h"
+#include "calc/ResectionDriver.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
 #include "fieldbook/ReadingCommand.h"

@@ -7,7 +7,7 @@
 #include "calc/CalcInters.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalculV0Driver.h"
-#include "calc/StationComputationDriver.h"
+#include "calc/ResectionDriver.h"
 #include "calc/IntersectionJob.h"
 #include "settings/OptionPages.h"
 #include "ui/Form.h"

@@ -1,11 +1,11 @@
-#include "calc/StationComputationForm.h"
+#include "calc/ResectionForm.h"
 
 #include "calc/StationTexts.h"
 #include "geobase/Elements.h"
 
 namespace pyr {
 
-std::vector<CSightingComputationForm::ResultLine> CStationComputationForm::ResultLines() const {
+std::vector<CSightingComputationForm::ResultLine> CResectionForm::ResultLines() const {
     // The names say the place, the labels the axis: X or Y first as the options show them.
     const bool swap = CPointGen::SwapXY();
     ResultLine x{station::kLabelX, "Premiere", m_model.XText(), m_model.EmqXText()};

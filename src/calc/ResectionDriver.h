@@ -11,12 +11,12 @@
 
 namespace pyr {
 
-// A station computed from a command line: "--station NOM" (or "NOM(2)" for an occurrence), "--visees
-// SELECTION" (the points, or the sighting stations, whose lines are taken; by default every line the
-// dialog offers), "--plani 0|1", "--alti 0|1", "--enregistrer" (the station's point and V0 written and
-// the GéoBase saved), "--listing [FICHIER]". The result is printed as the dialog shows it; the run fails
-// when the station could not be computed.
-class CStationComputationDriver : public ui::Dialog {
+// A station computed by resection or by the combined method from a command line: "--station NOM" (or "NOM(2)"
+// for an occurrence), "--visees SELECTION" (the points, or the sighting stations, whose lines are taken; by
+// default every line the dialog offers), "--plani 0|1", "--alti 0|1", "--enregistrer" (the station's point
+// and V0 written and the GéoBase saved), "--listing [FICHIER]". The result is printed as the dialog shows it;
+// the run fails when the station could not be computed.
+class CResectionDriver : public ui::Dialog {
 public:
     std::string Caption() const override { return m_model.Caption(); }
     ui::DialogModel& Model() override { return m_model; }
@@ -26,34 +26,33 @@ public:
 
 protected:
     // `model` is the derived driver's own member: only kept here, used once the driver is built.
-    explicit CStationComputationDriver(CStationComputation& model) : m_model(model) {}
+    explicit CResectionDriver(CResectionComputation& model) : m_model(model) {}
 
 private:
     bool ComputeStation(ui::FrontEnd& frontEnd);
     void Print(ui::FrontEnd& frontEnd);
 
-    CStationComputation& m_model;
+    CResectionComputation& m_model;
     struct Requests {
         std::optional<std::string> station;
         std::optional<std::string> sightings;
-        std::optional<bool> plani, alti;
         ComputationRequests computation;
     } m_requests;
 };
 
 // "CalRelev".
-class CCalcRelevDriver final : public CStationComputationDriver {
+class CCalcRelevDriver final : public CResectionDriver {
 public:
-    CCalcRelevDriver() : CStationComputationDriver(m_relev) {}
+    CCalcRelevDriver() : CResectionDriver(m_relev) {}
 
 private:
     CCalcRelev m_relev;
 };
 
 // "CalRecou".
-class CCalcRecoupDriver final : public CStationComputationDriver {
+class CCalcRecoupDriver final : public CResectionDriver {
 public:
-    CCalcRecoupDriver() : CStationComputationDriver(m_recoup) {}
+    CCalcRecoupDriver() : CResectionDriver(m_recoup) {}
 
 private:
     CCalcRecoup m_recoup;
