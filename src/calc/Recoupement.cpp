@@ -154,97 +154,6 @@ void ComputePlanimetry(StationResult& result) {
     if (c.quality < kRecoupMinCrossing) result.flags |= kStationWeakCrossing;
 }
 
-// The height relation of a sighting with the station's altitude Z. The line of sight rises from the
-// instrument to the target by `sign` x Z + `base`: for a resection sighting from the station (Z + HI) to
-// the point (Zpoint + HP), sign -1; for an intersection sighting from the other station (ZS + HIS) to
-// the target on this one (Z + HP), sign +1.
-struct Levelling {
-    double sign;
-    double base;
-};
-bool LevellingOf(const StationSighting& s, double hi, Levelling& l) {
-    if (IsUndefined(s.z) || IsUndefined(s.hp)) return false;
-    if (s.onStation) {
-        if (IsUndefined(s.his)) return false;
-        l = {1.0, s.hp - s.z - s.his};
-    } else {
-        if (IsUndefined(hi)) return false;
-        l = {-1.0, s.z + s.hp - hi};
-    }
-    return true;
-}
-
-// The zenith angle under which the sighting would be read were the station at altitude z, and its
-// coefficient a: the change of that angle for a metre of altitude, negated, in gr/m. The curvature and
-// refraction lower the target's apparent height by the same term the altitudes take into account.
-struct Zenith {
-    double angle;
-    double a;
-};
-Zenith ZenithAt(const StationSighting& s, const Levelling& l, double z) {
-    const double h = (l.sign * z + l.base - CurvatureRefraction(s.dh)) / s.dh;
-    const double zc = 100.0 - RadiansToGrads(std::atan(h));
-    const double sine = SinGrads(zc);
-    return {zc, l.sign * RadiansToGrads(sine * sine / s.dh)};
-}
-
-// Altimetry over both kinds of sightings. Each sighting with a zenith angle and a horizontal distance
-// gives the station's altitude: DH / tan z + the curvature and refraction is the rise of its line of
-// sight. Their mean starts one least-squares step on the zenith angles, all of one precision. Each
-// angle's coefficient a is (200/pi) sin² z / DH with the sign of the kind: negative for a resection
-// sighting (a higher station sees its point lower), positive for an intersection sighting (a higher
-// station is seen higher). The unweighted step on the angles is thus the mean of the altitudes weighted
-// by a², the inverse variance of a height difference DH / tan z for an error of the zenith angle: short
-// and level sightings count most. On exact data every altitude is the same and the step is zero.
-void ComputeAltimetry(StationResult& result) {
-    struct Used {
-        StationSighting* s;
-        Levelling l;
-    };
-    std::vector<Used> used;
-    double sum = 0.0;
-    for (StationSighting& s : result.sightings) {
-        Levelling l;
-        if (IsUndefined(s.av) || IsUndefined(s.dh) || !(s.dh > 0.0) || !LevellingOf(s, result.hi, l))
-            continue;
-        const double zenith = FoldedZenith(s.av);
-        const double sine = SinGrads(zenith);
-        if (sine == 0.0) continue; // vertical: no height difference from a horizontal distance
-        const double rise = s.dh * CosGrads(zenith) / sine + CurvatureRefraction(s.dh);
-        const double zi = l.sign * (rise - l.base);
-        if (!std::isfinite(zi)) continue;
-        s.zi = zi;
-        sum += zi;
-        used.push_back({&s, l});
-    }
-    if (used.empty()) return;
-    const int m = static_cast<int>(used.size());
-    result.altitudes = m;
-    result.z0 = sum / m;
-    result.z = result.z0;
-    if (m == 1) return;
-
-    double saa = 0.0, sar = 0.0;
-    for (const Used& u : used) {
-        const Zenith c = ZenithAt(*u.s, u.l, result.z0);
-        saa += c.a * c.a;
-        sar += c.a * (c.angle - FoldedZenith(u.s->av));
-    }
-    if (saa > 0.0 && std::isfinite(result.z0 + sar / saa)) result.z = result.z0 + sar / saa;
-
-    // The residuals and the error from the computed altitude.
-    saa = 0.0;
-    double svv = 0.0;
-    for (const Used& u : used) {
-        const Zenith c = ZenithAt(*u.s, u.l, result.z);
-        saa += c.a * c.a;
-        u.s->vz = c.angle - FoldedZenith(u.s->av);
-        u.s->ez = (CosGrads(c.angle) - CosGrads(u.s->av)) * u.s->dh;
-        svv += u.s->vz * u.s->vz;
-    }
-    if (saa > 0.0) result.emqZ = std::sqrt(1.0 / saa) * std::sqrt(svv / (m - 1));
-}
-
 } // namespace
 
 LineCircle IntersectLineCircle(double x1, double y1, double x2, double y2, double xc, double yc, double r) {
@@ -278,7 +187,7 @@ LineCircle IntersectLineCircle(double x1, double y1, double x2, double y2, doubl
 int ComputeRecoupement(StationResult& result, bool plani, bool alti) {
     ResetStationOutputs(result);
     if (plani) ComputePlanimetry(result);
-    if (alti) ComputeAltimetry(result);
+    if (alti) ComputeStationAltimetry(result);
     return result.flags;
 }
 

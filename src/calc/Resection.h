@@ -112,5 +112,10 @@ bool ApproximateOrientation(StationResult& result);
 // stand. Then every sighting's distance from the computed place and its direction residual. Sets x, y,
 // v0, emqX, emqY, emqV0, sigma0 and the sightings' dh, v and e.
 void AdjustStation(StationResult& result);
+// The station's altitude from the zenith angles of both kinds of sightings (those with an angle, a
+// horizontal distance and the heights they need): each gives an altitude, their mean starts one
+// least-squares step on the angles, which gives Z and its error from two altitudes on. Sets altitudes,
+// z0, z, emqZ and the sightings' zi, vz and ez; uses the sightings' dh as they stand.
+void ComputeStationAltimetry(StationResult& result);
 
 } // namespace pyr
