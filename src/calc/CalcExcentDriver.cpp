@@ -26,7 +26,9 @@ constexpr const char* kHelpSave = "écrire la station calculée (point et V0) da
 
 } // namespace
 
-void CCalcExcentDriver::DeclareOptions(ui::DialogOptions& options) {
+CCalcExcentDriver::CCalcExcentDriver() : CComputationDriver(m_model, kHelpSave) {}
+
+void CCalcExcentDriver::DeclareOwnOptions(ui::DialogOptions& options) {
     options.Value("station", "NOM", kHelpStation, [this](const std::string& name) {
         m_requests.station = name;
         return std::string();
@@ -40,8 +42,6 @@ void CCalcExcentDriver::DeclareOptions(ui::DialogOptions& options) {
         m_requests.references = selection;
         return std::string();
     });
-    DeclareSwitchOptions(options, m_requests.computation);
-    DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
 // The result as the dialog shows it: the centre, the fields, then the residuals of each reference taken.
@@ -73,7 +73,7 @@ void CCalcExcentDriver::Print(ui::FrontEnd& frontEnd) {
                   Milligrads(s.ev0).c_str(), Milligrads(s.eav).c_str());
 }
 
-bool CCalcExcentDriver::ComputeStation(ui::FrontEnd& frontEnd) {
+bool CCalcExcentDriver::Compute(ui::FrontEnd& frontEnd) {
     if (!m_requests.station || !m_requests.centre) {
         frontEnd.MessageBox(m_requests.station ? excent::kMsgNoCentreAsked : station::kMsgNoStationAsked,
                             ui::kCaption, ui::kIconWarning);
@@ -101,12 +101,7 @@ bool CCalcExcentDriver::ComputeStation(ui::FrontEnd& frontEnd) {
     // A station is computed when its planimetry is, or its altitude when only the altimetry is asked.
     const EccentricResult& result = m_model.Result();
     if (m_model.Plani() ? !(result.flags & kExcentComputed) : !IsKnown(result.z)) return false;
-    return !m_requests.computation.save || m_model.Write();
-}
-
-ui::DialogResult CCalcExcentDriver::Run(ui::FrontEnd& frontEnd) {
-    return RunComputation(*this, m_model, frontEnd, m_requests.computation,
-                          [&] { return ComputeStation(frontEnd); });
+    return !SaveAsked() || m_model.Write();
 }
 
 std::unique_ptr<ui::Form> CCalcExcentDriver::MakeForm() {

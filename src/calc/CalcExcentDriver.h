@@ -1,8 +1,7 @@
 #pragma once
 
 #include "calc/CalcExcent.h"
-#include "calc/ComputationOptions.h"
-#include "ui/Dialog.h"
+#include "calc/ComputationDriver.h"
 
 #include <memory>
 #include <optional>
@@ -16,17 +15,15 @@ namespace pyr {
 // "--plani 0|1", "--alti 0|1", "--enregistrer" (the station's point and V0 written and the GéoBase
 // saved), "--listing [FICHIER]". The result is printed as the dialog shows it; the run fails when the
 // station could not be computed.
-class CCalcExcentDriver : public ui::Dialog {
+class CCalcExcentDriver : public CComputationDriver {
 public:
-    std::string Caption() const override { return m_model.Caption(); }
-    ui::DialogModel& Model() override { return m_model; }
-    void DeclareOptions(ui::DialogOptions& options) override;
-    ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    CCalcExcentDriver();
     // The window, over the same model.
     std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
-    bool ComputeStation(ui::FrontEnd& frontEnd);
+    void DeclareOwnOptions(ui::DialogOptions& options) override;
+    bool Compute(ui::FrontEnd& frontEnd) override;
     void Print(ui::FrontEnd& frontEnd);
 
     CCalcExcent m_model;
@@ -34,7 +31,6 @@ private:
         std::optional<std::string> station;
         std::optional<std::string> centre;
         std::optional<std::string> references;
-        ComputationRequests computation;
     } m_requests;
 };
 

@@ -23,7 +23,9 @@ constexpr const char* kHelpSave = "écrire chaque point calculé dans la GéoBas
 
 } // namespace
 
-void CCalcIntersDriver::DeclareOptions(ui::DialogOptions& options) {
+CCalcIntersDriver::CCalcIntersDriver() : CComputationDriver(m_model, kHelpSave) {}
+
+void CCalcIntersDriver::DeclareOwnOptions(ui::DialogOptions& options) {
     options.Value(
         "point", "NOM", kHelpPoint,
         [this](const std::string& mat) {
@@ -41,8 +43,6 @@ void CCalcIntersDriver::DeclareOptions(ui::DialogOptions& options) {
         m_requests.stations = selection;
         return std::string();
     });
-    DeclareSwitchOptions(options, m_requests.computation);
-    DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
 // The result as the dialog shows it: the fields, then the residuals of each sighting taken.
@@ -84,16 +84,10 @@ bool CCalcIntersDriver::ComputePoint(ui::FrontEnd& frontEnd, const std::string& 
     // A point is computed when its planimetry is, or its altitude when only the altimetry is asked.
     const InterResult& result = m_model.Result();
     if (m_model.Plani() ? !(result.flags & kInterComputed) : !IsKnown(result.z)) return false;
-    return !m_requests.computation.save || m_model.WritePoint();
+    return !SaveAsked() || m_model.WritePoint();
 }
 
-ui::DialogResult CCalcIntersDriver::Run(ui::FrontEnd& frontEnd) {
-    return RunComputation(*this, m_model, frontEnd, m_requests.computation,
-                          [&] { return ComputePoints(frontEnd); });
-}
-
-// Every point asked, by name or by selection, computed in turn.
-bool CCalcIntersDriver::ComputePoints(ui::FrontEnd& frontEnd) {
+bool CCalcIntersDriver::Compute(ui::FrontEnd& frontEnd) {
     std::vector<std::string> asked = m_requests.points;
     bool ok = true;
     if (m_requests.selection) {

@@ -1,8 +1,7 @@
 #pragma once
 
 #include "calc/CalcInters.h"
-#include "calc/ComputationOptions.h"
-#include "ui/Dialog.h"
+#include "calc/ComputationDriver.h"
 
 #include <memory>
 #include <optional>
@@ -16,17 +15,16 @@ namespace pyr {
 // stations whose sightings are taken), "--plani 0|1", "--alti 0|1", "--enregistrer" (every point computed
 // written and the GéoBase saved), "--listing [FICHIER]". Each point's result is printed as the dialog
 // shows it. The run fails when a point asked for could not be computed.
-class CCalcIntersDriver : public ui::Dialog {
+class CCalcIntersDriver : public CComputationDriver {
 public:
-    std::string Caption() const override { return m_model.Caption(); }
-    ui::DialogModel& Model() override { return m_model; }
-    void DeclareOptions(ui::DialogOptions& options) override;
-    ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    CCalcIntersDriver();
     // The window, over the same model.
     std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
-    bool ComputePoints(ui::FrontEnd& frontEnd);
+    void DeclareOwnOptions(ui::DialogOptions& options) override;
+    // Every point asked, by name or by selection, computed in turn.
+    bool Compute(ui::FrontEnd& frontEnd) override;
     bool ComputePoint(ui::FrontEnd& frontEnd, const std::string& mat);
     void Print(ui::FrontEnd& frontEnd);
 
@@ -35,7 +33,6 @@ private:
         std::vector<std::string> points;
         std::optional<std::string> selection;
         std::optional<std::string> stations;
-        ComputationRequests computation;
     } m_requests;
 };
 

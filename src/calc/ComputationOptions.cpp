@@ -1,9 +1,5 @@
 #include "calc/ComputationOptions.h"
 
-#include "calc/SightingComputation.h"
-#include "core/Numbers.h"
-#include "core/Undefined.h"
-
 namespace pyr {
 
 namespace {
@@ -31,27 +27,6 @@ void DeclareComputationOptions(ui::DialogOptions& options, ComputationRequests& 
 void DeclareSwitchOptions(ui::DialogOptions& options, ComputationRequests& requests) {
     options.ZeroOrOne("plani", kHelpPlani, [&requests](bool on) { requests.plani = on; });
     options.ZeroOrOne("alti", kHelpAlti, [&requests](bool on) { requests.alti = on; });
-}
-
-ui::DialogResult RunComputation(ui::Dialog& face, CSightingComputation& model, ui::FrontEnd& frontEnd,
-                                const ComputationRequests& requests, const std::function<bool()>& compute) {
-    model.SetInputs(face.Inputs());
-    if (face.GeoBaseNamed()) model.SetGeoBase(face.GeoBase());
-    if (!model.Open(frontEnd)) return model.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
-    if (requests.plani) model.SetPlani(*requests.plani);
-    if (requests.alti) model.SetAlti(*requests.alti);
-    bool ok = compute();
-    if (requests.save && model.Modified() && !model.Save()) ok = false;
-    model.Close(requests.listing, requests.listingPath);
-    return ok ? ui::DialogResult::Ok : ui::DialogResult::Failed;
-}
-
-std::string Dashed(const std::string& text) {
-    return text.empty() ? std::string("-") : text;
-}
-
-std::string DashedMetres(double metres) {
-    return IsKnown(metres) ? FormatFixedShown(metres, 4) : std::string("-");
 }
 
 } // namespace pyr

@@ -25,7 +25,10 @@ constexpr const char* kHelpSave = "écrire la station calculée (point et V0) da
 
 } // namespace
 
-void CResectionDriver::DeclareOptions(ui::DialogOptions& options) {
+CResectionDriver::CResectionDriver(CResectionComputation& model)
+    : CComputationDriver(model, kHelpSave), m_model(model) {}
+
+void CResectionDriver::DeclareOwnOptions(ui::DialogOptions& options) {
     options.Value("station", "NOM", kHelpStation, [this](const std::string& name) {
         m_requests.station = name;
         return std::string();
@@ -35,8 +38,6 @@ void CResectionDriver::DeclareOptions(ui::DialogOptions& options) {
         m_requests.sightings = selection;
         return std::string();
     });
-    DeclareSwitchOptions(options, m_requests.computation);
-    DeclareComputationOptions(options, m_requests.computation, kHelpSave);
 }
 
 // The result as the dialog shows it: the fields, then the residuals of each sighting taken.
@@ -68,7 +69,7 @@ void CResectionDriver::Print(ui::FrontEnd& frontEnd) {
     }
 }
 
-bool CResectionDriver::ComputeStation(ui::FrontEnd& frontEnd) {
+bool CResectionDriver::Compute(ui::FrontEnd& frontEnd) {
     if (!m_requests.station) {
         frontEnd.MessageBox(station::kMsgNoStationAsked, ui::kCaption, ui::kIconWarning);
         return false;
@@ -88,12 +89,7 @@ bool CResectionDriver::ComputeStation(ui::FrontEnd& frontEnd) {
     // A station is computed when its planimetry is, or its altitude when only the altimetry is asked.
     const StationResult& result = m_model.Result();
     if (m_model.Plani() ? !(result.flags & kStationComputed) : !IsKnown(result.z)) return false;
-    return !m_requests.computation.save || m_model.Write();
-}
-
-ui::DialogResult CResectionDriver::Run(ui::FrontEnd& frontEnd) {
-    return RunComputation(*this, m_model, frontEnd, m_requests.computation,
-                          [&] { return ComputeStation(frontEnd); });
+    return !SaveAsked() || m_model.Write();
 }
 
 std::unique_ptr<ui::Form> CResectionDriver::MakeForm() {

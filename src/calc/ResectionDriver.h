@@ -2,8 +2,7 @@
 
 #include "calc/CalcRecoup.h"
 #include "calc/CalcRelev.h"
-#include "calc/ComputationOptions.h"
-#include "ui/Dialog.h"
+#include "calc/ComputationDriver.h"
 
 #include <memory>
 #include <optional>
@@ -16,27 +15,23 @@ namespace pyr {
 // default every line the dialog offers), "--plani 0|1", "--alti 0|1", "--enregistrer" (the station's point
 // and V0 written and the GéoBase saved), "--listing [FICHIER]". The result is printed as the dialog shows it;
 // the run fails when the station could not be computed.
-class CResectionDriver : public ui::Dialog {
+class CResectionDriver : public CComputationDriver {
 public:
-    std::string Caption() const override { return m_model.Caption(); }
-    ui::DialogModel& Model() override { return m_model; }
-    void DeclareOptions(ui::DialogOptions& options) override;
-    ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
     std::unique_ptr<ui::Form> MakeForm() override;
 
 protected:
     // `model` is the derived driver's own member: only kept here, used once the driver is built.
-    explicit CResectionDriver(CResectionComputation& model) : m_model(model) {}
+    explicit CResectionDriver(CResectionComputation& model);
 
 private:
-    bool ComputeStation(ui::FrontEnd& frontEnd);
+    void DeclareOwnOptions(ui::DialogOptions& options) override;
+    bool Compute(ui::FrontEnd& frontEnd) override;
     void Print(ui::FrontEnd& frontEnd);
 
     CResectionComputation& m_model;
     struct Requests {
         std::optional<std::string> station;
         std::optional<std::string> sightings;
-        ComputationRequests computation;
     } m_requests;
 };
 
