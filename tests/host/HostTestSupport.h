@@ -3,6 +3,7 @@
 // What the tests of the module share: the folder of the built programs and modules, a front end that
 // notes the host's state while a dialog runs, and the services as the module sees them.
 #include "TestSupport.h"
+#include "geobase/Carnet.h"
 #include "host/HostTexts.h"
 #include "host/Services.h"
 #include "hostrt/HostRuntime.h"
@@ -10,6 +11,8 @@
 #include "ui/ScriptedFrontEnd.h"
 
 #include <filesystem>
+#include <gtest/gtest.h>
+#include <initializer_list>
 #include <sstream>
 #include <string>
 #include <sys/resource.h>
@@ -46,6 +49,24 @@ struct Outcome {
 
 inline bool Has(const std::string& text, const std::string& part) {
     return text.find(part) != std::string::npos;
+}
+
+// The parts of a text (what a command printed, a listing, a journal) in that order, and never an undefined
+// value or a NaN written out.
+inline void ExpectInOrder(const std::string& text, std::initializer_list<const char*> parts) {
+    std::size_t at = 0;
+    for (const char* part : parts) {
+        at = text.find(part, at);
+        ASSERT_NE(at, std::string::npos) << part << "\n" << text;
+    }
+    EXPECT_FALSE(Has(text, "-999999") || Has(text, "nan")) << text;
+}
+
+// The GéoBase a command left in that file.
+inline pyr::CCarnet SavedGeoBase(const std::string& path) {
+    pyr::CCarnet carnet;
+    carnet.Load(nullptr, path);
+    return carnet;
 }
 
 // Runs "pyralis --params Pyralis.ini <arguments>" in `folder` as a script runs it, with the parameter

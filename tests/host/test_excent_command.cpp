@@ -44,20 +44,7 @@ protected:
     Outcome Run(const std::string& arguments) {
         return RunPyralis(dir.Root(), "CalExcen --geobase chantier.geo " + arguments);
     }
-    CCarnet Saved() const {
-        CCarnet carnet;
-        carnet.Load(nullptr, dir / "chantier.geo");
-        return carnet;
-    }
-    // The parts of a text, in that order, and never an undefined value written out.
-    static void ExpectInOrder(const std::string& text, std::initializer_list<const char*> parts) {
-        std::size_t at = 0;
-        for (const char* part : parts) {
-            at = text.find(part, at);
-            ASSERT_NE(at, std::string::npos) << part << "\n" << text;
-        }
-        EXPECT_FALSE(Has(text, "-999999") || Has(text, "nan")) << text;
-    }
+    CCarnet Saved() const { return SavedGeoBase(dir / "chantier.geo"); }
 
     TempDir dir;
 };

@@ -42,20 +42,7 @@ protected:
     Outcome Run(const std::string& command, const std::string& arguments) {
         return RunPyralis(dir.Root(), command + " --geobase chantier.geo " + arguments);
     }
-    CCarnet Saved() const {
-        CCarnet carnet;
-        carnet.Load(nullptr, dir / "chantier.geo");
-        return carnet;
-    }
-    // The parts of a text, in that order.
-    static void ExpectInOrder(const std::string& text, std::initializer_list<const char*> parts) {
-        std::size_t at = 0;
-        for (const char* part : parts) {
-            at = text.find(part, at);
-            ASSERT_NE(at, std::string::npos) << part << "\n" << text;
-        }
-        EXPECT_FALSE(Has(text, "-999999") || Has(text, "nan")) << text;
-    }
+    CCarnet Saved() const { return SavedGeoBase(dir / "chantier.geo"); }
 
     TempDir dir;
 };
@@ -77,9 +64,10 @@ TEST_F(StationCommands, AResectionIsComputedShownWrittenListedAndJournalled) {
                   {"CALCUL PAR RELEVEMENT", "Calcul de la station E, reprise 1", "Calcul en planimétrie",
                    "Matricule  visée", "P calculé", "EMQ (m/Gr)",
                    "Calcul en altimétrie, hauteur d'instrument = 1.550", "Z St.", "Z calculé"});
-    ExpectInOrder(ReadBytes(dir / "chantier.jnl"),
-                  {" - Calcul de points par relèvement\nPoint       E : X =    1040.0000 Y =    2030.0000 Z =",
-                   "\nStation    E(1) : V0 =  37.50000"});
+    ExpectInOrder(
+        ReadBytes(dir / "chantier.jnl"),
+        {" - Calcul de points par relèvement\nPoint       E : X =    1040.0000 Y =    2030.0000 Z =",
+         "\nStation    E(1) : V0 =  37.50000"});
 }
 
 TEST_F(StationCommands, SomeSightingsOnlyAndTooFew) {
@@ -122,14 +110,16 @@ TEST_F(StationCommands, InvariantCoordinatesOfTheStationAreKeptOnNo) {
 TEST_F(StationCommands, TheCombinedMethodTakesTheSightingsOnTheStationToo) {
     Outcome outcome = Run("CalRecou", "--station E --enregistrer --listing recoup.crc --oui");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
-    ExpectInOrder(outcome.out, {"Station E (1) : X = 1040.0000  Y = 2030.0000", "Station E (1) : V0 = 37.5000",
-                                "Station E (1) : Z = 101.500", "---> A", "<--- A (1)"});
+    ExpectInOrder(outcome.out,
+                  {"Station E (1) : X = 1040.0000  Y = 2030.0000", "Station E (1) : V0 = 37.5000",
+                   "Station E (1) : Z = 101.500", "---> A", "<--- A (1)"});
     const CCarnet saved = Saved();
     EXPECT_NEAR(saved.yAt(saved.findMat("E")), kE.y, 1e-9);
     ExpectInOrder(ReadBytes(dir / "recoup.crc"),
-                  {"CALCUL PAR RECOUPEMENT", "Calcul de la station E, reprise 1", "Matricule visée R", "<-- A (1)",
-                   "Calcul en altimétrie", "<-- A (1)"});
-    ExpectInOrder(ReadBytes(dir / "chantier.jnl"), {" - Calcul de points par recoupement\nPoint       E", "\nStation    E(1)"});
+                  {"CALCUL PAR RECOUPEMENT", "Calcul de la station E, reprise 1", "Matricule visée R",
+                   "<-- A (1)", "Calcul en altimétrie", "<-- A (1)"});
+    ExpectInOrder(ReadBytes(dir / "chantier.jnl"),
+                  {" - Calcul de points par recoupement\nPoint       E", "\nStation    E(1)"});
 
     // Resection sightings alone are not enough.
     outcome = Run("CalRecou", "--station E --visees B,C,D");
