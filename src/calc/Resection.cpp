@@ -24,6 +24,9 @@ constexpr double kCocyclicLimit = 0.001;
 // Two rays whose bearings differ by less than about 0.64 gr (|sine| up to 0.01) from 0 or 200 cross too
 // flatly to place the station.
 constexpr double kPairMinSine = 0.01;
+// Two sightings on points closer than this (m) are on one point, read twice (in both faces, or in two
+// rounds): they make no angle between two points, and no triple with a third.
+constexpr double kSamePoint = 0.001;
 // The least-squares step on X, Y and V0 needs one direction more than its three unknowns.
 constexpr int kMinAdjusted = 4;
 
@@ -75,14 +78,18 @@ void ApproximatePlace(StationResult& result, const std::vector<int>& known) {
         double grads = 0.0;
         double cot = 0.0;
         bool aligned = true;
+        bool samePoint = false;
     };
     const std::size_t n = known.size();
     std::vector<Angle> angles(n * n);
     for (std::size_t i = 0; i < n; ++i)
         for (std::size_t j = i + 1; j < n; ++j) {
             Angle& angle = angles[i * n + j];
-            angle.grads = WrapGrads(result.sightings[known[j]].ah - result.sightings[known[i]].ah);
-            angle.aligned = NearlyAligned(angle.grads);
+            const StationSighting& from = result.sightings[known[i]];
+            const StationSighting& to = result.sightings[known[j]];
+            angle.grads = WrapGrads(to.ah - from.ah);
+            angle.samePoint = std::hypot(to.x - from.x, to.y - from.y) < kSamePoint;
+            angle.aligned = angle.samePoint || NearlyAligned(angle.grads);
             if (!angle.aligned) angle.cot = Cotangent(angle.grads);
         }
 
@@ -97,7 +104,7 @@ void ApproximatePlace(StationResult& result, const std::vector<int>& known) {
                 const StationSighting& c = result.sightings[known[k]];
                 const Angle& ab = angles[i * n + j];
                 const Angle& ac = angles[i * n + k];
-                if (ab.aligned || ac.aligned) {
+                if (ab.aligned || ac.aligned || angles[j * n + k].samePoint) {
                     aligned = true;
                     continue;
                 }

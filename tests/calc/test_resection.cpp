@@ -102,6 +102,27 @@ TEST(ResectionPlanimetry, ExactSightingsGiveTheStationBackAmongThreeFourAndSixPo
     }
 }
 
+// Each point read in both faces, the two directions a milligrad apart, as a field book gives them before
+// its station is reduced: two sightings on one point make no angle, and no triple is built on them.
+// Taken as one, they would make a near-zero angle whose huge cotangent wins the triple search and puts
+// the station on one of the points.
+TEST(ResectionPlanimetry, PointsReadInBothFacesMakeNoTripleOfTheirOwn) {
+    StationResult result = Job({});
+    for (std::size_t i = 0; i < 3; ++i) {
+        result.sightings.push_back(Sight(kPoints[i], -0.0005));
+        result.sightings.push_back(Sight(kPoints[i], +0.0005));
+    }
+    EXPECT_EQ(ComputeResection(result, true, false), kStationComputed);
+    EXPECT_NEAR(result.x, kSt.x, kTenthMm);
+    EXPECT_NEAR(result.y, kSt.y, kTenthMm);
+    EXPECT_NEAR(Gap(result.v0 - kV0), 0.0, kHundredthMgon);
+    // The triple taken holds three different points.
+    std::set<std::pair<double, double>> points;
+    for (int i : Used(result))
+        points.insert({result.sightings[i].x, result.sightings[i].y});
+    EXPECT_EQ(points.size(), 3u);
+}
+
 TEST(ResectionPlanimetry, ErrorsTheFitTakesOutLeaveTheStationAndShowInItsResiduals) {
     // A cross: N and S at a = 300 m, E and W at b = 600 m, all level with the instrument (z = 100 gr).
     // Row i of the directions' design is (-dy, dx) rho / D² and -1: N (-rho/a, 0), E (0, rho/b),
