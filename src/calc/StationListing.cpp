@@ -25,6 +25,9 @@ constexpr const char* kEmqPlace = "EMQ (m/Gr) :";
 constexpr const char* kApproximateZ = "Z approché :";
 constexpr const char* kComputedZ = "Z calculé :";
 constexpr const char* kEmqZ = "EMQ (m) :";
+// The mark of the three sightings that gave the approximate place, and what it says.
+constexpr const char* kUsedMark = " *";
+constexpr const char* kUsedLegend = "* : visées de la solution approchée";
 // The direction of a line of sight: from the station on a known point, or on the station from another.
 constexpr const char* kFromStation = "-->";
 constexpr const char* kOnStation = "<--";
@@ -52,11 +55,13 @@ void WritePlanimetry(CDlgCfgListing& listing, const StationResult& result, bool 
         {kinds ? kColumnSightingWithKind : kColumnSighting, "AH", "Gisement", "DH", "V mgon", "El m"}};
     for (const StationSighting& s : result.sightings) {
         if (IsUndefined(s.v)) continue;
-        rows.push_back({SightingCell(s, kinds), listing.FormatAngl(s.ah, -1, true),
+        rows.push_back({SightingCell(s, kinds) + (s.used ? kUsedMark : ""),
+                        listing.FormatAngl(s.ah, -1, true),
                         listing.FormatAngl(SightBearing(s, result.v0), -1, true), listing.FormatDist(s.dh),
                         Milligrads(s.v), listing.FormatDist(s.e)});
     }
     DrawTable(listing, rows, true, 1);
+    listing.WriteLine("%s\n", kUsedLegend);
     Blank(listing);
 
     const bool swap = CPointGen::SwapXY();
