@@ -4,42 +4,18 @@
 // index, never by a scan of the GéoBase or of the list of points.
 #include "JobGenerator.h"
 #include "SilentFrontEnd.h"
+#include "TemporaryJob.h"
 #include "calc/CalcInters.h"
 #include "calc/Intersection.h"
 
 #include <benchmark/benchmark.h>
 #include <chrono>
 #include <cmath>
-#include <filesystem>
 #include <string>
-#include <unistd.h>
 
 namespace pyr::bench {
 
 namespace {
-
-// A folder of its own for the GéoBase and the parameters of one benchmark, removed at the end.
-class TemporaryJob {
-public:
-    TemporaryJob(CCarnet& carnet, const std::string& name)
-        : m_folder(std::filesystem::temp_directory_path() /
-                   ("pyralis-bench-inters-" + name + "-" + std::to_string(getpid()))) {
-        std::filesystem::create_directories(m_folder);
-        carnet.Save(GeoBase());
-    }
-    ~TemporaryJob() {
-        std::error_code ignored;
-        std::filesystem::remove_all(m_folder, ignored);
-    }
-    TemporaryJob(const TemporaryJob&) = delete;
-    TemporaryJob& operator=(const TemporaryJob&) = delete;
-
-    std::string GeoBase() const { return (m_folder / "job.geo").string(); }
-    std::string Params() const { return (m_folder / "Pyralis.ini").string(); }
-
-private:
-    std::filesystem::path m_folder;
-};
 
 void Prepare(CCalcInters& dialog, const TemporaryJob& job) {
     dialog.SetInputs({job.GeoBase(), job.Params(), "", "calcul d'un point par intersection"});

@@ -1,6 +1,10 @@
 // A station by resection. The dialog computes the station again on every click of an arrow, and the
 // search for the best triple of sightings grows with the cube of their number: from 50 known points
 // the whole computation, planimetry and altimetry, must stay well under a millisecond.
+#include "JobGenerator.h"
+#include "SilentFrontEnd.h"
+#include "TemporaryJob.h"
+#include "calc/CalcRelev.h"
 #include "calc/Corrections.h"
 #include "calc/Resection.h"
 #include "core/Angles.h"
@@ -55,6 +59,29 @@ void BM_ResectionCompute(benchmark::State& state) {
     state.counters["altitudes"] = result.altitudes;
 }
 BENCHMARK(BM_ResectionCompute)->Arg(10)->Arg(50)->Arg(200)->Unit(benchmark::kMicrosecond);
+
+// The dialog itself: "<<" then ">>" on the station E of a GéoBase, each sighting gathered from the
+// GéoBase (reduced, its point found) and the station computed from all of them.
+void BM_ResectionDialogRecompute(benchmark::State& state) {
+    CCarnet carnet = MakeResectionStation(static_cast<int>(state.range(0)));
+    TemporaryJob job(carnet, "relev");
+    SilentFrontEnd frontEnd;
+    CCalcRelev dialog;
+    dialog.SetInputs({job.GeoBase(), job.Params(), "", "calcul d'un point par relèvement"});
+    dialog.SetGeoBase(job.GeoBase());
+    if (!dialog.Open(frontEnd) || !dialog.ChooseStation(kFreeStation))
+        state.SkipWithError("E n'est pas proposée");
+    for (auto _ : state) {
+        dialog.RemoveAll();
+        dialog.AddAll();
+        benchmark::ClobberMemory();
+    }
+    const StationResult& result = dialog.Result();
+    if (!(result.flags & kStationComputed)) state.SkipWithError("E n'a pas été calculée");
+    state.counters["ecart_xy_mm"] = std::hypot(result.x - kStarX, result.y - kStarY) * 1e3;
+    state.counters["ecart_z_mm"] = std::fabs(result.z - kStarZ) * 1e3;
+}
+BENCHMARK(BM_ResectionDialogRecompute)->Arg(10)->Arg(50)->Arg(200)->Unit(benchmark::kMicrosecond);
 
 } // namespace
 

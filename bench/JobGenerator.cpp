@@ -232,6 +232,28 @@ CCarnet MakeIntersectionStar(int stations) {
     return carnet;
 }
 
+CCarnet MakeResectionStation(int points) {
+    CCarnet carnet;
+    Draws draws;
+    const Place station{kStarX, kStarY, kStarZ};
+    std::vector<Place> known;
+    for (int p = 0; p < points; ++p) {
+        const double bearing = (p + draws.Uniform(0.1, 0.9)) * 400.0 / points;
+        const double distance = draws.Uniform(80, 1500);
+        known.push_back({std::round((kStarX + distance * SinGrads(bearing)) * 1e3) / 1e3,
+                         std::round((kStarY + distance * CosGrads(bearing)) * 1e3) / 1e3,
+                         draws.Rounded(55, 90, 1e3)});
+        carnet.Add(std::make_unique<CPointGen>("A" + std::to_string(p + 1), known.back().x, known.back().y,
+                                               known.back().z),
+                   kKindPoint);
+    }
+    constexpr double kHi = 1.6, kV0 = 271.3456;
+    carnet.Add(std::make_unique<CStation>(kFreeStation, kHi, kUndefined), kKindStation);
+    for (int p = 0; p < points; ++p)
+        AddMeasureFromCoordinates(carnet, station, kHi, kV0, "A" + std::to_string(p + 1), known[p], 1.3);
+    return carnet;
+}
+
 IntersectionGrid MakeIntersectionGrid(int columns, int rows) {
     constexpr double kSpacing = 100.0;
     constexpr double kEast = 651200.0;

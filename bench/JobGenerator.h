@@ -80,6 +80,12 @@ struct IntersectionGrid {
 };
 IntersectionGrid MakeIntersectionGrid(int columns, int rows);
 
+// ---- A job for the resection: the free station "E" (its point not in the GéoBase) set up at
+// (kStarX, kStarY, kStarZ) and measuring `points` known points "A1".."An" spread all around it, 80 m to
+// 1.5 km away.
+inline constexpr const char* kFreeStation = "E";
+CCarnet MakeResectionStation(int points);
+
 // ---- A job for the graphic view: `sightings` / 20 stations on a square grid 100 m apart, walked row
 // by row as traverses, each station point known one time in ten. Every station sights four of its
 // neighbours as references and measures its own new points (scattered up to 60 m around it) and some of
