@@ -8,6 +8,8 @@
 #include "geobase/Selection.h"
 #include "ui/FrontEnd.h"
 
+#include <algorithm>
+#include <cstddef>
 #include <optional>
 
 namespace pyr {
@@ -17,7 +19,8 @@ std::vector<CResectionComputation::Line> CResectionComputation::LinesOf(int stat
     const StationPlace station = PlaceOf(stationIndex);
     std::vector<Line> lines = SightingsOnKnownPoints(stationIndex);
     if (!m_withIntersections) return lines;
-    // On the station from the others, placed and oriented.
+    // On the station from the others, placed and oriented, in GéoBase order.
+    const std::size_t fromStation = lines.size();
     std::string name;
     for (int kind : {kKindReference, kKindMesure})
         for (int i = carnet.Find(kind, station.name); i >= 0; i = carnet.Find(kind, station.name, i + 1)) {
@@ -28,6 +31,8 @@ std::vector<CResectionComputation::Line> CResectionComputation::LinesOf(int stat
             lines.push_back({i, from, Sprintf(station::kLineIntersection, other.name.c_str(), other.reprise),
                              Tooltip(i, station.name)});
         }
+    std::sort(lines.begin() + static_cast<std::ptrdiff_t>(fromStation), lines.end(),
+              [](const Line& a, const Line& b) { return a.index < b.index; });
     return lines;
 }
 
