@@ -95,29 +95,26 @@ std::string ReportHeads(const Run& run) {
     std::string heads;
     for (const std::string& line : run.Reports()) {
         const std::size_t at = line.find("ligne ");
-        const std::size_t end =
-            at == std::string::npos ? line.size() : line.find_first_not_of("0123456789", at + 6);
-        heads += line.substr(0, end) + "\n";
+        heads += line.substr(0, at == std::string::npos ? line.size()
+                                                        : line.find_first_not_of("0123456789", at + 6)) +
+                 "\n";
     }
     return heads;
 }
 
-// The kinds of a GéoBase's sightings, in order, a blank after each: which are references.
-inline std::string SightingKinds(const pyr::CCarnet& carnet) {
-    std::string kinds;
-    for (int kind : Kinds(carnet))
-        if (pyr::IsSightingKind(kind)) kinds += std::to_string(kind) + ' ';
-    return kinds;
-}
-
-// The sighting kinds of `book` read with "References" at aucune, premiere and codes (the codes `codes`),
-// one string each: which sightings the format takes as references, and which the settings add.
+// The kinds of the sightings of `book` read with "References" at aucune, premiere and codes (the codes
+// `codes`), "1002 1003 " for each: which sightings the format takes as references, and which the settings
+// add.
 template <class Reader, pyr::FieldBookFormat kFormat>
 std::vector<std::string> KindsByMarking(const std::string& book, const char* codes) {
     std::vector<std::string> kinds;
     for (const char* marking : {"aucune", "premiere", "codes"}) {
         DriverRun<Reader, kFormat> run;
-        kinds.push_back(SightingKinds(run.Set(pyr::kKeyReferences, marking).Set(pyr::kKeyCodesReference, codes).Read(book)));
+        std::string sightings;
+        for (int kind :
+             Kinds(run.Set(pyr::kKeyReferences, marking).Set(pyr::kKeyCodesReference, codes).Read(book)))
+            if (pyr::IsSightingKind(kind)) sightings += std::to_string(kind) + ' ';
+        kinds.push_back(sightings);
         EXPECT_EQ(ReportText(run), "") << marking;
     }
     return kinds;
