@@ -4,6 +4,7 @@
 // set up on a known station so that its Hz are bearings. Each expected value is worked out by hand from
 // the value as written and its unit.
 #include "FieldBookTestSupport.h"
+#include "RadiationCheck.h"
 #include "core/Strings.h"
 #include "fieldbook/LectZeiss.h"
 
@@ -124,8 +125,9 @@ TEST(LectZeiss, ReferencesComeFromSetUpProgramsOrTheSettings) {
                              M5(4, "TI", "POLAR") + "\n" +
                              M5(5, "PI1", Pi("1", "REF"), {{"Hz", "20.0000", "gon"}}) + "\n" +
                              M5(6, "PI1", Pi("2", "ARB"), {{"Hz", "30.0000", "gon"}}) + "\n";
-    EXPECT_EQ((KindsByMarking<CLectZeiss, FieldBookFormat::Zeiss>(text, "ref")),
-              (std::vector<std::string>{"1002 1003 1003 ", "1002 1003 1003 ", "1002 1002 1003 "})); // R1 first
+    EXPECT_EQ(
+        (KindsByMarking<CLectZeiss, FieldBookFormat::Zeiss>(text, "ref")),
+        (std::vector<std::string>{"1002 1003 1003 ", "1002 1003 1003 ", "1002 1002 1003 "})); // R1 first
     ZeissRun run;
     EXPECT_EQ(run.Read(text).v0At(2), kUndefined) << "only a known-station set-up is oriented";
 }
@@ -258,17 +260,9 @@ TEST(LectZeiss, AnM5BookWithoutHeaderHasItsFieldsFoundFromItsPointLines) {
     const Info pointFirst = [](const char* point, const char* code, const char* information) {
         return Sprintf("%12s%5s%-7s", point, code, information);
     };
-    const std::tuple<Info, const char*> cases[] = {
-        {usual, ""},
-        {m3, "Attention : ligne 1 : places du matricule et du code non données par l'en-tête ; d'après les "
-             "lignes de points, matricule lu en colonnes 16 à 27 et code en colonnes 11 à 15 du bloc "
-             "d'information.\n"},
-        {pointFirst,
-         "Attention : ligne 1 : places du matricule et du code non données par l'en-tête ; d'après "
-         "les lignes de points, matricule lu en colonnes 1 à 12 et code en colonnes 13 à 17 du "
-         "bloc d'information.\n"},
-    };
-    for (const auto& [info, message] : cases) {
+    // The wording of the places found is checked with the M3 books below.
+    const std::pair<Info, bool> cases[] = {{usual, false}, {m3, true}, {pointFirst, true}};
+    for (const auto& [info, told] : cases) {
         std::string text =
             M5(1, "PI1", info("ST", "S", ""), {{"X", "0.000", "m"}, {"Y", "0.000", "m"}}) + "\n";
         std::string expected = "1000 Format               = M5; 1001 ST; 1006 ST; ";
@@ -288,8 +282,8 @@ TEST(LectZeiss, AnM5BookWithoutHeaderHasItsFieldsFoundFromItsPointLines) {
         }
         ZeissRun run;
         const CCarnet& read = run.Read(text);
-        EXPECT_EQ(ReportText(run), std::string(message) + "Erreur ligne 55 : donnée non reconnue !\n"
-                                                          " -> Chaîne lue = <bonjour>\n");
+        EXPECT_EQ(ReportHeads(run), std::string(told ? "Attention : ligne 1\n" : "") +
+                                        "Erreur ligne 55\n -> Chaîne lue = <bonjour>\n");
         EXPECT_EQ(ElementsSummary(read), expected);
     }
 
@@ -323,7 +317,8 @@ TEST(LectZeiss, EveryLineIsReadOrReportedWithItsNumber) {
         text += line + "\n";
     ZeissRun run;
     const CCarnet& read = run.Read(text);
-    EXPECT_EQ(ReportHeads(run), "Attention : ligne 1\nErreur ligne 2\n -> Chaîne lue = <" + lines[1].substr(0, 118) +
+    EXPECT_EQ(ReportHeads(run), "Attention : ligne 1\nErreur ligne 2\n -> Chaîne lue = <" +
+                                    lines[1].substr(0, 118) +
                                     ">\nErreur ligne 3\nAttention : ligne 4\nErreur ligne 4\nAttention : "
                                     "ligne 5\nAttention : ligne 6\nErreur ligne 7\nAttention : ligne 8\n"
                                     "Erreur ligne 9\n -> Chaîne lue = <bonjour>\nErreur ligne 10\n");
@@ -338,9 +333,11 @@ TEST(LectZeiss, EveryLayoutAndLineEndGivesTheSameSighting) {
                               {{"SD", "12.345", "m"}, {"Hz", "123.4567", "gon"}, {"V1", "98.7654", "gon"}});
     const std::string r4 = "For R4|9 C1|SD  12.345 m|Hz  123.4567 gon|V1  98.7654 gon|";
     const std::string r5 = "For_R5|Adr 0001|PI1 9 C1|SD 12.345 m|Hz 123.4567 gon|V1 98.7654 gon| ";
-    const std::pair<std::string, const char*> cases[] = {
-        {m5 + "\r", "M5"}, {m5 + "   \n\n", "M5"}, {"\x02" + m5 + "\r\n\x03\r\n\x1a", "M5"},
-        {r4 + "\n", "R4"}, {r5 + "\r\nEND\r\n", "R5"}};
+    const std::pair<std::string, const char*> cases[] = {{m5 + "\r", "M5"},
+                                                         {m5 + "   \n\n", "M5"},
+                                                         {"\x02" + m5 + "\r\n\x03\r\n\x1a", "M5"},
+                                                         {r4 + "\n", "R4"},
+                                                         {r5 + "\r\nEND\r\n", "R5"}};
     for (const auto& [text, layout] : cases) {
         ZeissRun run;
         const CCarnet& read = run.Read(text);
@@ -362,4 +359,41 @@ TEST(LectZeiss, AnAccentedCodeKeepsTheColumnsOfARec500Line) {
     ASSERT_EQ(ElementsSummary(read),
               "1000 Format               = Rec 500; 1000 POLAR; 1001 INCONNUE; 1009 ÉTE; 1003 301; ");
     ExpectValues(read, 4, {kUndefined, 50.5, 99.5, 25.432});
+}
+
+// M5 books of an instrument whose information block holds the information in columns 1-7, the code in
+// 11-15 and the point id in 16-27: zeiss-m3-entete.txt says so in its header (words 20, 21, 22; word 05 = 1,
+// X the northing), zeiss-m3-sans-entete.txt holds the same lines without it. Constructed: known points R1
+// (E 1080, N 2060, Z 101.234) and R2 (E 1130, N 1900, Z 98.765); S1 at E 1000, N 2000, Z 100, HI 1.550, set
+// up on a known station (Hz = bearings), its backsight to R1 written before its station line; S2 at E 1050,
+// N 1950, Z 99.5, HI 1.620, its circle 41.2345 gon short of the bearings, oriented on R2, its backsight also
+// written first; each height given after the start of the polar measurements. The observations were
+// computed from the coordinates and rounded as the instrument writes them (0.1 mgon, mm); the coordinates
+// after each sighting computed apart from this program from the observations as written, to the mm.
+TEST(LectZeiss, AnM3BookRadiatesOntoTheInstrumentsCoordinates) {
+    const std::pair<const char*, const char*> cases[] = {
+        {"zeiss-m3-entete.txt", ""},
+        {"zeiss-m3-sans-entete.txt",
+         "Attention : ligne 1 : places du matricule et du code non données par l'en-tête ; d'après les "
+         "lignes "
+         "de points, matricule lu en colonnes 16 à 27 et code en colonnes 11 à 15 du bloc d'information.\n"},
+    };
+    for (const auto& [file, reports] : cases) {
+        SCOPED_TRACE(file);
+        ZeissRun run;
+        const CCarnet& read = run.Set(kKeyPointsCalcules, "1").ReadFile(file);
+        EXPECT_EQ(ReportText(run), reports);
+        EXPECT_TRUE(ElementsSummary(read).ends_with(
+            "1009 BORNE; 1006 R1; 1009 BORNE; 1006 R2; 1000 KN STAT; 1001 S1; 1006 S1; 1002 R1; 1000 POLAR; "
+            "1009 MUR HAUT; 1003 101; 1006 101; 1009 ARBRE; 1003 102; 1006 102; 1009 MUR; 1003 103; 1006 "
+            "103; "
+            "1000 OR.COOR; 1001 S2; 1006 S2; 1002 R2; 1000 POLAR; 1009 BORNE FER; 1003 201; 1006 201; 1009 "
+            "MUR; "
+            "1003 202; 1006 202; "))
+            << ElementsSummary(read);
+        // The radiation compares heights only where the station has one: its own check first.
+        EXPECT_NEAR(read.hiAt(read.Find(kKindStation, "S1")), 1.55, 1e-4);
+        EXPECT_NEAR(read.hiAt(read.Find(kKindStation, "S2")), 1.62, 1e-4);
+        EXPECT_TRUE(AgreesWithInstrument(read, 7)); // R1, 101, 102, 103 from S1; R2, 201, 202 from S2
+    }
 }
