@@ -1,28 +1,17 @@
 // The computation of an eccentric station, against stations and sightings built from exact coordinates
-// with plain plane trigonometry (not the program's helpers): the instrument stands at E, its horizontal
-// circle reads 0 along the bearing V0, and C, the centre that cannot be occupied, lies a few metres away.
+// (ExactReadings.h): the instrument stands at E, its horizontal circle reads 0 along the bearing V0, and
+// C, the centre that cannot be occupied, lies a few metres away.
+#include "ExactReadings.h"
 #include "calc/EccentricStation.h"
 #include "calc/EccentricTexts.h"
 #include "calc/SessionTexts.h"
 
 #include <array>
-#include <cmath>
-#include <gtest/gtest.h>
 #include <string>
 #include <utility>
 
 namespace pyr::test {
 namespace {
-
-constexpr double kTenthMm = 1e-4;
-constexpr double kHundredthMgon = 1e-5;
-constexpr double kGonPerRadian = 200.0 / 3.14159265358979323846;
-// Curvature and refraction: the line of sight bends down by 0.84 / 12 768 000 m per square metre.
-constexpr double kCurvature = 0.84 / 12768000.0;
-
-struct Place {
-    double x, y, z;
-};
 
 const Place kE{2345.678, 6789.012, 123.456};
 constexpr double kHi = 1.55;
@@ -35,22 +24,10 @@ const Place kRefs[] = {{kE.x + 21.0, kE.y - 28.0, 119.300},
 constexpr double kRefHp[] = {1.30, 1.80, 0.0};
 constexpr double kRefDistances[] = {35.0, 480.0, 2100.0};
 
-// A difference of two angles within [-200, 200] gr.
-double Centred(double grads) {
-    return std::remainder(grads, 400.0);
-}
-
-// What a perfect instrument kHi over E reads on a target hp over p; the line of sight bent by curvature
-// and refraction when `bent` (the sighting on C), straight otherwise (the references, whose altitudes the
-// computation takes without curvature term).
-struct Reading {
-    double ah, av, di, dh;
-};
+// What a perfect instrument over E reads; the line of sight bent by curvature and refraction on C,
+// straight on the references, whose altitudes the computation takes without curvature term.
 Reading Read(const Place& p, double hp, bool bent) {
-    const double dx = p.x - kE.x, dy = p.y - kE.y, horizontal = std::hypot(dx, dy);
-    const double rise = (p.z + hp) - (kE.z + kHi) - (bent ? kCurvature * horizontal * horizontal : 0.0);
-    return {std::fmod(std::atan2(dx, dy) * kGonPerRadian - kV0 + 800.0, 400.0),
-            std::atan2(horizontal, rise) * kGonPerRadian, std::hypot(horizontal, rise), horizontal};
+    return test::Read(kE, kHi, kV0, p, hp, bent);
 }
 
 // The station with the centre C at `offset` from E and its three references; C has an altitude when
@@ -75,13 +52,10 @@ EccentricResult Job(double offsetX, double offsetY, bool centreZ, std::array<dou
     return result;
 }
 
-// Every real of the result is a number: a value or the undefined marker, never NaN or infinity.
 void ExpectAllFinite(const EccentricResult& r) {
-    for (double value : {r.x, r.y, r.v0, r.z, r.z0, r.emqZ})
-        EXPECT_TRUE(std::isfinite(value)) << value;
+    ExpectFinite({r.x, r.y, r.v0, r.z, r.z0, r.emqZ});
     for (const EccentricSighting& s : r.sightings)
-        for (double value : {s.d, s.g, s.v0, s.ev0, s.zi, s.eav})
-            EXPECT_TRUE(std::isfinite(value)) << s.reference << " " << value;
+        ExpectFinite({s.d, s.g, s.v0, s.ev0, s.zi, s.eav});
 }
 
 TEST(EccentricStation, ExactSightingsGiveThePlaceOrientationAndAltitudeBack) {
@@ -94,7 +68,7 @@ TEST(EccentricStation, ExactSightingsGiveThePlaceOrientationAndAltitudeBack) {
             EXPECT_EQ(r.status, "");
             EXPECT_NEAR(r.x, kE.x, kTenthMm);
             EXPECT_NEAR(r.y, kE.y, kTenthMm);
-            EXPECT_NEAR(Centred(r.v0 - kV0), 0.0, kHundredthMgon);
+            EXPECT_NEAR(Gap(r.v0 - kV0), 0.0, kHundredthMgon);
             EXPECT_TRUE(r.v0 >= 0.0 && r.iterations > 1 && r.iterations < 100) << r.v0 << " " << r.iterations;
             for (int i = 0; i < 3; ++i) {
                 EXPECT_NEAR(r.sightings[i].d, kRefDistances[i], kTenthMm);
@@ -120,11 +94,11 @@ TEST(EccentricStation, NoisyDirectionsAreAveragedByDistanceSoTheNearestWeighsLea
     for (int i = 0; i < 3; ++i) {
         const EccentricSighting& s = r.sightings[i];
         const double d = std::hypot(s.x - r.x, s.y - r.y);
-        v0[i] = Centred(std::atan2(s.x - r.x, s.y - r.y) * kGonPerRadian - s.ah - kV0);
+        v0[i] = Gap(std::atan2(s.x - r.x, s.y - r.y) * kGonPerRadian - s.ah - kV0);
         weights += d;
         weighted += d * v0[i];
     }
-    EXPECT_NEAR(Centred(r.v0 - kV0), weighted / weights, kHundredthMgon);
+    EXPECT_NEAR(Gap(r.v0 - kV0), weighted / weights, kHundredthMgon);
     for (int i = 0; i < 3; ++i)
         EXPECT_NEAR(r.sightings[i].ev0, weighted / weights - v0[i], kHundredthMgon) << i;
     // And that place lies dhC from C, on the reverse of the bearing V0 + AH(C).
@@ -135,7 +109,7 @@ TEST(EccentricStation, NoisyDirectionsAreAveragedByDistanceSoTheNearestWeighsLea
     // Close to the mean of the noise weighted by the distances from the true E, -0.35 mgon (E moves by
     // 0.1 mm), far from the -3.2 mgon of a plain mean, which the 10 mgon on the nearest reference would pull.
     const double expected = -(noise[0] * 35.0 + noise[1] * 480.0 + noise[2] * 2100.0) / 2615.0;
-    EXPECT_NEAR(Centred(r.v0 - kV0), expected, 2e-5);
+    EXPECT_NEAR(Gap(r.v0 - kV0), expected, 2e-5);
 }
 
 TEST(EccentricStation, AltitudeFromReferencesWeightedBySensitivityOfZenithAngles) {
