@@ -1,6 +1,7 @@
 // The block of one point in the listing of the intersections, written as plain text and read back: the
 // titles in order, the values with their decimals, X and Y in the surveyor's order, and never the
 // undefined marker or a NaN.
+#include "ExactReadings.h"
 #include "TestSupport.h"
 #include "calc/Intersection.h"
 #include "calc/IntersectionListing.h"
@@ -8,8 +9,7 @@
 #include "settings/ListingObject.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <cmath>
-#include <gtest/gtest.h>
+#include <array>
 #include <string>
 #include <tuple>
 #include <vector>
@@ -17,30 +17,17 @@
 namespace pyr::test {
 namespace {
 
-constexpr double kGonPerRadian = 200.0 / 3.14159265358979323846;
-
 // P12 (1234.567, 5678.901, 112.345) read exactly on 1.3 m targets from three stations, S2 in its second
 // set-up; the zenith angles bend with curvature and refraction, so that every sighting gives 112.345.
 InterResult ThreeStations() {
-    struct {
-        const char* name;
-        int reprise;
-        double x, y, z, hi, v0;
-    } const stations[] = {{"S1", 1, 1000.0, 5000.0, 100.0, 1.55, 123.4567},
-                          {"S2", 2, 1500.0, 5200.0, 120.3, 1.62, 0.0123},
-                          {"S3", 1, 1800.0, 6000.0, 95.2, 1.48, 387.6543}};
+    const KnownStation stations[] = {{"S1", 1000.0, 5000.0, 100.0, 1.55, 123.4567},
+                                     {"S2", 1500.0, 5200.0, 120.3, 1.62, 0.0123},
+                                     {"S3", 1800.0, 6000.0, 95.2, 1.48, 387.6543}};
     InterResult result;
     result.mat = "P12";
-    for (const auto& st : stations) {
-        const double dx = 1234.567 - st.x, dy = 5678.901 - st.y, dh = std::hypot(dx, dy);
-        const double rise = (112.345 + 1.3) - (st.z + st.hi) - 0.84 / 12768000.0 * dh * dh;
-        InterSighting s;
-        s.station = st.name, s.reprise = st.reprise, s.reference = "P12";
-        s.xs = st.x, s.ys = st.y, s.zs = st.z, s.v0 = st.v0, s.hi = st.hi, s.hp = 1.3;
-        s.ah = std::fmod(std::atan2(dx, dy) * kGonPerRadian - st.v0 + 800.0, 400.0);
-        s.av = std::atan2(dh, rise) * kGonPerRadian;
-        s.dh = dh;
-        result.sightings.push_back(s);
+    for (const KnownStation& st : stations) {
+        result.sightings.push_back(SightP(st, {1234.567, 5678.901, 112.345}, 1.3));
+        result.sightings.back().reprise = &st == &stations[1] ? 2 : 1;
     }
     return result;
 }
@@ -105,15 +92,13 @@ TEST_F(IntersectionListing, BothPartsInOrderWithTheirValues) {
     ASSERT_EQ(ComputeIntersection(result, true, true), kInterComputed);
     const auto lines = Lines(Write(result));
 
-    const std::size_t title = Find(lines, "Calcul du point P12");
-    const std::size_t plani = Find(lines, "Calcul en planimétrie", title);
-    const std::size_t approx = Find(lines, "P approché :", plani);
-    const std::size_t computed = Find(lines, "P calculé  :", approx);
-    const std::size_t emq = Find(lines, "EMQ (m)    :", computed);
-    const std::size_t alti = Find(lines, "Calcul en altimétrie", emq);
-    const std::size_t approxZ = Find(lines, "Z approché :", alti);
-    const std::size_t computedZ = Find(lines, "Z calculé  :", approxZ);
-    const std::size_t emqZ = Find(lines, "EMQ (m)    :", computedZ);
+    const char* titles[] = {"Calcul du point P12", "Calcul en planimétrie", "P approché :",
+                            "P calculé  :",        "EMQ (m)    :",          "Calcul en altimétrie",
+                            "Z approché :",        "Z calculé  :",          "EMQ (m)    :"};
+    std::array<std::size_t, 9> at{};
+    for (std::size_t i = 0; i < at.size(); ++i)
+        at[i] = Find(lines, titles[i], i == 0 ? 0 : at[i - 1]);
+    const auto [title, plani, approx, computed, emq, alti, approxZ, computedZ, emqZ] = at;
     ASSERT_NE(emqZ, std::string::npos) << "a title is missing or out of order";
 
     // The sightings' table: S2's row with its reprise, V0, bearing, distance and a nil residual.
@@ -123,8 +108,7 @@ TEST_F(IntersectionListing, BothPartsInOrderWithTheirValues) {
     ASSERT_EQ(s2.size(), 8u);
     EXPECT_EQ(s2[0], "S2            2");
     EXPECT_EQ(s2[2], "0.01230");
-    EXPECT_NEAR(std::stod(s2[4]), std::atan2(1234.567 - 1500.0, 5678.901 - 5200.0) * kGonPerRadian + 400.0,
-                1e-5);
+    EXPECT_NEAR(std::stod(s2[4]), BearingTo(1500.0, 5200.0, 1234.567, 5678.901), 1e-5);
     EXPECT_NEAR(std::stod(s2[5]), std::hypot(1234.567 - 1500.0, 5678.901 - 5200.0), 1e-4);
     EXPECT_EQ(s2[6] + " " + s2[7], "0.0 0.0000");
 
@@ -184,7 +168,7 @@ TEST_F(IntersectionListing, OnlyTheComputedPartsAndUndefinedValuesAsDashes) {
     for (auto [name, x, y] : {std::tuple{"A", 0.0, 0.0}, std::tuple{"B", -62.79, 1.97}}) {
         InterSighting s;
         s.station = name, s.reference = "P13", s.xs = x, s.ys = y, s.v0 = 0.0;
-        s.ah = std::fmod(std::atan2(0.0 - x, 1000.0 - y) * kGonPerRadian + 400.0, 400.0);
+        s.ah = BearingTo(x, y, 0.0, 1000.0);
         weak.sightings.push_back(s);
     }
     ASSERT_EQ(ComputeIntersection(weak, true, true), kInterComputed | kInterTooClose);
