@@ -2,6 +2,8 @@
 // form, the states read back after each one. The GéoBases are built from exact coordinates, so that the
 // points and orientations found are known beforehand.
 #include "TestSupport.h"
+#include "calc/CalcExcentDriver.h"
+#include "calc/CalcExcentForm.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalcIntersForm.h"
 #include "calc/CalculV0Driver.h"
@@ -56,7 +58,8 @@ TEST(ComputationForms, TemplatesAreConsistentAndEveryAcceleratorIsUnique) {
     CCalcIntersDriver intersection;
     CCalculV0Driver v0;
     CReductionDriver reduction;
-    for (ui::Dialog* dialog : std::initializer_list<ui::Dialog*>{&intersection, &v0, &reduction}) {
+    CCalcExcentDriver excent;
+    for (ui::Dialog* dialog : std::initializer_list<ui::Dialog*>{&intersection, &v0, &reduction, &excent}) {
         const auto form = dialog->MakeForm();
         ASSERT_TRUE(form);
         std::set<int> ids{0, ui::kButtonRow};
@@ -224,6 +227,55 @@ TEST(V0Form, StationsOrientedFromTheWindowTheirCoordinatesTypedInTheAxesShown) {
     EXPECT_EQ(x, 1100.0);
     EXPECT_EQ(y, 2100.0);
     EXPECT_NE(ReadBytes(dir / "chantier.cv0").find("Calcul de la station S2, reprise 1"), std::string::npos);
+}
+
+// The station E stands 2 m from C. The nearest point is the centre offered; another one taken for the
+// centre changes the references offered.
+TEST(ExcentForm, TheNearestPointIsTheCentreOfferedAndAnotherOneChangesTheReferences) {
+    using F = CCalcExcentForm;
+    const Place e{1001.2, 2001.6, 98.4};
+    const std::pair<const char*, Place> points[] = {{"B", {1090.0, 1950.0, 97.0}},
+                                                    {"C", {1000.0, 2000.0, 100.0}},
+                                                    {"A", {1060.0, 2080.0, 105.0}},
+                                                    {"D", {940.0, 1930.0, 102.0}}};
+    TempDir dir;
+    const std::string geo = dir / "chantier.geo";
+    CCarnet job;
+    for (const auto& [name, place] : points)
+        AddPoint(job, name, place);
+    AddStation(job, "E", 1.5);
+    // B is read before C, and A for its direction only: no candidate for the centre.
+    for (const auto& [name, place] : points)
+        AddSighting(job, name, e, 1.5, place, 1.3, 37.5);
+    job.As<CVisee>(job.Find(kKindReference, "A"))->setDI(-999999.0);
+    ASSERT_EQ(job.Save(geo), 1);
+
+    CCalcExcentDriver dialog;
+    dialog.SetInputs({geo, dir / "Pyralis.ini", "", ""});
+    ui::ScriptedFrontEnd frontEnd;
+    const auto form = dialog.MakeForm();
+    Person person{*form, frontEnd};
+    ASSERT_TRUE(form->Open(frontEnd));
+    EXPECT_FALSE(person[F::kCentre].enabled);
+    person.Select(F::kSubject, 0);
+    EXPECT_EQ(form->Caption(), "Calcul de la station excentrée E");
+    EXPECT_EQ(person[F::kCentre].items, (std::vector<std::string>{"B", "C", "D"}));
+    EXPECT_EQ(person[F::kCentre].current, 1);
+    EXPECT_EQ(person[F::kAvailable].items, (std::vector<std::string>{"---> B", "---> A", "---> D"}));
+
+    person.Click(F::kAddAll);
+    EXPECT_EQ(person[F::ResultValue(F::kLineFirst)].text, "1001.2000");
+    EXPECT_EQ(person[F::ResultValue(F::kLineSecond)].text, "2001.6000");
+    EXPECT_EQ(person[F::ResultValue(F::kLineV0)].text, FormatFixed(37.5, CStation::DeciAng()));
+    EXPECT_EQ(person[F::ResultValue(F::kLineZ)].text, "98.400");
+    EXPECT_EQ(person[F::ResultEmq(F::kLineZ)].text, "") << "from the centre: no error";
+    EXPECT_TRUE(person[F::kWrite].enabled);
+
+    person.Select(F::kCentre, 0); // B taken for the centre
+    EXPECT_EQ(person[F::kAvailable].items, (std::vector<std::string>{"---> C", "---> A", "---> D"}));
+    EXPECT_TRUE(person[F::kSelected].items.empty());
+    EXPECT_EQ(person[F::ResultValue(F::kLineFirst)].text, "");
+    EXPECT_TRUE(frontEnd.messages.empty());
 }
 
 // Two set-ups on S1, the second one's circle turned back by 5 gr: merged by their common sightings.
