@@ -1,5 +1,6 @@
 // The dialog of points by intersection, driven through its actions on GéoBases built from exact
 // coordinates: P is read exactly from three oriented stations, so the computed point must be P itself.
+#include "IntersectionJob.h"
 #include "TestSupport.h"
 #include "calc/CalcInters.h"
 #include "calc/IntersectionTexts.h"
@@ -7,7 +8,6 @@
 #include "core/Numbers.h"
 #include "core/Strings.h"
 #include "settings/ParamStore.h"
-#include "IntersectionJob.h"
 #include "ui/ScriptedFrontEnd.h"
 
 #include <algorithm>
@@ -109,25 +109,15 @@ TEST_F(Intersection, PointsOfferedThenComputedAgainOnEveryMove) {
 
 // S2 reads P face right; S3 reads it on a target 0.30 m beyond it, the offset written in front.
 TEST_F(Intersection, FaceRightAndEccentricSightingsAreReducedFirst) {
-    auto* s2 = job.As<CVisee>(job.Find(kKindMesure, "P", 6));
+    auto* s2 = job.As<CVisee>(job.Find(kKindMesure, "P", job.findStaRep("S2", 1)));
     s2->setAV(400.0 - s2->av());
     s2->setAH(std::fmod(s2->ah() + 200.0, 400.0));
-    CCarnet rebuilt;
-    for (int i = 0; i < job.GetSize(); ++i) {
-        if (job.GetType(i) == kKindMesure && job.matAt(i) == "P" && job.findStaRep("S3", 1) == i - 1) {
-            rebuilt.Add(std::make_unique<CCommande>("ExcentRad", "-0.3"), kKindExcentrement);
-            const double horizontal = std::hypot(kP.x - kS3.x, kP.y - kS3.y) + 0.30;
-            auto sighting = job.copyElement(i);
-            auto* visee = static_cast<CVisee*>(sighting.get());
-            const double rise = (kP.z + 1.3) - (kS3.z + 1.45) - 0.84 / 12768000.0 * horizontal * horizontal;
-            visee->setAV(std::atan2(horizontal, rise) * kGonPerRadian);
-            visee->setDI(std::hypot(horizontal, rise));
-            rebuilt.Add(std::move(sighting), kKindMesure);
-            continue;
-        }
-        rebuilt.Add(job.copyElement(i), job.GetType(i));
-    }
-    job = std::move(rebuilt);
+    const int s3 = job.Find(kKindMesure, "P", job.findStaRep("S3", 1));
+    const double horizontal = std::hypot(kP.x - kS3.x, kP.y - kS3.y) + 0.30;
+    const double rise = (kP.z + 1.3) - (kS3.z + 1.45) - 0.84 / 12768000.0 * horizontal * horizontal;
+    job.As<CVisee>(s3)->setAV(std::atan2(horizontal, rise) * kGonPerRadian);
+    job.As<CVisee>(s3)->setDI(std::hypot(horizontal, rise));
+    job.InsertAt(s3, std::make_unique<CCommande>("ExcentRad", "-0.3"), kKindExcentrement);
     ASSERT_TRUE(Open());
     ASSERT_TRUE(dialog.ChoosePoint("P"));
     dialog.AddAll();
