@@ -1,5 +1,5 @@
-// Lengths of field books brought to metres (1 ft = 0.3048 m by definition of the international foot), and
-// sightings given by their horizontal distance. The angle units are tested with the core.
+// Sightings given by their horizontal distance. Feet are brought to metres in every reader's tests, the
+// angle units with the core.
 #include "core/Undefined.h"
 #include "fieldbook/FieldBookUnits.h"
 
@@ -10,12 +10,6 @@ using namespace pyr;
 namespace {
 constexpr double kMgon = 1e-4; // 0.1 mgon, in grads
 } // namespace
-
-TEST(FieldBookUnits, LengthsToMetres) {
-    EXPECT_NEAR(ToMetres(100.0, DistanceUnit::Feet), 30.48, 1e-4);
-    EXPECT_EQ(ToMetres(12.345, DistanceUnit::Metres), 12.345);
-    EXPECT_EQ(ToMetres(kUndefined, DistanceUnit::Feet), kUndefined);
-}
 
 // A 3-4-5 triangle: 4 m horizontally and 3 m up from the tilting axis is 5 m of slope, at a zenith angle
 // of atan2(4, 3) = 53.13010235° = 59.0334470 gr; sin(59.0334470 gr) = 0.8, so 4 m at that angle is 5 m.
