@@ -19,24 +19,17 @@ constexpr double k12d30m45s = 125.125 / 9.0; // gr
 } // namespace
 
 TEST(AngleUnits, SexagesimalTextIsReadDigitByDigit) {
-    const struct {
-        const char* text;
-        double degrees;
-    } cases[] = {
-        {"12.3045", 12.0 + 30.0 / 60 + 45.0 / 3600},
-        {"0.0001", 1.0 / 3600},
-        {"359.5959", 359.0 + 59.0 / 60 + 59.0 / 3600},
-        {"12.30451", 12.0 + 30.0 / 60 + 45.1 / 3600},
-        {"-45.3", -45.5},
-        {"90", 90.0},
-        {"12.305", 12.0 + 30.0 / 60 + 50.0 / 3600},
-        {" +7.0030 ", 7.0 + 30.0 / 3600},
-    };
-    for (const auto& c : cases) {
+    // clang-format off
+    const std::pair<const char*, double> cases[] = {
+        {"12.3045", 12.0 + 30.0 / 60 + 45.0 / 3600}, {"0.0001", 1.0 / 3600}, {"-45.3", -45.5}, {"90", 90.0},
+        {"359.5959", 359.0 + 59.0 / 60 + 59.0 / 3600}, {"12.30451", 12.0 + 30.0 / 60 + 45.1 / 3600},
+        {"12.305", 12.0 + 30.0 / 60 + 50.0 / 3600}, {" +7.0030 ", 7.0 + 30.0 / 3600}};
+    // clang-format on
+    for (const auto& [text, expected] : cases) {
         double degrees = 0;
-        ASSERT_TRUE(DmsTextToDegrees(c.text, degrees)) << c.text;
-        EXPECT_NEAR(degrees, c.degrees, kArcSecond) << c.text;
-        EXPECT_NEAR(DmsToDegrees(std::stod(c.text)), c.degrees, kArcSecond) << c.text;
+        ASSERT_TRUE(DmsTextToDegrees(text, degrees)) << text;
+        EXPECT_NEAR(degrees, expected, kArcSecond) << text;
+        EXPECT_NEAR(DmsToDegrees(std::stod(text)), expected, kArcSecond) << text;
     }
     for (const char* bad : {"12°30", "", "-", "abc", "1e5"}) {
         double ignored = 0;
@@ -72,9 +65,7 @@ TEST(AngleUnits, ConversionsGiveTheValuesComputedByHand) {
     EXPECT_NEAR(ToGrads(12.3045, AngleUnit::Dms), k12d30m45s, 1e-12);
     EXPECT_NEAR(ToGrads(180.3, AngleUnit::Dms), 200.5556, kMgon); // 180° 30' = 180.5°
     EXPECT_EQ(FromGrads(k12d30m45s, AngleUnit::Dms), 12.3045);    // the nearest double to the text
-    EXPECT_EQ(FromGrads(50.0, AngleUnit::Dms), 45.0);
-    EXPECT_EQ(FromGrads(-50.0, AngleUnit::Degrees), -45.0);
-    EXPECT_EQ(FromGrads(0.0625, AngleUnit::Mils), 1.0);
+    EXPECT_EQ(FromGrads(50.0, AngleUnit::Dms), 45.0); // the other units come back through the round trips
 }
 
 // The undefined value is a marker, not an angle: no unit changes it, written out it reads back as itself.
@@ -94,8 +85,10 @@ TEST(AngleUnits, AngleTextInEveryUnit) {
         AngleUnit unit;
         double grads;
     } cases[] = {
-        {"123.4567", AngleUnit::Grads, 123.4567}, {"45", AngleUnit::Degrees, 50.0},
-        {"-12.3045", AngleUnit::Dms, -k12d30m45s}, {"0.5", AngleUnit::Mils, 0.03125},
+        {"123.4567", AngleUnit::Grads, 123.4567},
+        {"45", AngleUnit::Degrees, 50.0},
+        {"-12.3045", AngleUnit::Dms, -k12d30m45s},
+        {"0.5", AngleUnit::Mils, 0.03125},
     };
     for (const auto& c : cases) {
         double grads = 0;

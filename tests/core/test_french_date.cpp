@@ -9,12 +9,8 @@ namespace {
 
 std::tm Date(int year, int month, int day, int weekday, int hour, int minute) {
     std::tm when{};
-    when.tm_year = year - 1900;
-    when.tm_mon = month - 1;
-    when.tm_mday = day;
-    when.tm_wday = weekday;
-    when.tm_hour = hour;
-    when.tm_min = minute;
+    when.tm_year = year - 1900, when.tm_mon = month - 1, when.tm_mday = day;
+    when.tm_wday = weekday, when.tm_hour = hour, when.tm_min = minute;
     return when;
 }
 
