@@ -10,22 +10,13 @@ namespace {
 
 TEST(ProjectionNames, EachWayOfWritingANameGivesItsSystem) {
     // The EPSG codes of the registry; 0 is "Aucune". Every offered name is checked below besides.
+    // clang-format off
     const std::pair<const char*, int> cases[] = {
-        {"  aucune ", 0},
-        {"", 0},
-        {"LAMBERT-93", 2154},
-        {"l93", 2154},
-        {"cc 42", 3942},
-        {"Lambert CC50", 3950},
-        {"Lambert_IV_carto", 27574},
-        {"LAMBERT II ÉTENDU", 27572},
-        {"Lambert 2 etendu", 27572},
-        {"Lambert IIe", 27572},
-        {"Lambert 3 sud", 27563},
-        {"utm 20 nord", 32620},
-        {"UTM 1S", 32701},
-        {"epsg : 3946", 3946},
-    };
+        {"  aucune ", 0}, {"", 0}, {"LAMBERT-93", 2154}, {"l93", 2154}, {"cc 42", 3942}, {"Lambert CC50", 3950},
+        {"Lambert_IV_carto", 27574}, {"LAMBERT II ÉTENDU", 27572}, {"Lambert 2 etendu", 27572},
+        {"Lambert IIe", 27572}, {"Lambert 3 sud", 27563}, {"utm 20 nord", 32620}, {"UTM 1S", 32701},
+        {"epsg : 3946", 3946}};
+    // clang-format on
     for (const auto& [name, epsg] : cases) {
         const ProjectionName resolved = ResolveProjectionName(name);
         EXPECT_EQ(resolved.error, "") << name;
