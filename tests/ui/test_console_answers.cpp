@@ -3,11 +3,8 @@
 #include "TestSupport.h"
 #include "ui/ConsoleFrontEnd.h"
 
-#include <cstdio>
 #include <deque>
 #include <gtest/gtest.h>
-#include <string>
-#include <vector>
 
 using namespace pyr;
 using ui::Answer;

@@ -3,10 +3,7 @@
 #include "ui/DialogCommandLine.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <cstdio>
 #include <gtest/gtest.h>
-#include <string>
-#include <vector>
 
 using namespace pyr;
 using Kind = ui::CommandLineOutcome::Kind;

@@ -1,9 +1,7 @@
 #include "TestSupport.h"
 #include "ui/ConsoleFrontEnd.h"
 
-#include <cstdio>
 #include <gtest/gtest.h>
-#include <string>
 
 namespace {
 

@@ -3,9 +3,7 @@
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <cstdio>
 #include <gtest/gtest.h>
-#include <string>
 
 using namespace pyr;
 
