@@ -3,7 +3,6 @@
 #include "geobase/Carnet.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <cstdio>
 #include <gtest/gtest.h>
 #include <memory>
 #include <tuple>

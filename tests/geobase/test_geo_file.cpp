@@ -5,7 +5,6 @@
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
 

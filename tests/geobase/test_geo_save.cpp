@@ -7,11 +7,8 @@
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <algorithm>
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
 using namespace pyr;
 
@@ -24,9 +21,8 @@ constexpr const char* kRawBook = "410001+0000STA1 42....+00001.55 \r\n"
 
 std::string RefusedForeign(const std::string& path) {
     return "Impossible d'enregistrer la GéoBase sous\n" + path +
-           " !\nCe fichier n'est pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase sous "
-           "un "
-           "autre nom.";
+           " !\nCe fichier n'est pas une GéoBase : il est laissé tel qu'il est.\n"
+           "Enregistrez la GéoBase sous un autre nom.";
 }
 
 // A job of `count` known points, about 40 bytes a line.
@@ -50,10 +46,7 @@ protected:
 } // namespace
 
 TEST_F(GeoSave, AFileIsForeignWhenWithoutHeaderMoreThanHalfOfItsLinesAreUnreadable) {
-    const struct {
-        const char* text;
-        bool foreign;
-    } cases[] = {
+    const std::pair<std::string, bool> cases[] = {
         {"", false},                                              // nothing to lose
         {" \n\t\n\n", false},                                     // blanks only
         {"410001+0000STA1\n", true},                              // one line, unreadable
@@ -67,25 +60,22 @@ TEST_F(GeoSave, AFileIsForeignWhenWithoutHeaderMoreThanHalfOfItsLinesAreUnreadab
         {"Op\xE9rateur : Lef\xE8vre\nLev\xE9 du 3 mars\n", true}, // a Windows-1252 text
         {"1000\tLev\xE9\n1006\tP1\t1\t2\t3\t-\nfin\n", false},    // an old GéoBase without header
     };
-    for (const auto& c : cases) {
-        const std::string text = c.text;
-        EXPECT_EQ(TakeGeoFileCensus(text).IsForeign(), c.foreign) << text;
+    for (const auto& [text, foreign] : cases) {
+        EXPECT_EQ(TakeGeoFileCensus(text).IsForeign(), foreign) << text;
 
         // Loaded: the store knows it, and refuses to save over it without reading it again.
         WriteBytes(path, text);
         CCarnet loaded;
         ASSERT_EQ(loaded.Load(&txt, path), 1);
-        EXPECT_EQ(loaded.LoadedFileIsForeign(), c.foreign) << text;
-        EXPECT_EQ(loaded.Save(path, &fe), c.foreign ? 0 : 1) << text;
-        if (c.foreign) {
-            EXPECT_EQ(ReadBytes(path), text);
-        }
+        EXPECT_EQ(loaded.LoadedFileIsForeign(), foreign) << text;
+        EXPECT_EQ(loaded.Save(path, &fe), foreign ? 0 : 1) << text;
+        EXPECT_TRUE(!foreign || ReadBytes(path) == text) << "a foreign file is left as it was";
 
         // Saved over by another store: it looks at the file, and comes to the same answer.
         WriteBytes(path, text);
         CCarnet other = Points(1);
-        EXPECT_EQ(other.Save(path, &fe), c.foreign ? 0 : 1) << text;
-        EXPECT_EQ(ReadBytes(path) == text, c.foreign) << text;
+        EXPECT_EQ(other.Save(path, &fe), foreign ? 0 : 1) << text;
+        EXPECT_EQ(ReadBytes(path) == text, foreign) << text;
     }
 }
 
