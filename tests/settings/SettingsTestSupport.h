@@ -1,6 +1,7 @@
 #pragma once
 
 #include "TestSupport.h"
+#include "geobase/Elements.h"
 #include "settings/IniFileStore.h"
 #include "settings/ParamStore.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -48,9 +49,13 @@ protected:
         ResetParamErrorMemory();
         ForgetUnreadableParamFiles();
     }
+    // The store's decimals and axis order are class-wide, set by reading the options: every test leaves
+    // them as a fresh program has them.
     ~SettingsTest() override {
         ResetParamErrorMemory();
         ForgetUnreadableParamFiles();
+        SetStoreDecimals(4, 3, 5);
+        CPointGen::setSwapXY(false);
     }
 
     // The texts of the messages shown, each checked to be captioned "PYRALIS" with that icon.

@@ -1,9 +1,7 @@
 #include "SettingsTestSupport.h"
-#include "geobase/Elements.h"
 #include "settings/CalcOptions.h"
 #include "settings/OptionPages.h"
 
-#include <algorithm>
 #include <regex>
 
 namespace pyr {
@@ -13,12 +11,6 @@ using Words = std::vector<std::string>;
 
 class CalcOptions : public test::SettingsTest {
 protected:
-    // The store's settings are class-wide: every test leaves them as a fresh program has them.
-    ~CalcOptions() override {
-        SetStoreDecimals(4, 3, 5);
-        CPointGen::setSwapXY(false);
-    }
-
     COptionPSheet Sheet() const {
         COptionPSheet sheet;
         sheet.SetInputs({"", path, "", "options des calculs topométriques."});

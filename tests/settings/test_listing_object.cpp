@@ -1,15 +1,10 @@
 #include "SettingsTestSupport.h"
 #include "core/Strings.h"
 #include "core/Undefined.h"
-#include "geobase/Elements.h"
 #include "settings/ListingObject.h"
 
 #include <clocale>
-#include <cstdio>
-#include <gtest/gtest.h>
-#include <string>
 #include <utility>
-#include <vector>
 
 namespace pyr::test {
 namespace {
@@ -72,18 +67,12 @@ TEST_F(ListingObject, TitleIsFramedAndCentredInCharactersNotBytes) {
 }
 
 TEST_F(ListingObject, NumbersFollowTheStoreDecimalsAndNeverShowTheUndefinedMarker) {
-    const int savedXY = CPointGen::DeciXY(), savedZ = CPointGen::DeciZ(), savedAng = CStation::DeciAng();
-    CPointGen::setDeciXY(2);
-    CPointGen::setDeciZ(3);
-    CStation::setDeciAng(4);
+    SetStoreDecimals(2, 3, 4);
     EXPECT_EQ(listing.FormatCoor(1234.5678), "1234.57");
     EXPECT_EQ(listing.FormatAlti(101.23456), "101.235");
     EXPECT_EQ(listing.FormatAngl(123.456789), "123.4568");
     listing.SetDeciCoor(4);
     EXPECT_EQ(listing.FormatCoor(1234.5678), "1234.5678");
-    CPointGen::setDeciXY(savedXY);
-    CPointGen::setDeciZ(savedZ);
-    CStation::setDeciAng(savedAng);
 
     for (const std::string& text :
          {listing.FormatCoor(kUndefined), listing.FormatAlti(kUndefined), listing.FormatDist(kUndefined),
