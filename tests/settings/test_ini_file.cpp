@@ -2,9 +2,6 @@
 #include "core/TextEncoding.h"
 #include "settings/IniFileStore.h"
 
-#include <algorithm>
-#include <gtest/gtest.h>
-
 namespace pyr {
 namespace {
 
@@ -99,27 +96,25 @@ TEST(IniFile, AnyBytesReadBackExactlyWhileTheFileStaysUtf8Text) {
         "  blancs\t",                             // blanks around
         "\xED\xA0\x80 \xF4\x90\x80\x80 \xC0\xAF", // a surrogate, past U+10FFFF, an overlong '/'
     };
-    const struct {
-        const char* bytes;
-        long lines;
-    } files[] = {{"[GeoBase]\nDerniere=x\n", 2}, {"[GeoBase]\r\nNote=Relev\xE9\r\n", 3}};
-    for (const auto& file : files) {
+    // A UTF-8 file and a Windows-1252 one, with their count of lines.
+    for (const auto& [file, lines] :
+         {std::pair{"[GeoBase]\nDerniere=x\n", 2}, {"[GeoBase]\r\nNote=Relev\xE9\r\n", 3}}) {
         for (const std::string& value : values) {
             IniFile ini;
-            ini.Parse(file.bytes);
+            ini.Parse(file);
             ini.Set("GeoBase", "Derniere", value);
             EXPECT_EQ(Value(ini, "GeoBase", "Derniere"), value);
             const std::string bytes = ini.Bytes();
-            EXPECT_EQ(std::count(bytes.begin(), bytes.end(), '\n'), file.lines) << bytes;
+            EXPECT_EQ(std::count(bytes.begin(), bytes.end(), '\n'), lines) << bytes;
             EXPECT_EQ(bytes.find('\0'), std::string::npos) << bytes;
             IniFile again;
             again.Parse(bytes);
             EXPECT_EQ(Value(again, "GeoBase", "Derniere"), value) << bytes;
-            EXPECT_EQ(Value(again, "GeoBase", "Note"), file.lines == 3 ? "Relevé" : "<absent>");
+            EXPECT_EQ(Value(again, "GeoBase", "Note"), lines == 3 ? "Relevé" : "<absent>");
             EXPECT_EQ(again.Bytes(), bytes);
         }
         IniFile latin1;
-        latin1.Parse(file.bytes);
+        latin1.Parse(file);
         latin1.Set("GeoBase", "Derniere", values[0]);
         EXPECT_TRUE(IsValidUtf8(latin1.Bytes())) << "else read whole as Windows-1252 next time";
     }

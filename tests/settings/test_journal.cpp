@@ -5,8 +5,6 @@
 #include "core/Undefined.h"
 #include "settings/Journal.h"
 
-#include <gtest/gtest.h>
-
 namespace {
 
 using namespace pyr;

@@ -3,12 +3,7 @@
 #include "core/Strings.h"
 #include "settings/ListingFlow.h"
 
-#include <algorithm>
-#include <filesystem>
-#include <gtest/gtest.h>
 #include <set>
-#include <string>
-#include <vector>
 
 namespace pyr::test {
 namespace {
@@ -62,25 +57,23 @@ TEST_F(ListingFlow, AListingThatCannotBeWrittenIsReportedAndLeavesTheOldOneWhole
     geobase = folder / "chantier.geo";
     const std::string listingPath = folder / "chantier.cin";
     const std::string yesterday = "listing d'hier\n";
-    const struct {
-        int format;
-        ui::Answer answer; // to "complete the listing?"
-    } cases[] = {{1, ui::Answer::Yes}, {1, ui::Answer::No}, {0, ui::Answer::Yes}};
-    for (const auto& c : cases) {
-        Options(false, true, true, c.format);
-        const std::string target = c.format == 0 ? folder / "chantier.rtf" : listingPath;
+    // The format, and the answer to "complete the listing?".
+    for (const auto& [format, answer] :
+         {std::pair{1, ui::Answer::Yes}, {1, ui::Answer::No}, {0, ui::Answer::Yes}}) {
+        Options(false, true, true, format);
+        const std::string target = format == 0 ? folder / "chantier.rtf" : listingPath;
         WriteBytes(target, yesterday);
         const int status = InChildWithFileSizeLimit(600, [&] {
             frontEnd.ResetFailures();
             frontEnd.messages.clear();
-            frontEnd.answers = {c.answer};
+            frontEnd.answers = {answer};
             const bool reported = Write(ListingKind::Intersection, 3, false).empty() &&
                                   frontEnd.Failures() == 1 && frontEnd.shownFiles.empty() &&
                                   frontEnd.messages.back().text == FileWriteFailure(target, EFBIG);
             return reported ? 0 : 1;
         });
-        EXPECT_EQ(status, 0) << "format " << c.format << ": not failed, or not reported";
-        EXPECT_EQ(ReadBytes(target), yesterday) << "format " << c.format;
+        EXPECT_EQ(status, 0) << "format " << format << ": not failed, or not reported";
+        EXPECT_EQ(ReadBytes(target), yesterday) << "format " << format;
         std::filesystem::remove(target);
     }
     EXPECT_EQ(std::distance(std::filesystem::directory_iterator(folder.Root()), {}), 1) << "no copy left";

@@ -2,11 +2,6 @@
 #include "core/TextEncoding.h"
 #include "settings/ListingFlow.h"
 
-#include <cstdio>
-#include <cstdlib>
-#include <gtest/gtest.h>
-#include <string>
-
 namespace pyr::test {
 namespace {
 

@@ -6,7 +6,6 @@
 #include "settings/RegistryStore.h"
 
 #include <clocale>
-#include <cstdio>
 #include <tuple>
 
 namespace pyr {
@@ -193,18 +192,15 @@ TEST_F(ParamStore, AFileThatIsNotTextGivesTheDefaultsIsNamedOnceAndIsSetAsideWho
 TEST_F(ParamStore, AFileNameInAnyEncodingComesBackByteForByteInEveryFormOfTheStore) {
     const std::string name = folder / "relev\xE9.geo";
     WriteBytes(folder / "windows.ini", "[GeoBase]\r\nNote=Relev\xE9\r\n");
-    const struct {
-        std::string params;
-        std::string file;
-    } stores[] = {{path, path},
-                  {folder / "windows.ini", folder / "windows.ini"},
-                  {"HKEY_CURRENT_USER", folder / "registre/HKEY_CURRENT_USER.ini"}};
-    for (const auto& store : stores) {
-        ASSERT_TRUE(WriteParamString(store.params, "GeoBase", "Derniere", name)) << store.params;
+    // The store as it is named, and the file that holds it.
+    for (const auto& [params, file] : {std::pair<std::string, std::string>{path, path},
+                                       {folder / "windows.ini", folder / "windows.ini"},
+                                       {"HKEY_CURRENT_USER", folder / "registre/HKEY_CURRENT_USER.ini"}}) {
+        ASSERT_TRUE(WriteParamString(params, "GeoBase", "Derniere", name)) << params;
         std::string read;
-        ReadParamString(store.params, "GeoBase", "Derniere", "", read);
-        EXPECT_EQ(read, name) << store.params;
-        EXPECT_TRUE(IsValidUtf8(ReadBytes(store.file))) << ReadBytes(store.file);
+        ReadParamString(params, "GeoBase", "Derniere", "", read);
+        EXPECT_EQ(read, name) << params;
+        EXPECT_TRUE(IsValidUtf8(ReadBytes(file))) << ReadBytes(file);
     }
     std::string note;
     ReadParamString(folder / "windows.ini", "GeoBase", "Note", "", note);
