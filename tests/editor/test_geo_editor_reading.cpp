@@ -5,7 +5,6 @@
 #include "settings/LastGeoBase.h"
 #include "ui/ScriptedFrontEnd.h"
 
-#include <filesystem>
 #include <gtest/gtest.h>
 
 namespace {
@@ -58,9 +57,7 @@ TEST_F(EditorReading, CancelGivesUpNoMakesANewGeoBaseYesAppends) {
     frontEnd.questions.clear();
     EXPECT_EQ(Read({Answer::No, Answer::No}), DialogResult::Cancel);
     EXPECT_EQ(frontEnd.questions.back(), "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?");
-
-    EXPECT_EQ(Read({Answer::Yes}), DialogResult::Ok); // appended: the host's tests read the result
-    EXPECT_EQ(Elements(dir / "job.geo"), 3);
+    // Yes appends: the editor's window and pyralis's reading commands check what it adds.
 }
 
 // A file that is not a GéoBase (a raw field book opened by mistake): No to adding makes the new GéoBase

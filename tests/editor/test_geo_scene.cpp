@@ -9,6 +9,7 @@
 #include <gtest/gtest.h>
 #include <memory>
 #include <set>
+#include <tuple>
 
 namespace {
 
@@ -17,18 +18,19 @@ using pyr::GeoScene;
 using pyr::GroundRect;
 using pyr::SceneHit;
 
-void Point(CCarnet& carnet, const char* name, double x, double y, double z, bool invariant = false) {
+void Point(CCarnet& carnet, const std::string& name, double x, double y, double z, bool invariant = false) {
     auto point = std::make_unique<pyr::CPointGen>(name, x, y, z);
     point->setInvariantXY(invariant);
     carnet.Add(std::move(point), pyr::kKindPoint);
 }
-void Station(CCarnet& carnet, const char* name, double hi, double v0 = pyr::kUndefined) {
+void Station(CCarnet& carnet, const std::string& name, double hi, double v0 = pyr::kUndefined) {
     carnet.Add(std::make_unique<pyr::CStation>(name, hi, v0), pyr::kKindStation);
 }
-void Reference(CCarnet& carnet, const char* target) {
+// The readings do not matter: the view draws a sighting from its station to its target's place.
+void Reference(CCarnet& carnet, const std::string& target) {
     carnet.Add(std::make_unique<pyr::CReference>(target, 1.3, 0.0, 100.0, 10.0), pyr::kKindReference);
 }
-void Measure(CCarnet& carnet, const char* target) {
+void Measure(CCarnet& carnet, const std::string& target) {
     carnet.Add(std::make_unique<pyr::CMesure>(target, 1.3, 0.0, 100.0, 10.0), pyr::kKindMesure);
 }
 void Traverse(CCarnet& carnet, const char* name, std::initializer_list<const char*> stations, bool closed) {
@@ -78,10 +80,8 @@ TEST(GeoScene, DrawsWhatIsPlacedAndCountsWhatIsNot) {
     const GeoScene scene(SmallJob());
 
     const GroundRect& extent = scene.Extent();
-    EXPECT_EQ(extent.minX, 1000.0);
-    EXPECT_EQ(extent.minY, 2000.0);
-    EXPECT_EQ(extent.maxX, 1100.0);
-    EXPECT_EQ(extent.maxY, 2200.0);
+    EXPECT_EQ(std::tie(extent.minX, extent.minY, extent.maxX, extent.maxY),
+              std::make_tuple(1000.0, 2000.0, 1100.0, 2200.0));
 
     // Points: those with a planimetry, once each; known (invariant) and computed told apart.
     ASSERT_EQ(scene.Points().size(), 5u);
@@ -89,8 +89,7 @@ TEST(GeoScene, DrawsWhatIsPlacedAndCountsWhatIsNot) {
     const pyr::ScenePoint* p1 = FindPoint(scene, "P1");
     ASSERT_NE(p1, nullptr);
     EXPECT_FALSE(p1->known);
-    EXPECT_EQ(p1->x, 1100.0);
-    EXPECT_EQ(p1->z, 49.0);
+    EXPECT_EQ(std::tie(p1->x, p1->z), std::make_tuple(1100.0, 49.0));
     EXPECT_EQ(FindPoint(scene, "P2"), nullptr);
     EXPECT_EQ(FindPoint(scene, "S9"), nullptr);
     EXPECT_TRUE(FindPoint(scene, "S1")->stationHere);
@@ -102,8 +101,7 @@ TEST(GeoScene, DrawsWhatIsPlacedAndCountsWhatIsNot) {
         designations.push_back(station.designation);
     EXPECT_EQ(designations, (std::vector<std::string>{"S1", "S1(2)", "S2", "S3"}));
     EXPECT_EQ(scene.UnplacedStations(), 1);
-    EXPECT_EQ(scene.Stations()[1].x, 1000.0);
-    EXPECT_EQ(scene.Stations()[1].y, 2100.0);
+    EXPECT_EQ(std::tie(scene.Stations()[1].x, scene.Stations()[1].y), std::make_tuple(1000.0, 2100.0));
 
     // Sightings: S1 to A1 (reference) and P1 (measure), S1(2) to S2 (reference). Undrawn: the one before any
     // station, those to P2 (no planimetry) and X99 (no point), the one from S9.
@@ -163,28 +161,22 @@ TEST(GeoScene, PicksTheNearestWithinTheToleranceAndDescribesIt) {
 // horizontal segments across many cells.
 TEST(GeoScene, AWindowHoldsExactlyThePointsInItAndEverySegmentCrossingIt) {
     CCarnet carnet;
+    const auto grid = [](int i, int j) { return "P" + std::to_string(i * 60 + j); };
     for (int i = 0; i < 60; ++i)
-        for (int j = 0; j < 60; ++j) {
-            const std::string name = "P" + std::to_string(i * 60 + j);
-            Point(carnet, name.c_str(), 500000.0 + i * 10.0, 6000000.0 + j * 10.0, 100.0);
-        }
+        for (int j = 0; j < 60; ++j)
+            Point(carnet, grid(i, j), 500000.0 + i * 10.0, 6000000.0 + j * 10.0, 100.0);
     for (int bi = 0; bi < 10; ++bi)
         for (int bj = 0; bj < 10; ++bj) {
-            const std::string centre = "P" + std::to_string((bi * 6 + 3) * 60 + bj * 6 + 3);
-            Station(carnet, centre.c_str(), 1.5);
+            Station(carnet, grid(bi * 6 + 3, bj * 6 + 3), 1.5);
             for (int i = bi * 6; i < bi * 6 + 6; ++i)
-                for (int j = bj * 6; j < bj * 6 + 6; ++j) {
-                    const std::string target = "P" + std::to_string(i * 60 + j);
-                    Measure(carnet, target.c_str());
-                }
+                for (int j = bj * 6; j < bj * 6 + 6; ++j)
+                    Measure(carnet, grid(i, j));
         }
     Point(carnet, "W", 499400.0, 6000233.0, 100.0);
     for (const char* far : {"P0", "W"}) {
         Station(carnet, far, 1.5);
-        for (int k = 0; k < 3600; k += 7) {
-            const std::string target = "P" + std::to_string(k);
-            Reference(carnet, target.c_str());
-        }
+        for (int k = 0; k < 3600; k += 7)
+            Reference(carnet, "P" + std::to_string(k));
     }
     const GeoScene scene(carnet);
     ASSERT_EQ(scene.Sightings().size(), 3600u + 2 * 515u);
