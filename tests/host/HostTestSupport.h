@@ -16,6 +16,7 @@
 #include <sstream>
 #include <string>
 #include <sys/resource.h>
+#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 #include <vector>
@@ -96,6 +97,33 @@ inline Outcome RunPyralis(const std::filesystem::path& folder, const std::string
     std::filesystem::remove(err);
     return outcome;
 }
+
+// A test that runs pyralis as a script does, in a folder of its own.
+class PyralisTest : public ::testing::Test {
+protected:
+    Outcome Run(const std::string& arguments, rlim_t fileSizeLimit = RLIM_INFINITY) {
+        return RunPyralis(dir.Root(), arguments, "", fileSizeLimit);
+    }
+    // The small job whose stations orient, under that name in the test's folder; its bytes.
+    std::string Demo(const std::string& name) {
+        std::filesystem::copy_file(std::string(PYR_SOURCE_DIR) + "/data/chantier-demo.geo", dir / name);
+        return ReadBytes(dir / name);
+    }
+    // The GéoBase chantier.geo a command left.
+    pyr::CCarnet Saved() const { return SavedGeoBase(dir / "chantier.geo"); }
+    // `command` asked to save into chantier.geo made read-only fails, names it and leaves it as it was.
+    // Root writes into a read-only file: the tests that check this run again as an unprivileged person.
+    void ExpectReadOnlyGeoBaseKept(const std::string& command) {
+        const std::string before = ReadBytes(dir / "chantier.geo");
+        ASSERT_EQ(chmod((dir / "chantier.geo").c_str(), 0444), 0);
+        const Outcome outcome = Run(command);
+        EXPECT_EQ(outcome.status, 1);
+        EXPECT_TRUE(Has(outcome.err, "chantier.geo")) << outcome.err;
+        EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
+    }
+
+    TempDir dir;
+};
 
 inline pyr::host::CPyrMainServices* RegisteredServices() {
     return static_cast<pyr::host::CPyrMainServices*>(
