@@ -3,10 +3,6 @@
 // backup as they were, and the surveyor's own files beside it are never touched.
 #include "HostTestSupport.h"
 
-#include <filesystem>
-#include <gtest/gtest.h>
-#include <sys/stat.h>
-
 namespace {
 
 // Two small Wild GSI-8 books: a station and its sightings.
@@ -15,14 +11,7 @@ constexpr const char* kWildBook = "410001+0000STA1 42....+00001.55 \r\n"
                                   "110003+00000002 21.102+05000000 22.102+09500000 31..00+00030000 \r\n";
 constexpr const char* kOtherWildBook = "410001+0000STA2 42....+00001.62 \r\n"
                                        "110002+0000STA1 21.102+20000000 22.102+10000000 31..00+00050000 \r\n";
-class GeoBaseSafety : public ::testing::Test {
-protected:
-    Outcome Run(const std::string& arguments, rlim_t limit = RLIM_INFINITY) {
-        return RunPyralis(dir.Root(), arguments, "", limit);
-    }
-
-    TempDir dir;
-};
+using GeoBaseSafety = PyralisTest;
 
 TEST_F(GeoBaseSafety, TheEditorNeverWritesAGeoBaseOverARawFieldBookNorOverItsBackup) {
     WriteBytes(dir / "carnet.gsi", kWildBook);
@@ -33,19 +22,14 @@ TEST_F(GeoBaseSafety, TheEditorNeverWritesAGeoBaseOverARawFieldBookNorOverItsBac
         EXPECT_EQ(outcome.status, 1) << run << "\n" << outcome.err;
         EXPECT_TRUE(Has(outcome.out, "<carnet.gsi> n'est pas une GéoBase (3 ligne(s) illisible(s) sur 3)"))
             << outcome.out;
-        EXPECT_TRUE(Has(outcome.err,
-                        "Impossible d'enregistrer la GéoBase sous\ncarnet.gsi !\nCe fichier n'est "
-                        "pas une GéoBase : il est laissé tel qu'il est.\nEnregistrez la GéoBase "
-                        "sous un autre nom."))
-            << outcome.err;
+        EXPECT_TRUE(Has(outcome.err, "sous\ncarnet.gsi !\nCe fichier n'est pas une GéoBase")) << outcome.err;
         EXPECT_EQ(ReadBytes(dir / "carnet.gsi"), kWildBook);
         EXPECT_EQ(ReadBytes(dir / "carnet.bak"), "copie d'un autre jour\n");
     }
 }
 
 TEST_F(GeoBaseSafety, AReadOnlyGeoBaseIsComputedButNotWrittenEvenByRoot) {
-    std::filesystem::copy_file(std::string(PYR_SOURCE_DIR) + "/data/chantier-demo.geo", dir / "chantier.geo");
-    const std::string before = ReadBytes(dir / "chantier.geo");
+    const std::string before = Demo("chantier.geo");
     ASSERT_EQ(chmod((dir / "chantier.geo").c_str(), 0444), 0);
 
     const Outcome outcome = Run("CalculV0 --geobase chantier.geo --type toutes --enregistrer --non");
@@ -85,45 +69,38 @@ protected:
     }
 };
 
-TEST_F(GeoBaseUnderSizeLimit, ASaveThatDoesNotFitLeavesTheGeoBaseItsBackupAndNoTemporaryFile) {
-    // As after the last save, the backup holds what the GéoBase holds: the backup of this save succeeds.
+// A save that does not fit, and a backup that does not fit (an older backup, bigger than the limit): the
+// GéoBase, its backup and the folder stay as they were.
+TEST_F(GeoBaseUnderSizeLimit, ASaveOrABackupThatDoesNotFitLeavesTheGeoBaseItsBackupAndNoTemporaryFile) {
     const std::string job = Job();
-    WriteBytes(Geo(), job);
-    WriteBytes(Bak(), job);
-    const auto names = FileNames(dir.Root() / "travail");
-
-    const Outcome outcome = Read(job.size() + std::string(kQuendalLines).size() - 1);
-    EXPECT_EQ(outcome.status, 1) << outcome.err;
-    EXPECT_TRUE(Has(outcome.err,
-                    "Impossible d'enregistrer la GéoBase sous\ntravail/job.geo !\n(fichier trop grand "
-                    "pour la limite de taille permise).\nLe fichier est resté tel qu'il était."))
-        << outcome.err;
-    EXPECT_EQ(ReadBytes(Geo()), job);
-    EXPECT_EQ(ReadBytes(Bak()), job);
-    EXPECT_EQ(FileNames(dir.Root() / "travail"), names);
-
+    const struct {
+        std::string backup;
+        rlim_t limit;
+        const char* said;
+    } cases[] = {
+        // As after the last save, the backup holds what the GéoBase holds: the backup of this save succeeds.
+        {job, job.size() + std::string(kQuendalLines).size() - 1,
+         "Impossible d'enregistrer la GéoBase sous\ntravail/job.geo !\n(fichier trop grand pour la limite de "
+         "taille permise).\nLe fichier est resté tel qu'il était."},
+        {std::string(4000, '#'), 2048,
+         "Impossible de faire la copie de sauvegarde de la GéoBase\ntravail/job.geo\ndans\ntravail/job.bak\n"
+         "(fichier trop grand pour la limite de taille permise)."},
+    };
+    for (const auto& c : cases) {
+        WriteBytes(Geo(), job);
+        WriteBytes(Bak(), c.backup);
+        const auto names = FileNames(dir.Root() / "travail");
+        const Outcome outcome = Read(c.limit);
+        EXPECT_EQ(outcome.status, 1) << outcome.err;
+        EXPECT_TRUE(Has(outcome.err, c.said)) << outcome.err;
+        EXPECT_EQ(ReadBytes(Geo()), job);
+        EXPECT_EQ(ReadBytes(Bak()), c.backup);
+        EXPECT_EQ(FileNames(dir.Root() / "travail"), names);
+    }
     // Without the limit, the very same command saves: the limit was all that stopped it.
     const Outcome saved = Read(RLIM_INFINITY);
     EXPECT_EQ(saved.status, 0) << saved.err;
     EXPECT_EQ(ReadBytes(Geo()), job + kQuendalLines);
-}
-
-TEST_F(GeoBaseUnderSizeLimit, ABackupThatDoesNotFitLeavesTheFormerBackupWholeAndSavesNothing) {
-    const std::string job = Job();
-    const std::string former(4000, '#'); // an older backup, bigger than the limit below
-    WriteBytes(Geo(), job);
-    WriteBytes(Bak(), former);
-    const auto names = FileNames(dir.Root() / "travail");
-
-    const Outcome outcome = Read(2048);
-    EXPECT_EQ(outcome.status, 1) << outcome.err;
-    EXPECT_TRUE(Has(outcome.err,
-                    "Impossible de faire la copie de sauvegarde de la GéoBase\ntravail/job.geo\ndans\n"
-                    "travail/job.bak\n(fichier trop grand pour la limite de taille permise)."))
-        << outcome.err;
-    EXPECT_EQ(ReadBytes(Geo()), job);
-    EXPECT_EQ(ReadBytes(Bak()), former);
-    EXPECT_EQ(FileNames(dir.Root() / "travail"), names);
 }
 
 TEST_F(GeoBaseSafety, AFileOfTheSurveyorsNamedLikeTheGeoBaseSurvivesASave) {
