@@ -3,8 +3,6 @@
 #include "host/CommandContext.h"
 #include "host/PyrAppModul.h"
 
-#include <gtest/gtest.h>
-
 namespace {
 
 using namespace pyr::host;

@@ -3,19 +3,12 @@
 #include "HostTestSupport.h"
 #include "calc/test_v0_geometry.h"
 
-#include <filesystem>
-#include <gtest/gtest.h>
 #include <tuple>
 
 namespace pyr::test {
 namespace {
 
-class CommandScript : public ::testing::Test {
-protected:
-    Outcome Run(const std::string& arguments) { return RunPyralis(dir.Root(), arguments); }
-
-    TempDir dir;
-};
+using CommandScript = PyralisTest;
 
 class CalculV0Command : public CommandScript {
 protected:
@@ -38,8 +31,7 @@ protected:
     }
     Outcome V0(const std::string& arguments) { return Run("CalculV0 --geobase chantier.geo " + arguments); }
     double V0Of(const char* station) const {
-        CCarnet carnet;
-        carnet.Load(nullptr, dir / "chantier.geo");
+        const CCarnet carnet = SavedGeoBase(dir / "chantier.geo");
         return carnet.v0At(carnet.findStaRep(station, 1));
     }
 };
@@ -47,21 +39,15 @@ protected:
 TEST_F(CalculV0Command, AllStationsAreOrientedSavedListedAndJournalled) {
     const Outcome outcome = V0("--type toutes --enregistrer --listing v0.cv0 --oui");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
-    EXPECT_TRUE(Has(outcome.out, "Station S1(1) : V0 = 50.00000 gr (3 référence(s) retenue(s) sur 3)"))
-        << outcome.out;
-    EXPECT_TRUE(Has(outcome.out, "Station S2(1) : V0 = 120.00000 gr")) << outcome.out;
+    ExpectInOrder(outcome.out, {"Station S1(1) : V0 = 50.00000 gr (3 référence(s) retenue(s) sur 3)",
+                                "Station S2(1) : V0 = 120.00000 gr"});
     EXPECT_NEAR(V0Of("S1"), 50.0, 1e-5);
     EXPECT_NEAR(V0Of("S2"), 120.0, 1e-5);
     EXPECT_FALSE(Has(outcome.err, "Voulez-vous enregistrer les résultats")) << "the listing was asked for";
 
-    const std::string listing = ReadBytes(dir / "v0.cv0");
-    std::size_t at = 0;
-    for (const char* part :
-         {"CALCUL DES V0 DE STATIONS", "| Calcul de la station S1, reprise 1 |", "Remarques",
-          "| Calcul de la station S2, reprise 1 |", "calcul pondéré     : 120.00000 |"}) {
-        at = listing.find(part, at);
-        ASSERT_NE(at, std::string::npos) << part << "\n" << listing;
-    }
+    ExpectInOrder(ReadBytes(dir / "v0.cv0"),
+                  {"CALCUL DES V0 DE STATIONS", "| Calcul de la station S1, reprise 1 |", "Remarques",
+                   "| Calcul de la station S2, reprise 1 |", "calcul pondéré     : 120.00000 |"});
     EXPECT_TRUE(Has(ReadBytes(dir / "chantier.jnl"), " - Calcul des V0 de stations\nStation   S1(1) : V0 =  "
                                                      "50.00000\nStation   S2(1) : V0 = 120.00000"));
 }

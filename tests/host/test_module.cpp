@@ -4,7 +4,6 @@
 #include "host/CommandTable.h"
 #include "settings/ParamStore.h"
 
-#include <gtest/gtest.h>
 #include <set>
 
 namespace {

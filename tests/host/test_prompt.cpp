@@ -5,13 +5,9 @@
 
 #include <chrono>
 #include <csignal>
-#include <filesystem>
-#include <gtest/gtest.h>
 #include <poll.h>
 #include <pty.h>
-#include <sys/wait.h>
 #include <thread>
-#include <unistd.h>
 
 namespace {
 
@@ -39,9 +35,7 @@ public:
             argv.push_back(word.data());
         argv.push_back(nullptr);
         const std::string folder = dir.Root().string(), config = dir / "config";
-        winsize size = {};
-        size.ws_row = 40;
-        size.ws_col = 200;
+        winsize size{40, 200, 0, 0};
         m_pid = forkpty(&m_master, nullptr, nullptr, &size);
         if (m_pid == 0) {
             if (chdir(folder.c_str()) != 0) _exit(127);
@@ -62,7 +56,6 @@ public:
     Terminal(const Terminal&) = delete;
     Terminal& operator=(const Terminal&) = delete;
 
-    bool Started() const { return m_pid > 0; }
     pid_t Pid() const { return m_pid; }
 
     // Reads until `text` comes after what the earlier waits found; false when it has not come by the
@@ -161,7 +154,6 @@ TEST_F(Prompt, ACommandTypedRunsAndEnterOnAnEmptyLineRunsItAgain) {
     const std::string shown = "Barre d'outils « Calculs Topo » affichée.";
     {
         Terminal terminal(dir, {});
-        ASSERT_TRUE(terminal.Started());
         ASSERT_TRUE(terminal.Shows("", kPrompt));
         ASSERT_TRUE(terminal.Shows(std::string("pyrcaltopo15") + kEnter, shown));
         ASSERT_TRUE(terminal.Shows("", kPrompt));
@@ -239,17 +231,14 @@ TEST_F(Prompt, EscapeCancelsAQuestionAndCtrlDTakesItsDefault) {
 // Without the prompt, an interrupted command ends pyralis with the status of its signal, and what it was
 // writing stays as it was.
 TEST_F(Prompt, WithoutThePromptCtrlCAndSigtermEndTheProgram) {
-    {
+    for (const auto& [signal, status] : {std::pair{SIGINT, 130}, {SIGTERM, 143}}) {
         Terminal terminal(dir, {"GeoEdit", "demo.geo", "--lecture", "Quendal-Pc", "carnet.qdl"});
         ASSERT_TRUE(terminal.Shows("", "[Annuler] ? "));
-        terminal.Type(kCtrlC);
-        EXPECT_EQ(terminal.Status(), 130) << terminal.Screen();
-    }
-    {
-        Terminal terminal(dir, {"GeoEdit", "demo.geo", "--lecture", "Quendal-Pc", "carnet.qdl"});
-        ASSERT_TRUE(terminal.Shows("", "[Annuler] ? "));
-        kill(terminal.Pid(), SIGTERM);
-        EXPECT_EQ(terminal.Status(), 143) << terminal.Screen();
+        if (signal == SIGINT)
+            terminal.Type(kCtrlC); // the terminal sends it
+        else
+            kill(terminal.Pid(), SIGTERM);
+        EXPECT_EQ(terminal.Status(), status) << terminal.Screen();
     }
     EXPECT_EQ(ReadBytes(Geo()), original);
     EXPECT_EQ(Files(), untouched);

@@ -2,21 +2,14 @@
 #include "HostTestSupport.h"
 #include "fieldbook/FieldBookReader.h"
 
-#include <filesystem>
-#include <gtest/gtest.h>
-#include <sys/stat.h>
-
 namespace {
 
 constexpr const char* kJob = "GEOBASE PYRALIS\t1\n"
                              "1006\tA1\t651050.118\t6862512.447\t-999999\tXY\tBORNE\n";
 
-class ReadingCommands : public ::testing::Test {
+class ReadingCommands : public PyralisTest {
 protected:
     ReadingCommands() { WriteBytes(dir / "carnet.qdl", kQuendalBook); }
-    Outcome Run(const std::string& arguments) { return RunPyralis(dir.Root(), arguments); }
-
-    TempDir dir;
 };
 
 } // namespace
@@ -37,9 +30,8 @@ TEST_F(ReadingCommands, LQuendaConvertsTheFieldBookNamedIntoANewGeoBase) {
     WriteBytes(dir / "carnet.geo", "à garder\n");
     const Outcome kept = Run("LQuenda");
     EXPECT_EQ(kept.status, 0);
-    EXPECT_TRUE(Has(kept.err, "Sélectionnez le fichier carnet à traiter : carnet.qdl")) << kept.err;
-    EXPECT_TRUE(
-        Has(kept.err, "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?\nRéponse : Non"));
+    ExpectInOrder(kept.err, {"Sélectionnez le fichier carnet à traiter : carnet.qdl",
+                             "La GéoBase indiquée existe déjà !\nVoulez-vous la remplacer ?\nRéponse : Non"});
     EXPECT_EQ(ReadBytes(dir / "carnet.geo"), "à garder\n");
     EXPECT_EQ(Run("--oui LQuenda --geobase autre.geo").status, 0);
     EXPECT_TRUE(std::filesystem::exists(dir / "autre.geo"));

@@ -3,9 +3,6 @@
 #include "HostTestSupport.h"
 #include "host/ServicesLookup.h"
 
-#include <filesystem>
-#include <gtest/gtest.h>
-
 namespace {
 
 namespace fs = std::filesystem;
