@@ -38,33 +38,24 @@ public:
     DialogModel& Model() override { return m_model; }
     std::string Caption() override { return "Calcul de points"; }
     std::vector<Control> Controls() const override {
+        using enum ControlKind;
+        // clang-format off
         return {
-            {.id = kLabel, .kind = ControlKind::Label, .text = "&Point :", .buddy = kCombo},
-            {.id = kCombo, .kind = ControlKind::EditCombo, .name = "point", .column = 1},
-            {.id = kList, .kind = ControlKind::List, .name = "liste", .row = 1, .columnSpan = 2},
-            {.id = kSwitch, .kind = ControlKind::Check, .name = "plani", .text = "&Planimétrie", .row = 2},
-            {.id = kName, .kind = ControlKind::Edit, .name = "nom", .row = 3, .column = 1},
-            {.id = kResult, .kind = ControlKind::Field, .name = "resultat", .row = 4, .column = 1},
-            {.id = kTable, .kind = ControlKind::List, .name = "table", .row = 5, .columns = {"Point", "X"}},
-            {.id = kPage1, .kind = ControlKind::Page, .name = "page1", .text = "Première"},
-            {.id = kPage2, .kind = ControlKind::Page, .name = "page2", .text = "Seconde"},
-            {.id = kOnPage,
-             .kind = ControlKind::Check,
-             .name = "surPage",
-             .text = "&Sur la page",
-             .parent = kPage2},
-            {.id = kSave,
-             .kind = ControlKind::Button,
-             .name = "enregistrer",
-             .text = "&Enregistrer",
-             .parent = kButtonRow,
+            {.id = kLabel, .kind = Label, .text = "&Point :", .buddy = kCombo},
+            {.id = kCombo, .kind = EditCombo, .name = "point", .column = 1},
+            {.id = kList, .kind = List, .name = "liste", .row = 1, .columnSpan = 2},
+            {.id = kSwitch, .kind = Check, .name = "plani", .text = "&Planimétrie", .row = 2},
+            {.id = kName, .kind = Edit, .name = "nom", .row = 3, .column = 1},
+            {.id = kResult, .kind = Field, .name = "resultat", .row = 4, .column = 1},
+            {.id = kTable, .kind = List, .name = "table", .row = 5, .columns = {"Point", "X"}},
+            {.id = kPage1, .kind = Page, .name = "page1", .text = "Première"},
+            {.id = kPage2, .kind = Page, .name = "page2", .text = "Seconde"},
+            {.id = kOnPage, .kind = Check, .name = "surPage", .text = "&Sur la page", .parent = kPage2},
+            {.id = kSave, .kind = Button, .name = "enregistrer", .text = "&Enregistrer", .parent = kButtonRow,
              .isDefault = true},
-            {.id = kIdCancel,
-             .kind = ControlKind::Button,
-             .name = "annuler",
-             .text = "Annuler",
-             .parent = kButtonRow},
+            {.id = kIdCancel, .kind = Button, .name = "annuler", .text = "Annuler", .parent = kButtonRow},
         };
+        // clang-format on
     }
     bool Open(FrontEnd&) override { return true; }
     ControlState State(int id) const override {
@@ -167,13 +158,8 @@ TEST_F(FormDialogTest, WidgetsShowTheStatesAndSendTheActions) {
     EXPECT_EQ(table->topLevelItem(1)->text(1), "1010.000");
     EXPECT_EQ(Find<QTabWidget>(dialog, "pages")->count(), 2);
     EXPECT_NE(Find<QCheckBox>(dialog, "surPage"), nullptr);
-}
 
-TEST_F(FormDialogTest, ANameTypedInTheComboIsSentWithoutPressingTheDefaultButton) {
-    model.chosen = 0;
-    pyr::bureau::FormDialog dialog(form, frontEnd);
-    dialog.show();
-    auto* combo = Find<QComboBox>(dialog, "point");
+    // A name typed in the combo is sent by Enter, which does not press the default button, now enabled.
     combo->setFocus();
     combo->lineEdit()->selectAll();
     QTest::keyClicks(combo->lineEdit(), "A9");
@@ -181,6 +167,14 @@ TEST_F(FormDialogTest, ANameTypedInTheComboIsSentWithoutPressingTheDefaultButton
     EXPECT_EQ(model.points.back(), "A9");
     EXPECT_EQ(model.saved, 0);
     EXPECT_TRUE(dialog.isVisible());
+
+    // A change notice of the model is shown.
+    model.points = {"200"};
+    model.chosen = 0;
+    model.Change();
+    QCoreApplication::processEvents();
+    EXPECT_EQ(combo->count(), 1);
+    EXPECT_EQ(Find<QLineEdit>(dialog, "resultat")->text(), "X = 200");
 }
 
 TEST_F(FormDialogTest, TheFormDecidesWhenTheDialogCloses) {
@@ -208,16 +202,6 @@ TEST_F(FormDialogTest, TheFormDecidesWhenTheDialogCloses) {
         EXPECT_FALSE(dialog.isVisible());
         EXPECT_EQ(dialog.Result(), DialogResult::Cancel);
     }
-}
-
-TEST_F(FormDialogTest, AChangeNoticeOfTheModelIsShown) {
-    pyr::bureau::FormDialog dialog(form, frontEnd);
-    model.points = {"200"};
-    model.chosen = 0;
-    model.Change();
-    QCoreApplication::processEvents();
-    EXPECT_EQ(Find<QComboBox>(dialog, "point")->count(), 1);
-    EXPECT_EQ(Find<QLineEdit>(dialog, "resultat")->text(), "X = 200");
 }
 
 } // namespace

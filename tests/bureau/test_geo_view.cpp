@@ -35,6 +35,15 @@ protected:
         view.resize(400, 300);
     }
 
+    QImage Rendered() {
+        QImage image(view.size(), QImage::Format_ARGB32_Premultiplied);
+        QPainter painter(&image);
+        view.RenderTo(painter, view.size());
+        return image;
+    }
+    // A station's triangle is filled red.
+    static bool IsStation(const QColor& colour) { return colour.red() > 200 && colour.green() < 80; }
+
     // The scale that fits 100 m by 80 m within the margins of 24 pixels of a 400 x 300 view.
     static constexpr double kFitScale = (300.0 - 48.0) / 80.0;
 
@@ -73,15 +82,8 @@ TEST_F(GeoViewTest, ShowsTheWholeGeoBaseNorthUpAndSaysWhatIsClicked) {
 
 TEST_F(GeoViewTest, DrawsTheStationAndTheMeasureWhereTheyAre) {
     ASSERT_TRUE(view.Show(dir / "job.geo"));
-    QImage image(view.size(), QImage::Format_ARGB32_Premultiplied);
-    {
-        QPainter painter(&image);
-        view.RenderTo(painter, view.size());
-    }
-    // The station's triangle is filled red around its centre.
-    const QColor station = image.pixelColor(view.ToScreen(1100, 2050).toPoint());
-    EXPECT_GT(station.red(), 200);
-    EXPECT_LT(station.green(), 80);
+    const QImage image = Rendered();
+    EXPECT_TRUE(IsStation(image.pixelColor(view.ToScreen(1100, 2050).toPoint())));
     // The measure to P1 is orange: at its middle, a pixel nearby holds little blue.
     const QPoint middle = view.ToScreen(1075, 2065).toPoint();
     int blue = 255;
@@ -104,14 +106,8 @@ TEST_F(GeoViewTest, TheOverviewOfADenseJobKeepsThePlaces) {
     for (int i = 0; i < 3600; i += 3)
         carnet.Add(std::make_unique<pyr::CMesure>("P" + std::to_string(i), 0.0), pyr::kKindMesure);
     view.ShowCarnet(carnet);
-    QImage image(view.size(), QImage::Format_ARGB32_Premultiplied);
-    {
-        QPainter painter(&image);
-        view.RenderTo(painter, view.size());
-    }
-    const QColor station = image.pixelColor(view.ToScreen(1030, 2030).toPoint());
-    EXPECT_GT(station.red(), 200);
-    EXPECT_LT(station.green(), 80);
+    const QImage image = Rendered();
+    EXPECT_TRUE(IsStation(image.pixelColor(view.ToScreen(1030, 2030).toPoint())));
     // A point of the corner, away from every sighting: a dark dot on the light ground.
     EXPECT_LT(image.pixelColor(view.ToScreen(1001, 2059).toPoint()).red(), 100);
     EXPECT_GT(image.pixelColor(view.ToScreen(1001, 2059).toPoint() + QPoint(-3, -3)).red(), 240);

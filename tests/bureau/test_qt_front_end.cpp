@@ -64,19 +64,18 @@ TEST(QtFrontEnd, FiltersOfTheSystemBecomeQtFilters) {
     EXPECT_EQ(QtFilter("Carnets Wild|*.gsi;*.gre|Tous|*.*||"), "Carnets Wild (*.gsi *.gre);;Tous (*.*)");
 }
 
-// A dialog whose Run says what it did, with or without a window.
-class CountingDialog : public Dialog {
-public:
-    explicit CountingDialog(bool withForm) : m_withForm(withForm) {}
+// A dialog without a window, whose Run says what it did.
+struct PlainDialog : Dialog {
     DialogResult Run(FrontEnd& frontEnd) override {
         frontEnd.TextLine("lancée sans fenêtre");
         return DialogResult::Ok;
     }
+};
+
+// A dialog whose window counts its openings.
+struct CountingDialog : PlainDialog {
     std::unique_ptr<Form> MakeForm() override;
     int opened = 0;
-
-private:
-    bool m_withForm;
 };
 
 class RefusingForm : public Form {
@@ -97,7 +96,6 @@ private:
 };
 
 std::unique_ptr<Form> CountingDialog::MakeForm() {
-    if (!m_withForm) return nullptr;
     return std::make_unique<RefusingForm>(*this);
 }
 
@@ -105,11 +103,11 @@ TEST(QtFrontEnd, ADialogWithoutAWindowRunsAsACommandLineWouldAndAFormThatDoesNot
     QtFrontEnd frontEnd;
     pyr::bureau::TextWindow text;
     frontEnd.SetTextWindow(&text);
-    CountingDialog plain(false);
+    PlainDialog plain;
     EXPECT_EQ(frontEnd.DoModal(plain), DialogResult::Ok);
     EXPECT_EQ(text.toPlainText(), "lancée sans fenêtre");
 
-    CountingDialog windowed(true);
+    CountingDialog windowed;
     EXPECT_EQ(frontEnd.DoModal(windowed), DialogResult::Cancel);
     EXPECT_EQ(windowed.opened, 1);
 }
