@@ -1,7 +1,6 @@
 #include "TestSupport.h"
 #include "hostrt/HostRuntime.h"
 
-#include <filesystem>
 #include <gtest/gtest.h>
 #include <stdexcept>
 
