@@ -48,13 +48,12 @@ TEST(IniFile, WritingValuesKeepsEveryOtherLineInItsPlace) {
     IniFile again;
     again.Parse(bytes);
     EXPECT_EQ(Value(again, "Options_Corrections", "Echelle"), " blancs autour ");
-}
 
-TEST(IniFile, FileWithoutSectionsKeepsItsLinesFirst) {
-    IniFile ini;
-    ini.Parse("; premier bloc\n\n; second bloc\n");
-    ini.Set("G", "x", "a");
-    EXPECT_EQ(ini.Bytes(), "; premier bloc\n\n; second bloc\n\n[G]\nx=a\n");
+    // A file without sections keeps its lines first.
+    IniFile bare;
+    bare.Parse("; premier bloc\n\n; second bloc\n");
+    bare.Set("G", "x", "a");
+    EXPECT_EQ(bare.Bytes(), "; premier bloc\n\n; second bloc\n\n[G]\nx=a\n");
 }
 
 TEST(IniFile, Windows1252FileReadsRightAndIsWrittenBackInItsCodePageUnlessItWouldLoseACharacter) {
