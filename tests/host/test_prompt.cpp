@@ -123,12 +123,11 @@ private:
     std::size_t m_seen = 0;
 };
 
-class Prompt : public ::testing::Test {
+class Prompt : public PyralisTest {
 protected:
     void SetUp() override {
-        fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/chantier-demo.geo", Geo());
+        original = Demo("demo.geo");
         fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/carnet-tilleuls.qdl", dir / "carnet.qdl");
-        original = ReadBytes(Geo());
     }
     std::string Geo() const { return dir / "demo.geo"; }
     std::string History() const { return dir / "config/pyralis/historique.txt"; }
@@ -141,7 +140,6 @@ protected:
         return names;
     }
 
-    TempDir dir;
     std::string original;
     // Reading the field book into a GéoBase that is not empty asks first: add to it (Oui), make a new one
     // (Non), or give up (Annuler, the default).
