@@ -7,8 +7,8 @@
 #include "calc/CalcInters.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalculV0Driver.h"
-#include "calc/ResectionDriver.h"
 #include "calc/IntersectionJob.h"
+#include "calc/ResectionDriver.h"
 #include "settings/OptionPages.h"
 #include "ui/Form.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -48,42 +48,55 @@ void Click(QWidget& dialog, const char* name) {
     QTest::mouseClick(&button, Qt::LeftButton);
 }
 
-TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog) {
-    IntersectionJob job;
+class DialogWidgets : public ::testing::Test {
+protected:
+    // The form of `driver` on that GéoBase, shown as the person sees it.
+    bool Show(std::unique_ptr<ui::Dialog> driver, const std::string& geo, const char* title) {
+        model = std::move(driver);
+        model->SetInputs({geo, dir / "Pyralis.ini", "", title});
+        form = model->MakeForm();
+        if (!form->Open(frontEnd)) return false;
+        dialog = std::make_unique<bureau::FormDialog>(*form, frontEnd);
+        dialog->show();
+        return QTest::qWaitForWindowActive(dialog.get());
+    }
+
     TempDir dir;
-    const std::string geo = job.Prepare(dir);
     ui::ScriptedFrontEnd frontEnd;
-    CCalcIntersDriver driver;
-    driver.SetInputs({geo, dir / "Pyralis.ini", "", "calcul d'un point par intersections de visées"});
-    const std::unique_ptr<ui::Form> form = driver.MakeForm();
-    ASSERT_TRUE(form->Open(frontEnd));
-    bureau::FormDialog dialog(*form, frontEnd);
-    dialog.show();
-    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
+    std::unique_ptr<ui::Dialog> model;
+    std::unique_ptr<ui::Form> form;
+    std::unique_ptr<bureau::FormDialog> dialog; // closed before its form and its model
+};
+
+TEST_F(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog) {
+    IntersectionJob job;
+    const std::string geo = job.Prepare(dir);
+    ASSERT_TRUE(
+        Show(std::make_unique<CCalcIntersDriver>(), geo, "calcul d'un point par intersections de visées"));
 
     // The point's name typed into the combo, then every sighting taken.
-    auto& point = Find<QComboBox>(dialog, "sujet");
+    auto& point = Find<QComboBox>(*dialog, "sujet");
     point.setFocus();
     point.lineEdit()->selectAll();
     QTest::keyClicks(point.lineEdit(), "P");
     QTest::keyClick(point.lineEdit(), Qt::Key_Return);
-    EXPECT_EQ(Find<QListWidget>(dialog, "disponibles").count(), 3);
-    EXPECT_FALSE(Find<QPushButton>(dialog, "ecrire").isEnabled());
-    Click(dialog, "ajouterToutes");
-    EXPECT_EQ(Find<QListWidget>(dialog, "retenues").count(), 3);
-    EXPECT_EQ(Find<QLineEdit>(dialog, "valeurPremiere").text().toStdString(), "1050.0000");
-    EXPECT_EQ(Find<QLineEdit>(dialog, "valeurSeconde").text().toStdString(), "2080.0000");
+    EXPECT_EQ(Find<QListWidget>(*dialog, "disponibles").count(), 3);
+    EXPECT_FALSE(Find<QPushButton>(*dialog, "ecrire").isEnabled());
+    Click(*dialog, "ajouterToutes");
+    EXPECT_EQ(Find<QListWidget>(*dialog, "retenues").count(), 3);
+    EXPECT_EQ(Find<QLineEdit>(*dialog, "valeurPremiere").text().toStdString(), "1050.0000");
+    EXPECT_EQ(Find<QLineEdit>(*dialog, "valeurSeconde").text().toStdString(), "2080.0000");
 
     // Planimetry switched off leaves the altitude alone, and back on.
-    Find<QCheckBox>(dialog, "calculPlani").click();
-    EXPECT_EQ(Find<QLineEdit>(dialog, "valeurPremiere").text().toStdString(), "");
-    Find<QCheckBox>(dialog, "calculPlani").click();
+    Find<QCheckBox>(*dialog, "calculPlani").click();
+    EXPECT_EQ(Find<QLineEdit>(*dialog, "valeurPremiere").text().toStdString(), "");
+    Find<QCheckBox>(*dialog, "calculPlani").click();
 
-    Picture(dialog, "CalInter-point-calcule.png");
-    Click(dialog, "ecrire");
+    Picture(*dialog, "CalInter-point-calcule.png");
+    Click(*dialog, "ecrire");
     frontEnd.answers = {ui::Answer::Yes}; // the modified GéoBase saved on leaving
-    Click(dialog, "finListing");
-    EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
+    Click(*dialog, "finListing");
+    EXPECT_EQ(dialog->Result(), ui::DialogResult::Ok);
     CCarnet saved;
     saved.Load(nullptr, geo);
     const int p = saved.findMat("P");
@@ -97,7 +110,7 @@ TEST(DialogWidgets, APointIsComputedWrittenAndListedThroughTheIntersectionDialog
     EXPECT_EQ(IntersectionJob::ByTheModel(frontEnd), ReadBytes(geo));
 }
 
-TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
+TEST_F(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     // S1 at a V0 of 50 gr on four known points.
     const Place s1{1000.0, 2000.0, 100.0};
     const Place a{1100.0, 2100.0, 101.0}, b{900.0, 2150.0, 99.0}, c{950.0, 1850.0, 100.5},
@@ -109,25 +122,17 @@ TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     AddStation(job, "S1", 1.5, kUndefined);
     for (const auto& [name, place] : {std::pair{"A", a}, {"B", b}, {"C", c}, {"D", d}})
         AddSighting(job, name, s1, 1.5, place, 1.3, 50.0, kKindReference);
-    TempDir dir;
     WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
     ASSERT_EQ(job.Save(dir / "chantier.geo"), 1);
-
-    ui::ScriptedFrontEnd frontEnd;
-    CCalculV0Driver driver;
-    driver.SetInputs({dir / "chantier.geo", dir / "Pyralis.ini", "", "calcul du V0 d'une station"});
-    const std::unique_ptr<ui::Form> form = driver.MakeForm();
-    ASSERT_TRUE(form->Open(frontEnd));
-    bureau::FormDialog dialog(*form, frontEnd);
-    dialog.show();
-    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
-    EXPECT_EQ(Find<QListWidget>(dialog, "references").count(), 4);
-    Click(dialog, "calculer");
-    EXPECT_NEAR(Find<QLineEdit>(dialog, "v0").text().toDouble(), 50.0, 1e-4);
-    Picture(dialog, "CalculV0-station-orientee.png");
+    ASSERT_TRUE(
+        Show(std::make_unique<CCalculV0Driver>(), dir / "chantier.geo", "calcul du V0 d'une station"));
+    EXPECT_EQ(Find<QListWidget>(*dialog, "references").count(), 4);
+    Click(*dialog, "calculer");
+    EXPECT_NEAR(Find<QLineEdit>(*dialog, "v0").text().toDouble(), 50.0, 1e-4);
+    Picture(*dialog, "CalculV0-station-orientee.png");
     frontEnd.answers = {ui::Answer::No}; // no listing
-    Click(dialog, "enregistrer");
-    EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
+    Click(*dialog, "enregistrer");
+    EXPECT_EQ(dialog->Result(), ui::DialogResult::Ok);
     CCarnet saved;
     saved.Load(nullptr, dir / "chantier.geo");
     const int station = saved.findStaRep("S1", 1);
@@ -135,7 +140,7 @@ TEST(DialogWidgets, AStationIsOrientedThroughTheV0Dialog) {
     EXPECT_NEAR(saved.v0At(station), 50.0, 1e-4);
 }
 
-TEST(DialogWidgets, AStationIsComputedAndWrittenThroughTheCombinedDialog) {
+TEST_F(DialogWidgets, AStationIsComputedAndWrittenThroughTheCombinedDialog) {
     // E, unknown, sights A, B and C; S, set up on A and oriented, sights E.
     const Place e{1040.0, 2030.0, 101.5};
     const Place a{1000.0, 2100.0, 100.0}, b{1120.0, 2080.0, 102.0}, c{1090.0, 1950.0, 99.0};
@@ -147,38 +152,30 @@ TEST(DialogWidgets, AStationIsComputedAndWrittenThroughTheCombinedDialog) {
         AddSighting(job, name, e, 1.55, place, 1.3, 37.5);
     AddStation(job, "A", 1.6, 50.0);
     AddSighting(job, "E", a, 1.6, e, 1.4, 50.0, kKindMesure);
-    TempDir dir;
     WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
     ASSERT_EQ(job.Save(dir / "chantier.geo"), 1);
-
-    ui::ScriptedFrontEnd frontEnd;
-    CCalcRecoupDriver driver;
-    driver.SetInputs({dir / "chantier.geo", dir / "Pyralis.ini", "", "calcul d'un point par recoupement"});
-    const std::unique_ptr<ui::Form> form = driver.MakeForm();
-    ASSERT_TRUE(form->Open(frontEnd));
-    bureau::FormDialog dialog(*form, frontEnd);
-    dialog.show();
-    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
-    auto& station = Find<QComboBox>(dialog, "sujet");
+    ASSERT_TRUE(Show(std::make_unique<CCalcRecoupDriver>(), dir / "chantier.geo",
+                     "calcul d'un point par recoupement"));
+    auto& station = Find<QComboBox>(*dialog, "sujet");
     ASSERT_EQ(station.count(), 1);
     EXPECT_EQ(station.itemText(0).toStdString(), "E (1)");
     station.setFocus();
     station.lineEdit()->selectAll();
     QTest::keyClicks(station.lineEdit(), "E");
     QTest::keyClick(station.lineEdit(), Qt::Key_Return);
-    auto& available = Find<QListWidget>(dialog, "disponibles");
+    auto& available = Find<QListWidget>(*dialog, "disponibles");
     ASSERT_EQ(available.count(), 4);
     EXPECT_EQ(available.item(0)->text().toStdString(), "---> A");
     EXPECT_EQ(available.item(3)->text().toStdString(), "<--- A (1)");
-    Click(dialog, "ajouterToutes");
-    EXPECT_NEAR(Find<QLineEdit>(dialog, "valeurPremiere").text().toDouble(), e.x, kTenthMm);
-    EXPECT_NEAR(Find<QLineEdit>(dialog, "valeurSeconde").text().toDouble(), e.y, kTenthMm);
-    EXPECT_NEAR(Find<QLineEdit>(dialog, "valeurV0").text().toDouble(), 37.5, 1e-4);
-    EXPECT_EQ(dialog.windowTitle().toStdString(), "Calcul de la station E par recoupement");
-    Picture(dialog, "CalRecou-station-calculee.png");
-    Click(dialog, "ecrire");
+    Click(*dialog, "ajouterToutes");
+    EXPECT_NEAR(Find<QLineEdit>(*dialog, "valeurPremiere").text().toDouble(), e.x, kTenthMm);
+    EXPECT_NEAR(Find<QLineEdit>(*dialog, "valeurSeconde").text().toDouble(), e.y, kTenthMm);
+    EXPECT_NEAR(Find<QLineEdit>(*dialog, "valeurV0").text().toDouble(), 37.5, 1e-4);
+    EXPECT_EQ(dialog->windowTitle().toStdString(), "Calcul de la station E par recoupement");
+    Picture(*dialog, "CalRecou-station-calculee.png");
+    Click(*dialog, "ecrire");
     frontEnd.answers = {ui::Answer::Yes, ui::Answer::No}; // saved, no listing
-    Click(dialog, "fermer");
+    Click(*dialog, "fermer");
     CCarnet saved;
     saved.Load(nullptr, dir / "chantier.geo");
     const int point = saved.findMat("E");
@@ -188,27 +185,19 @@ TEST(DialogWidgets, AStationIsComputedAndWrittenThroughTheCombinedDialog) {
     EXPECT_NEAR(saved.v0At(saved.findStaRep("E", 1)), 37.5, 1e-4);
 }
 
-TEST(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWrite) {
-    TempDir dir;
+TEST_F(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWrite) {
     const std::string params = dir / "Pyralis.ini";
     WriteBytes(params, "; réglages du cabinet\n");
-    ui::ScriptedFrontEnd frontEnd;
-    COptionPSheet sheet;
-    sheet.SetInputs({"", params, "", "options des calculs topométriques."});
-    const std::unique_ptr<ui::Form> form = sheet.MakeForm();
-    ASSERT_TRUE(form->Open(frontEnd));
-    bureau::FormDialog dialog(*form, frontEnd);
-    dialog.show();
-    ASSERT_TRUE(QTest::qWaitForWindowActive(&dialog));
+    ASSERT_TRUE(Show(std::make_unique<COptionPSheet>(), "", "options des calculs topométriques."));
 
-    auto& pages = Find<QTabWidget>(dialog, "pages");
+    auto& pages = Find<QTabWidget>(*dialog, "pages");
     pages.setCurrentIndex(2);
-    auto& radius = Find<QLineEdit>(dialog, "Options_Corrections/RayonTerre");
+    auto& radius = Find<QLineEdit>(*dialog, "Options_Corrections/RayonTerre");
     radius.setFocus();
     radius.selectAll();
     QTest::keyClicks(&radius, "6378.5");
     // A value out of the limits is said, and the field keeps its value.
-    auto& length = Find<QLineEdit>(dialog, "Listings/LongueurPage");
+    auto& length = Find<QLineEdit>(*dialog, "Listings/LongueurPage");
     pages.setCurrentIndex(5);
     length.setFocus(); // leaving the radius commits it
     length.selectAll();
@@ -216,8 +205,8 @@ TEST(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWr
     QTest::keyClick(&length, Qt::Key_Tab);
     EXPECT_EQ(frontEnd.messages.size(), 1u);
     EXPECT_NE(length.text(), "-4");
-    Click(dialog, "ok");
-    EXPECT_EQ(dialog.Result(), ui::DialogResult::Ok);
+    Click(*dialog, "ok");
+    EXPECT_EQ(dialog->Result(), ui::DialogResult::Ok);
     const std::string byWindow = ReadBytes(params);
 
     WriteBytes(params, "; réglages du cabinet\n");
