@@ -20,6 +20,8 @@ constexpr const char* kHelpStation =
     "la station excentrée à calculer : NOM, ou NOM(2) pour sa deuxième mise en station";
 constexpr const char* kHelpCentre =
     "le point connu, visé avec une distance, à côté duquel la station est faite";
+constexpr const char* kHelpSightings =
+    "les visées prises : celles des points d'appui de la sélection (comme --appuis)";
 constexpr const char* kHelpReferences =
     "les points d'appui dont les visées sont prises (par défaut tous ceux que vise la station)";
 constexpr const char* kHelpSave = "écrire la station calculée (point et V0) dans la GéoBase et l'enregistrer";
@@ -37,11 +39,15 @@ void CCalcExcentDriver::DeclareOwnOptions(ui::DialogOptions& options) {
         m_requests.centre = mat;
         return std::string();
     });
-    options.Value("appuis", "SELECTION", kHelpReferences, [this](const std::string& selection) {
+    // The sightings taken are those of the reference points: "--visees" says the same as "--appuis", as
+    // for the other station computations.
+    const auto references = [this](const std::string& selection) {
         if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
         m_requests.references = selection;
         return std::string();
-    });
+    };
+    options.Value("appuis", "SELECTION", kHelpReferences, references);
+    options.Value("visees", "SELECTION", kHelpSightings, references);
 }
 
 // The result as the dialog shows it: the centre, the fields, then the residuals of each reference taken.
