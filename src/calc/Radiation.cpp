@@ -1,0 +1,210 @@
+#include "calc/Radiation.h"
+
+#include "calc/RadiationTexts.h"
+#include "calc/RepriseBlock.h"
+#include "core/Angles.h"
+#include "geobase/Carnet.h"
+#include "geobase/Selection.h"
+
+#include <algorithm>
+#include <cmath>
+#include <string_view>
+#include <unordered_map>
+
+namespace pyr {
+
+namespace {
+
+// One sighting of the station, reduced, waiting to be merged with the other sightings of its point.
+struct Entry {
+    ReducedSighting reduced;
+    int next = -1; // the next sighting of the same point, in GéoBase order
+    int last = -1; // on the first sighting of a point: the last one, where the next one is linked
+};
+
+// The horizontal distance of a reduced slope distance and zenith angle, corrected for scale at the
+// station; kUndefined when there is none to use.
+double CorrectedHorizontal(double di, double av, const StationPlace& station,
+                           const DistanceCorrection& correction) {
+    if (!(di > 0.0) || !IsKnown(av)) return kUndefined;
+    double dh = di * SinGrads(av);
+    if (!(dh > 0.0)) return kUndefined;
+    CorrectHorizontalDistance(dh, station.x, station.y, station.z, correction);
+    return dh;
+}
+
+// Merges the repetitions of a point into its first sighting, as the reduction of a station merges them:
+// each one already reduced to face left and for its offsets, its target height as used.
+void MergeRepetitions(const std::vector<Entry>& entries, int first, RadiatedSighting& out,
+                      const StationPlace& station, const DistanceCorrection& correction) {
+    const ReducedSighting& head = entries[static_cast<std::size_t>(first)].reduced;
+    CMesure merged({}, head.hp, head.ah, head.av, head.di);
+    CRepetitionMean mean(merged);
+    for (int i = entries[static_cast<std::size_t>(first)].next; i >= 0;
+         i = entries[static_cast<std::size_t>(i)].next) {
+        const ReducedSighting& r = entries[static_cast<std::size_t>(i)].reduced;
+        mean.Add(CMesure({}, r.hp, r.ah, r.av, r.di));
+        ++out.repetitions;
+    }
+    mean.WriteInto(merged);
+    out.hp = merged.hp(), out.ah = merged.ah(), out.av = merged.av(), out.di = merged.di();
+    out.dh = CorrectedHorizontal(out.di, out.av, station, correction);
+}
+
+} // namespace
+
+RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSettings& settings,
+                               const CSelection* points) {
+    RadiatedStation result;
+    result.station = StationPlaceAt(carnet, stationIndex);
+    StationPlace& station = result.station;
+    if (!station.HasPlace()) {
+        result.reason = rayon::kReasonNoPlace;
+        return result;
+    }
+    if (settings.computeV0) {
+        result.v0 = ComputeStationV0(carnet, station, DefaultReferences(carnet, stationIndex), settings.v0);
+        if (result.v0.computed) {
+            station.v0 = result.v0.v0;
+            result.v0Computed = true;
+        }
+    }
+    if (!station.IsOriented()) {
+        result.reason = settings.computeV0 ? rayon::kReasonNoReference : rayon::kReasonNoV0;
+        return result;
+    }
+    result.usable = true;
+
+    int end = carnet.Find(kKindStation, "", stationIndex + 1);
+    if (end < 0) end = carnet.GetSize();
+
+    // The sightings reduced, each point's repetitions linked behind its first sighting. The identifiers
+    // are those of the elements themselves, which outlive this function.
+    std::vector<Entry> entries;
+    entries.reserve(static_cast<std::size_t>(end - stationIndex));
+    std::unordered_map<std::string_view, int> firstOf;
+    std::vector<int> firsts;
+    for (int i = stationIndex + 1; i < end; ++i) {
+        if (!IsSightingKind(carnet.GetType(i))) continue;
+        const auto* visee = static_cast<const CVisee*>(carnet.GetAt(i));
+        const std::string& mat = visee->mat();
+        if (mat == station.name || (points && !points->Contains(mat))) continue;
+        Entry entry{ReduceSighting(carnet, station, i, settings.reduction)};
+        // A target height of 0 is the one the surveyor wrote, not what the vertical offset made of it: the
+        // replacement takes its place, still lowered by that offset. Without target heights every height
+        // is 0 by choice and stays so.
+        if (settings.replaceZeroTargetHeight && settings.reduction.targetHeights && visee->hp() == 0.0)
+            entry.reduced.hp += settings.zeroTargetHeight;
+        const int at = static_cast<int>(entries.size());
+        auto [found, inserted] = firstOf.try_emplace(mat, at);
+        if (inserted) {
+            firsts.push_back(at);
+            entry.last = at;
+        } else {
+            Entry& head = entries[static_cast<std::size_t>(found->second)];
+            entries[static_cast<std::size_t>(head.last)].next = at;
+            head.last = at;
+        }
+        entries.push_back(std::move(entry));
+    }
+
+    for (int first : firsts) {
+        const Entry& head = entries[static_cast<std::size_t>(first)];
+        RadiatedSighting s;
+        s.index = head.reduced.index;
+        s.mat = head.reduced.mat;
+        s.code = carnet.GetAt(s.index)->sym();
+        s.reference = carnet.GetType(s.index) == kKindReference;
+        if (head.next < 0) {
+            s.hp = head.reduced.hp, s.ah = head.reduced.ah, s.av = head.reduced.av, s.di = head.reduced.di;
+            s.dh = head.reduced.dh;
+        } else {
+            MergeRepetitions(entries, first, s, station, settings.reduction.correction);
+            for (int i = head.next; i >= 0; i = entries[static_cast<std::size_t>(i)].next) {
+                const int index = entries[static_cast<std::size_t>(i)].reduced.index;
+                if (s.code.empty()) s.code = carnet.GetAt(index)->sym();
+                if (carnet.GetType(index) == kKindReference) s.reference = true;
+            }
+        }
+
+        if (!IsKnown(s.ah)) {
+            result.skipped.push_back({s.index, std::move(s.mat), rayon::kReasonNoDirection});
+            continue;
+        }
+        if (!IsKnown(s.dh) || !(s.dh > 0.0)) {
+            result.skipped.push_back({s.index, std::move(s.mat), rayon::kReasonNoDistance});
+            continue;
+        }
+        s.bearing = WrapGrads(station.v0 + s.ah);
+        const double sinG = SinGrads(s.bearing), cosG = CosGrads(s.bearing);
+        s.x = station.x + s.dh * sinG;
+        s.y = station.y + s.dh * cosG;
+        // A zenith angle of 0 or 200 gr is no line of sight that a height difference can follow.
+        if (IsKnown(station.z) && IsKnown(station.hi) && IsKnown(s.hp) && s.av > 0.0 && s.av < 200.0)
+            s.z = station.z + TrigonometricHeightDifference(s.dh, s.av, station.hi, s.hp);
+
+        RadiationCheck check;
+        if (PointPlace(carnet, s.mat, check.knownX, check.knownY, check.knownZ)) {
+            const double dx = s.x - check.knownX, dy = s.y - check.knownY;
+            check.along = dx * sinG + dy * cosG;
+            check.across = dx * cosG - dy * sinG;
+            if (IsKnown(s.z) && IsKnown(check.knownZ)) check.dz = s.z - check.knownZ;
+            check.sighting = std::move(s);
+            result.checks.push_back(std::move(check));
+        } else {
+            result.points.push_back(std::move(s));
+        }
+    }
+    return result;
+}
+
+std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
+                                               const Tolerances& tolerances) {
+    std::vector<RadiatedPoint> merged;
+    std::unordered_map<std::string_view, std::size_t> rankOf;
+    for (std::size_t st = 0; st < stations.size(); ++st) {
+        const std::vector<RadiatedSighting>& points = stations[st].points;
+        for (std::size_t p = 0; p < points.size(); ++p) {
+            auto [found, inserted] = rankOf.try_emplace(points[p].mat, merged.size());
+            if (inserted) {
+                merged.emplace_back();
+                merged.back().mat = points[p].mat;
+            }
+            merged[found->second].determinations.push_back({st, p});
+        }
+    }
+
+    for (RadiatedPoint& point : merged) {
+        double sumX = 0.0, sumY = 0.0, sumZ = 0.0, minZ = 0.0, maxZ = 0.0;
+        int withZ = 0;
+        const auto& determinations = point.determinations;
+        auto sighting = [&](const Determination& d) -> const RadiatedSighting& {
+            return stations[d.station].points[d.point];
+        };
+        for (const Determination& d : determinations) {
+            const RadiatedSighting& s = sighting(d);
+            sumX += s.x, sumY += s.y;
+            if (!IsKnown(s.z)) continue;
+            sumZ += s.z;
+            minZ = withZ == 0 ? s.z : std::min(minZ, s.z);
+            maxZ = withZ == 0 ? s.z : std::max(maxZ, s.z);
+            ++withZ;
+        }
+        const auto n = static_cast<double>(determinations.size());
+        point.x = sumX / n;
+        point.y = sumY / n;
+        if (withZ > 0) point.z = sumZ / withZ;
+        point.spreadZ = maxZ - minZ;
+        // Every pair: a point is seldom determined from more than a few stations.
+        for (std::size_t a = 0; a < determinations.size(); ++a)
+            for (std::size_t b = a + 1; b < determinations.size(); ++b) {
+                const RadiatedSighting &sa = sighting(determinations[a]), &sb = sighting(determinations[b]);
+                point.spreadXY = std::max(point.spreadXY, std::hypot(sa.x - sb.x, sa.y - sb.y));
+            }
+        point.outOfTolerance =
+            point.spreadXY > tolerances.customDistance || point.spreadZ > tolerances.customHeight;
+    }
+    return merged;
+}
+
+} // namespace pyr
