@@ -1,5 +1,6 @@
 #include "editor/GeoEditor.h"
 
+#include "calc/ChangeRepTexts.h"
 #include "core/Files.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
@@ -24,6 +25,7 @@ constexpr int kKindColumn = 14;
 constexpr const char* kReductionOption = "reduction";
 constexpr const char* kReductionHelp =
     "réduit les stations (réduction des reprises) avant de montrer la GéoBase";
+constexpr const char* kChangeFrameOption = "changement-repere";
 constexpr const char* kGeoBaseHelp = "la GéoBase à éditer (au lieu de la dernière utilisée)";
 constexpr const char* kReadingOption = "lecture";
 constexpr const char* kReadingHelp = "lit un carnet de ce format, l'ajoute à la GéoBase et l'enregistre";
@@ -78,6 +80,11 @@ void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
         return std::string();
     });
     m_reduction.DeclareOptions(options);
+    options.Switch(kChangeFrameOption, rep::kHelpAction, [this] {
+        m_changeFrame = true;
+        return std::string();
+    });
+    m_frameChange.DeclareOptions(options);
     options.Values(
         kReadingOption, {"FORMAT", "CARNET"}, kReadingHelp, [this](const std::vector<std::string>& values) {
             const std::optional<FieldBookFormat> format = FindFieldBookFormat(values.at(0));
@@ -173,6 +180,32 @@ bool CGeoEditor::ReduceStations(ui::FrontEnd& frontEnd) {
     return ReduceStations(txt, frontEnd, true);
 }
 
+ui::DialogResult CGeoEditor::ChangeFrame(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd, bool asWindow) {
+    m_frameChange.SetInputs({m_carnet.PathName(), Inputs().paramPath, Inputs().configFolder, rep::kCaption});
+    CChange_Rep& change = m_frameChange.FrameChange();
+    change.SetCarnet(&m_carnet);
+    const ui::DialogResult shown = asWindow ? frontEnd.DoModal(m_frameChange) : m_frameChange.Run(frontEnd);
+    change.SetCarnet(nullptr);
+    if (shown == ui::DialogResult::Failed) return shown;
+    if (shown != ui::DialogResult::Ok || !change.Changed()) {
+        txt.Print("%s", msg::kNoChange);
+        return shown;
+    }
+    for (ElementChange& element : change.Changes())
+        m_tracked.push_back(std::move(element));
+    change.Changes().clear();
+    Notify(kPartGeoBase);
+    const std::string path = m_carnet.PathName();
+    if (!m_carnet.BackUp(&frontEnd) || !m_carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
+    txt.Print(msg::kSaved, path.c_str());
+    return ui::DialogResult::Ok;
+}
+
+ui::DialogResult CGeoEditor::ChangeFrame(ui::FrontEnd& frontEnd) {
+    CPyrTxtWnd txt(frontEnd);
+    return ChangeFrame(txt, frontEnd, true);
+}
+
 std::optional<std::string> CGeoEditor::ChosenGeoBase(ui::FrontEnd& frontEnd) const {
     std::string path = GeoBase();
     if (!GeoBaseNamed()) {
@@ -214,6 +247,8 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
     }
 
     if (m_reduce && !ReduceStations(txt, frontEnd, false)) return ui::DialogResult::Failed;
+    if (m_changeFrame && ChangeFrame(txt, frontEnd, false) == ui::DialogResult::Failed)
+        return ui::DialogResult::Failed;
     if (m_reading) return ReadFieldBook(*m_reading, txt, frontEnd, false);
     txt.Print(kOpened, path->c_str(), m_carnet.GetSize());
     for (int i = 0; i < m_carnet.GetSize(); ++i)

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "calc/ChangeRepDriver.h"
 #include "calc/StationReductionDriver.h"
 #include "fieldbook/FieldBookFormats.h"
 #include "fieldbook/LectCarnet.h"
@@ -18,9 +19,11 @@ class CPyrTxtWnd;
 // chosen) and shows its elements in the text window, one a line, numbered from 1, with their kind and
 // their values. Opening a GéoBase records it as the last one used. Its menu entry "Ré&duction des
 // reprises" (here "--reduction") reduces the stations first, and the GéoBase is saved when that changed
-// it. Its menu "&Lecture" (here "--lecture FORMAT CARNET") reads a field book into the open GéoBase, which
-// is then saved; a GéoBase named that does not exist yet is created by the reading. As a window
-// (GeoEditorForm.h), the same actions are buttons on the GéoBase open, whose elements are listed.
+// it. Its button "Changement de &repère..." (here "--changement-repere" with "--repere1" and "--repere2")
+// moves the points into another frame, and the GéoBase is saved when that changed it. Its menu "&Lecture"
+// (here "--lecture FORMAT CARNET") reads a field book into the open GéoBase, which is then saved; a GéoBase
+// named that does not exist yet is created by the reading. As a window (GeoEditorForm.h), the same actions
+// are buttons on the GéoBase open, whose elements are listed.
 class CGeoEditor : public ui::Dialog {
 public:
     // The part of a change notice: the GéoBase open, or its elements, changed.
@@ -38,6 +41,12 @@ public:
     // "Ré&duction des reprises": the reduction's dialog run by the front end on the open GéoBase, saved
     // when the reduction changed it. False when it could not be saved.
     bool ReduceStations(ui::FrontEnd& frontEnd);
+    // "Changement de &repère...": the change of frame's dialog run by the front end on the open GéoBase,
+    // saved when it changed it. Failed when it was refused or could not be saved.
+    ui::DialogResult ChangeFrame(ui::FrontEnd& frontEnd);
+    // The elements the changes of frame rewrote, with their copies before and after, oldest first: what
+    // the editor's undo takes back.
+    const std::vector<ElementChange>& TrackedChanges() const { return m_tracked; }
     // "&Lecture": a field book of that format read into the open GéoBase through the reading dialog, run
     // by the front end (or, when the person wants a new GéoBase, into one named after the field book),
     // then saved.
@@ -56,6 +65,9 @@ private:
     // The reduction of the stations on the open GéoBase: false when the GéoBase could not be saved. A
     // command line runs the reduction as its options say; a window shows its dialog.
     bool ReduceStations(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd, bool asWindow);
+    // The change of frame on the open GéoBase: a command line runs it as its options say; a window shows
+    // its dialog.
+    ui::DialogResult ChangeFrame(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd, bool asWindow);
     // The reading of a field book into the open GéoBase (or, when the person wants a new one, into a new
     // GéoBase named after the field book), then saved; its new elements are shown. A command line gives
     // the reading dialog its options; a window shows it.
@@ -65,6 +77,9 @@ private:
     CCarnet m_carnet; // the GéoBase open
     bool m_reduce = false;
     CReductionDriver m_reduction; // its options are declared among the editor's
+    bool m_changeFrame = false;
+    CChangeRepDriver m_frameChange; // its options too
+    std::vector<ElementChange> m_tracked;
     std::optional<Reading> m_reading;
     ReadingRequests m_readingRequests;
 };

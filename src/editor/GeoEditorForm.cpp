@@ -39,12 +39,14 @@ std::vector<ui::Control> CGeoEditorForm::Controls() const {
     controls.push_back(list);
     controls.push_back(
         ui::Ctl(kReduce, ControlKind::Button, "reduction", "Ré&duction des reprises").At(3, 0));
+    controls.push_back(
+        ui::Ctl(kChangeFrame, ControlKind::Button, "repere", "Changement de &repère...").At(4, 0));
     label = ui::Ctl(kFormatLabel, ControlKind::Label, "formatLabel", "F&ormat du carnet :").At(3, 1);
     label.buddy = kFormat;
     controls.push_back(label);
     controls.push_back(ui::Ctl(kFormat, ControlKind::Combo, "format").At(3, 2));
     controls.push_back(ui::Ctl(kRead, ControlKind::Button, "lecture", "&Lecture").At(3, 3));
-    controls.push_back(ui::Ctl(kStatus, ControlKind::Status, "etat").At(4, 0, 1, 4));
+    controls.push_back(ui::Ctl(kStatus, ControlKind::Status, "etat").At(5, 0, 1, 4));
     ui::Control close = ui::Ctl(ui::kIdCancel, ControlKind::Button, "fermer", "&Fermer");
     close.parent = ui::kButtonRow;
     controls.push_back(close);
@@ -105,6 +107,10 @@ void CGeoEditorForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event)
     case kReduce:
         m_editor.ReduceStations(frontEnd);
         Refresh(true); // the reduction changes the values of the elements in place
+        break;
+    case kChangeFrame:
+        m_editor.ChangeFrame(frontEnd);
+        Refresh(true); // the points are rewritten in place
         break;
     case kRead:
         m_editor.ReadFieldBook(frontEnd, FieldBookFormats()[static_cast<std::size_t>(m_format)].format);
