@@ -10,6 +10,7 @@
 #include <cmath>
 #include <string_view>
 #include <unordered_map>
+#include <utility>
 
 namespace pyr {
 
@@ -18,8 +19,8 @@ namespace {
 // One sighting of the station, reduced, waiting to be merged with the other sightings of its point.
 struct Entry {
     ReducedSighting reduced;
-    int next = -1; // the next sighting of the same point, in GéoBase order
-    int last = -1; // on the first sighting of a point: the last one, where the next one is linked
+    int next = -1;           // the next sighting of the same point, in GéoBase order
+    bool repetition = false; // not the first sighting of its point: merged into that one
 };
 
 // The horizontal distance of a reduced slope distance and zenith angle, corrected for scale at the
@@ -78,12 +79,13 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
     int end = carnet.Find(kKindStation, "", stationIndex + 1);
     if (end < 0) end = carnet.GetSize();
 
-    // The sightings reduced, each point's repetitions linked behind its first sighting. The identifiers
-    // are those of the elements themselves, which outlive this function.
+    // The sightings reduced, then each point's repetitions linked behind its first sighting: sorted by
+    // identifier, those of one point follow one another in GéoBase order. The identifiers are those of the
+    // elements themselves, which outlive this function.
     std::vector<Entry> entries;
+    std::vector<std::pair<std::string_view, int>> byPoint;
     entries.reserve(static_cast<std::size_t>(end - stationIndex));
-    std::unordered_map<std::string_view, int> firstOf;
-    std::vector<int> firsts;
+    byPoint.reserve(static_cast<std::size_t>(end - stationIndex));
     for (int i = stationIndex + 1; i < end; ++i) {
         if (!IsSightingKind(carnet.GetType(i))) continue;
         const auto* visee = static_cast<const CVisee*>(carnet.GetAt(i));
@@ -95,24 +97,23 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
         // is 0 by choice and stays so.
         if (settings.replaceZeroTargetHeight && settings.reduction.targetHeights && visee->hp() == 0.0)
             entry.reduced.hp += settings.zeroTargetHeight;
-        const int at = static_cast<int>(entries.size());
-        auto [found, inserted] = firstOf.try_emplace(mat, at);
-        if (inserted) {
-            firsts.push_back(at);
-            entry.last = at;
-        } else {
-            Entry& head = entries[static_cast<std::size_t>(found->second)];
-            entries[static_cast<std::size_t>(head.last)].next = at;
-            head.last = at;
-        }
+        byPoint.emplace_back(mat, static_cast<int>(entries.size()));
         entries.push_back(std::move(entry));
     }
+    std::sort(byPoint.begin(), byPoint.end());
+    result.points.reserve(entries.size());
+    for (std::size_t k = 1; k < byPoint.size(); ++k)
+        if (byPoint[k].first == byPoint[k - 1].first) {
+            entries[static_cast<std::size_t>(byPoint[k - 1].second)].next = byPoint[k].second;
+            entries[static_cast<std::size_t>(byPoint[k].second)].repetition = true;
+        }
 
-    for (int first : firsts) {
-        const Entry& head = entries[static_cast<std::size_t>(first)];
+    for (int first = 0; first < static_cast<int>(entries.size()); ++first) {
+        Entry& head = entries[static_cast<std::size_t>(first)];
+        if (head.repetition) continue;
         RadiatedSighting s;
         s.index = head.reduced.index;
-        s.mat = head.reduced.mat;
+        s.mat = std::move(head.reduced.mat);
         s.code = carnet.GetAt(s.index)->sym();
         s.reference = carnet.GetType(s.index) == kKindReference;
         if (head.next < 0) {
@@ -160,8 +161,13 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
 
 std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
                                                const Tolerances& tolerances) {
+    std::size_t total = 0;
+    for (const RadiatedStation& station : stations)
+        total += station.points.size();
     std::vector<RadiatedPoint> merged;
     std::unordered_map<std::string_view, std::size_t> rankOf;
+    merged.reserve(total);
+    rankOf.reserve(total);
     for (std::size_t st = 0; st < stations.size(); ++st) {
         const std::vector<RadiatedSighting>& points = stations[st].points;
         for (std::size_t p = 0; p < points.size(); ++p) {
