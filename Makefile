@@ -30,7 +30,7 @@ release: deps
 
 # The commands of the module, then the GéoBase editor on a copy of the bundled job, then the orientation
 # of every station with its listing, and point 101 computed by intersection from the three stations that
-# sight it, written back with its listing; then the bundled Quendal-Pc field book converted into a new GéoBase
+# sight it, written back with its listing, and every other point sighted radiated from the stations; then the bundled Quendal-Pc field book converted into a new GéoBase
 # (its codes interpreted by the default table), whose stations are oriented in turn. The demo has a
 # parameter file and a registry of its own (the user's settings are left alone).
 demo: release
@@ -44,6 +44,9 @@ demo: release
 	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalInter \
 		--geobase $(DEMO_DIR)/chantier-demo.geo --point 101 --enregistrer --listing $(DEMO_DIR)/chantier-demo.cin
 	@cat $(DEMO_DIR)/chantier-demo.cin
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalRayon \
+		--geobase $(DEMO_DIR)/chantier-demo.geo --type toutes --enregistrer --listing $(DEMO_DIR)/chantier-demo.cpr
+	@cat $(DEMO_DIR)/chantier-demo.cpr
 	@cp data/carnet-tilleuls.qdl $(DEMO_DIR)/
 	PYRALIS_REGISTRE=$(DEMO_DIR)/registre $(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui \
 		LQuenda $(DEMO_DIR)/carnet-tilleuls.qdl --interpretation 1 </dev/null

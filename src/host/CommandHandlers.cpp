@@ -2,6 +2,7 @@
 
 #include "calc/CalcExcentDriver.h"
 #include "calc/CalcIntersDriver.h"
+#include "calc/CalcRayonDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "calc/ResectionDriver.h"
 #include "core/Strings.h"
@@ -75,6 +76,10 @@ void OnCalRecou(const CommandEntry& command) {
 
 void OnCalExcen(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CCalcExcentDriver>(); });
+}
+
+void OnCalRayon(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcRayonDriver>(); });
 }
 
 void OnReadFieldBook(const CommandEntry& command) {

@@ -22,6 +22,8 @@ void OnCalRelev(const CommandEntry& command);
 void OnCalRecou(const CommandEntry& command);
 // "CalExcen": an eccentric station.
 void OnCalExcen(const CommandEntry& command);
+// "CalRayon": the radiated points.
+void OnCalRayon(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);

@@ -43,7 +43,7 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraCalTrian", "CalTrian", "calcul d'un point par triangulation", OnPending},
     {"PyraCalculV0", "CalculV0", "calcul du V0 d'une station", OnCalculV0},
     {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnPending},
-    {"PyraCalRayon", "CalRayon", "calcul des points rayonnés", OnPending},
+    {"PyraCalRayon", "CalRayon", "calcul des points rayonnés", OnCalRayon},
     {"PyraCalBloc", "CalBloc", "calcul de compensation en bloc", OnPending},
     {"PyraCalNivSm", "CalNivSm", "calcul d'un cheminement altimétrique simple", OnPending},
     {"PyraCalNivSt", "CalNivSt", "calcul d'un cheminement par double station", OnPending},

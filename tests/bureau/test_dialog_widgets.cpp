@@ -6,6 +6,7 @@
 #include "TestSupport.h"
 #include "calc/CalcInters.h"
 #include "calc/CalcIntersDriver.h"
+#include "calc/CalcRayonDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "calc/IntersectionJob.h"
 #include "calc/ResectionDriver.h"
@@ -19,8 +20,10 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
+#include <QRadioButton>
 #include <QTabWidget>
 #include <QTest>
+#include <QTreeWidget>
 #include <gtest/gtest.h>
 
 namespace pyr::test {
@@ -183,6 +186,32 @@ TEST_F(DialogWidgets, AStationIsComputedAndWrittenThroughTheCombinedDialog) {
     EXPECT_NEAR(saved.xAt(point), e.x, kTenthMm);
     EXPECT_NEAR(saved.zAt(point), e.z, kTenthMm);
     EXPECT_NEAR(saved.v0At(saved.findStaRep("E", 1)), 37.5, 1e-4);
+}
+
+// The demonstration job, its stations oriented on their references first: the three detail points each
+// seen from two or three set-ups, the known points checked.
+TEST_F(DialogWidgets, EveryStationOfTheDemoRadiatedThroughTheRadiationDialog) {
+    std::filesystem::copy_file(std::string(PYR_SOURCE_DIR) + "/data/chantier-demo.geo", dir / "chantier.geo");
+    WriteBytes(dir / "Pyralis.ini",
+               std::string(kPlainListingOptions) + "[Options_Calculs]\nRayonV0Calcule=1\n");
+    ASSERT_TRUE(
+        Show(std::make_unique<CCalcRayonDriver>(), dir / "chantier.geo", "calcul des points rayonnés"));
+    QTest::mouseClick(&Find<QRadioButton>(*dialog, "toutes"), Qt::LeftButton);
+    EXPECT_FALSE(Find<QComboBox>(*dialog, "station").isEnabled());
+    Click(*dialog, "calculer");
+    auto& points = Find<QTreeWidget>(*dialog, "resultats");
+    ASSERT_EQ(points.topLevelItemCount(), 3);
+    EXPECT_EQ(points.topLevelItem(0)->text(0).toStdString(), "100");
+    EXPECT_EQ(points.topLevelItem(0)->text(4).toStdString(), "2");
+    Picture(*dialog, "CalRayon-calcule.png");
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    Click(*dialog, "enregistrer");
+    CCarnet saved;
+    saved.Load(nullptr, dir / "chantier.geo");
+    const int point = saved.findMat("100");
+    ASSERT_GE(point, 0);
+    EXPECT_NEAR(saved.xAt(point), points.topLevelItem(0)->text(1).toDouble(), kTenthMm);
+    EXPECT_GE(saved.v0At(saved.findStaRep("S2", 1)), 0.0);
 }
 
 TEST_F(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWrite) {
