@@ -196,6 +196,7 @@ bool CChange_Rep::Apply(ui::FrontEnd& frontEnd) {
     }
     const bool movesPoints = m_options.changeFrame || m_options.projection || m_options.swapYZ;
     const int size = m_carnet->GetSize();
+    m_changes.reserve(static_cast<std::size_t>(size));
     for (int i = 0; i < size; ++i) {
         const int kind = m_carnet->GetType(i);
         if (kind == kKindPoint && movesPoints && MovePoint(i))
