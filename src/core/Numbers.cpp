@@ -16,9 +16,18 @@ bool IsBlank(char c) {
     return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\f' || c == '\v';
 }
 
+// A fixed format of a huge value needs about 310 digits before the point; the usual precisions fit on the
+// stack, so that formatting a million coordinates allocates nothing but the strings returned.
+constexpr int kStackPrecision = 64;
+constexpr std::size_t kStackBuffer = 400 + kStackPrecision;
+
 std::string ToChars(double value, std::chars_format format, int precision) {
-    // A fixed format of a huge value needs about 310 digits before the point.
-    std::vector<char> buffer(static_cast<size_t>(400 + (precision > 0 ? precision : 0)));
+    if (precision <= kStackPrecision) {
+        char buffer[kStackBuffer];
+        auto result = std::to_chars(buffer, buffer + sizeof buffer, value, format, precision);
+        return std::string(buffer, result.ptr);
+    }
+    std::vector<char> buffer(static_cast<size_t>(400 + precision));
     auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value, format, precision);
     return std::string(buffer.data(), result.ptr);
 }
@@ -54,7 +63,16 @@ void AppendShortest(std::string& out, double value) {
 
 double RoundToDecimals(double value, int decimals) {
     if (IsUndefined(value) || !std::isfinite(value)) return value;
+    if (decimals < 0) decimals = 6;
     double rounded = value;
+    // Rounded as the decimal text would show it, without a string in between.
+    if (decimals <= kStackPrecision) {
+        char buffer[kStackBuffer];
+        auto result =
+            std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed, decimals);
+        std::from_chars(buffer, result.ptr, rounded);
+        return rounded;
+    }
     ParseDouble(FormatFixed(value, decimals), rounded);
     return rounded;
 }

@@ -149,11 +149,13 @@ void CDlgCfgListing::rtfInitTab(int rows, int cols) {
 
 template <class Apply>
 void CDlgCfgListing::ForCells(int row, int col, Apply apply) {
+    // Only the cells named are visited: filling a table cell by cell stays linear in its size.
     const int cols = static_cast<int>(m_colWidths.size());
-    for (int r = 0; r < m_rows; ++r)
-        for (int c = 0; c < cols; ++c)
-            if ((row < 0 || row == r) && (col < 0 || col == c))
-                apply(m_cells[static_cast<std::size_t>(r * cols + c)]);
+    const int firstRow = row < 0 ? 0 : row, endRow = row < 0 ? m_rows : std::min(row + 1, m_rows);
+    const int firstCol = col < 0 ? 0 : col, endCol = col < 0 ? cols : std::min(col + 1, cols);
+    for (int r = firstRow; r < endRow; ++r)
+        for (int c = firstCol; c < endCol; ++c)
+            apply(m_cells[static_cast<std::size_t>(r * cols + c)]);
 }
 
 void CDlgCfgListing::rtfSetColWidth(int col, int characters) {
