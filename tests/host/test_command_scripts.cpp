@@ -1,5 +1,5 @@
-// "pyralis CalculV0" and "pyralis GeoEdit --reduction" run as a script runs them: the exit status, what
-// is shown and the GéoBase written back.
+// "pyralis CalculV0", "pyralis GeoEdit --reduction" and "--changement-repere" run as a script runs them: the
+// exit status, what is shown and the GéoBase written back.
 #include "HostTestSupport.h"
 #include "calc/test_v0_geometry.h"
 
@@ -103,6 +103,36 @@ TEST_F(CommandScript, GeoEditReductionSavesWithABackupOnlyWhenItChangedTheGeoBas
         Has(Run("GeoEdit --geobase a.geo --reduction").out, "Aucune modification apportée à la GéoBase !"));
     EXPECT_EQ(ReadBytes(dir / "a.geo"), merged);
     EXPECT_FALSE(std::filesystem::exists(dir / "a.bak"));
+}
+
+// Frame 2 is frame 1 turned by exactly 100 gr about the origin, then moved 1000 m east: (X, Y) becomes
+// (1000 - Y, X); the station's V0 of 50 gr turns to 350 gr.
+TEST_F(CommandScript, GeoEditChangesTheFrameOfItsPointsAndStationsAndSaves) {
+    WriteBytes(dir / "a.geo", "GEOBASE PYRALIS\t1\n"
+                              "1006\tP1\t10\t20\t101.5\t-\n"
+                              "1006\tP2\t-35.5\t4.25\t-999999\t-\n"
+                              "1001\tP1\t1.5\t50\n");
+    const Outcome outcome =
+        Run("GeoEdit a.geo --changement-repere --repere1 0,0,0,100 --repere2 1000,0,900,0 "
+            "--modif-v0 1 --tous-les-points 1");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(
+        Has(outcome.out + outcome.err, "2 Points ont été calculés\n1 Orientations de station modifiées"))
+        << outcome.out << outcome.err;
+    const CCarnet saved = SavedGeoBase(dir / "a.geo");
+    const int p1 = saved.findMat("P1"), p2 = saved.findMat("P2");
+    EXPECT_NEAR(saved.xAt(p1), 980.0, 1e-4);
+    EXPECT_NEAR(saved.yAt(p1), 10.0, 1e-4);
+    EXPECT_NEAR(saved.zAt(p1), 101.5, 1e-4);
+    EXPECT_NEAR(saved.xAt(p2), 995.75, 1e-4);
+    EXPECT_NEAR(saved.yAt(p2), -35.5, 1e-4);
+    EXPECT_NEAR(saved.v0At(saved.findStaRep("P1", 1)), 350.0, 1e-5);
+    EXPECT_TRUE(std::filesystem::exists(dir / "a.bak"));
+
+    const std::string moved = ReadBytes(dir / "a.geo");
+    const Outcome refused = Run("GeoEdit a.geo --changement-repere --repere1 0,0,0,100 --repere2 1000,0");
+    EXPECT_EQ(refused.status, 1);
+    EXPECT_EQ(ReadBytes(dir / "a.geo"), moved);
 }
 
 } // namespace
