@@ -3,23 +3,47 @@
 #include "geobase/Elements.h"
 #include "geobase/Kinds.h"
 
+#include <algorithm>
+#include <cstring>
+#include <functional>
+
 namespace pyr {
 
-void CarnetIndex::Invalidate() {
-    if (!m_valid) return;
+namespace {
+
+constexpr std::uint64_t kRankBits = 0xFFFFFFFFu;
+
+std::uint64_t Tag(std::uint64_t hash) {
+    return hash & ~kRankBits;
+}
+
+} // namespace
+
+bool CarnetIndex::Name::Is(std::string_view text) const {
+    if (text.size() != mat.size()) return false;
+    if (text.size() <= kHeld) return std::memcmp(held, text.data(), text.size()) == 0;
+    return std::memcmp(held, text.data(), kHeld) == 0 && text == mat;
+}
+
+void CarnetIndex::Clear() {
     m_valid = false;
-    m_byMat.clear();
+    m_names.clear();
+    std::fill(m_slots.begin(), m_slots.end(), 0);
     for (auto& list : m_byKind)
         list.clear();
 }
 
+void CarnetIndex::Invalidate() {
+    if (m_valid) Clear();
+}
+
 void CarnetIndex::Build(const std::vector<std::unique_ptr<CElement>>& elements, const std::vector<int>& kinds,
                         std::uint64_t identifierChanges) {
-    m_valid = false;
-    m_byMat.clear();
-    for (auto& list : m_byKind)
-        list.clear();
-    m_byMat.reserve(elements.size() / 2 + 16);
+    Clear();
+    // Mostly a point and its sightings, or a station's name and its point's: half as many identifiers
+    // as elements is room enough to start with.
+    m_names.reserve(elements.size() / 2 + 16);
+    Reserve(elements.size() / 2 + 16);
     for (std::size_t i = 0; i < elements.size(); ++i)
         Add(static_cast<int>(i), *elements[i], kinds[i]);
     m_size = elements.size();
@@ -37,14 +61,51 @@ void CarnetIndex::Appended(std::size_t size, std::uint64_t identifierChanges, co
     m_size = size;
 }
 
+void CarnetIndex::Reserve(std::size_t names) {
+    std::size_t capacity = 16;
+    while (capacity < 2 * names)
+        capacity *= 2;
+    if (capacity <= m_slots.size()) return;
+    m_slots.assign(capacity, 0);
+    for (std::size_t rank = 0; rank < m_names.size(); ++rank)
+        m_slots[SlotOf(m_names[rank].mat, m_names[rank].hash)] = Tag(m_names[rank].hash) | (rank + 1);
+}
+
+std::size_t CarnetIndex::SlotOf(std::string_view mat, std::uint64_t hash) const {
+    const std::size_t mask = m_slots.size() - 1;
+    for (std::size_t slot = hash & mask;; slot = (slot + 1) & mask) {
+        const std::uint64_t entry = m_slots[slot];
+        if (entry == 0) return slot;
+        if (Tag(entry) == Tag(hash) && m_names[(entry & kRankBits) - 1].Is(mat)) return slot;
+    }
+}
+
 void CarnetIndex::Add(int index, const CElement& element, int kind) {
-    if (!element.mat().empty()) m_byMat[element.mat()].push_back(index);
     if (IsKnownKind(kind)) m_byKind[static_cast<std::size_t>(kind - kKindComment)].push_back(index);
+    const std::string& mat = element.mat();
+    if (mat.empty()) return;
+    const std::uint64_t hash = std::hash<std::string_view>{}(mat);
+    std::size_t slot = SlotOf(mat, hash);
+    if (m_slots[slot] != 0) {
+        m_names[(m_slots[slot] & kRankBits) - 1].indices.push_back(index);
+        return;
+    }
+    if (2 * (m_names.size() + 1) > m_slots.size()) {
+        Reserve(m_names.size() + 1);
+        slot = SlotOf(mat, hash);
+    }
+    Name& name = m_names.emplace_back();
+    name.indices.push_back(index);
+    name.hash = hash;
+    name.mat = mat;
+    std::memcpy(name.held, mat.data(), std::min(mat.size(), Name::kHeld));
+    m_slots[slot] = Tag(hash) | m_names.size();
 }
 
 const std::vector<int>* CarnetIndex::WithMat(std::string_view mat) const {
-    auto it = m_byMat.find(mat);
-    return it == m_byMat.end() ? nullptr : &it->second;
+    if (m_slots.empty() || mat.empty()) return nullptr;
+    const std::uint64_t entry = m_slots[SlotOf(mat, std::hash<std::string_view>{}(mat))];
+    return entry == 0 ? nullptr : &m_names[(entry & kRankBits) - 1].indices;
 }
 
 const std::vector<int>& CarnetIndex::WithKind(int kind) const {

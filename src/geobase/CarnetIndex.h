@@ -4,7 +4,6 @@
 #include <cstdint>
 #include <memory>
 #include <string_view>
-#include <unordered_map>
 #include <vector>
 
 namespace pyr {
@@ -27,17 +26,39 @@ public:
     void Appended(std::size_t size, std::uint64_t identifierChanges, const CElement& element, int kind);
 
     // The indices of the elements of that identifier (all kinds), in increasing order; null when none.
+    // Valid until the index changes.
     const std::vector<int>* WithMat(std::string_view mat) const;
     // The indices of the elements of that kind, in increasing order.
     const std::vector<int>& WithKind(int kind) const;
 
 private:
+    // One identifier: one cache line, its text held in it when short, so that a look-up in a store of a
+    // million identifiers reads its slot, this line and the indices.
+    struct alignas(64) Name {
+        std::vector<int> indices;
+        std::uint64_t hash = 0;
+        std::string_view mat; // viewed in its first element
+        static constexpr std::size_t kHeld = 16;
+        char held[kHeld] = {}; // the first kHeld bytes of mat
+
+        bool Is(std::string_view text) const;
+    };
+
     void Add(int index, const CElement& element, int kind);
+    void Clear();
+    // The slots for `names` identifiers: at most half of them used, so that a look-up seldom probes
+    // more than one or two.
+    void Reserve(std::size_t names);
+    // The slot of that identifier, or the empty slot where it would go.
+    std::size_t SlotOf(std::string_view mat, std::uint64_t hash) const;
 
     bool m_valid = false;
     std::size_t m_size = 0;
     std::uint64_t m_identifierChanges = 0;
-    std::unordered_map<std::string_view, std::vector<int>> m_byMat;
+    std::vector<Name> m_names; // in the order of their first element
+    // Open addressing, probed in sequence: 0 for an empty slot, else the upper half of the identifier's
+    // hash and its rank in m_names plus one.
+    std::vector<std::uint64_t> m_slots;
     std::array<std::vector<int>, 66> m_byKind; // kinds 1000 to 1065
     std::vector<int> m_none;
 };
