@@ -153,11 +153,64 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
             check.sighting = std::move(s);
             result.checks.push_back(std::move(check));
         } else {
+            // The first element bearing the identifier names the point for the merge.
+            s.key = carnet.Find(0, s.mat);
             result.points.push_back(std::move(s));
         }
     }
     return result;
 }
+
+void Determinations::push_back(const Determination& determination) {
+    if (m_size == 0) {
+        m_first = determination;
+    } else {
+        if (m_size == 1) {
+            m_all.reserve(4);
+            m_all.push_back(m_first);
+        }
+        m_all.push_back(determination);
+    }
+    ++m_size;
+}
+
+namespace {
+
+// The mean of a point's determinations, their spread, and whether it is within the tolerances.
+void Summarise(RadiatedPoint& point, const std::vector<RadiatedStation>& stations,
+               const Tolerances& tolerances) {
+    double sumX = 0.0, sumY = 0.0, sumZ = 0.0, minZ = 0.0, maxZ = 0.0;
+    int withZ = 0;
+    const Determinations& determinations = point.determinations;
+    auto sighting = [&](const Determination& d) -> const RadiatedSighting& {
+        return stations[d.station].points[d.point];
+    };
+    for (const Determination& d : determinations) {
+        const RadiatedSighting& s = sighting(d);
+        sumX += s.x, sumY += s.y;
+        if (!IsKnown(s.z)) continue;
+        sumZ += s.z;
+        minZ = withZ == 0 ? s.z : std::min(minZ, s.z);
+        maxZ = withZ == 0 ? s.z : std::max(maxZ, s.z);
+        ++withZ;
+    }
+    const auto n = static_cast<double>(determinations.size());
+    point.x = sumX / n;
+    point.y = sumY / n;
+    point.z = withZ > 0 ? sumZ / withZ : kUndefined;
+    point.spreadZ = maxZ - minZ;
+    point.spreadXY = 0.0;
+    // Every pair: a point is seldom determined from more than a few stations.
+    for (std::size_t a = 0; a < determinations.size(); ++a)
+        for (std::size_t b = a + 1; b < determinations.size(); ++b) {
+            const RadiatedSighting &sa = sighting(determinations[a]), &sb = sighting(determinations[b]);
+            point.spreadXY = std::max(point.spreadXY, std::hypot(sa.x - sb.x, sa.y - sb.y));
+        }
+    point.outOfTolerance =
+        point.spreadXY > tolerances.customDistance || point.spreadZ > tolerances.customHeight;
+}
+
+} // namespace
 
 std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
                                                const Tolerances& tolerances) {
@@ -165,51 +218,54 @@ std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation
     for (const RadiatedStation& station : stations)
         total += station.points.size();
     std::vector<RadiatedPoint> merged;
-    std::unordered_map<std::string_view, std::size_t> rankOf;
     merged.reserve(total);
-    rankOf.reserve(total);
-    for (std::size_t st = 0; st < stations.size(); ++st) {
-        const std::vector<RadiatedSighting>& points = stations[st].points;
-        for (std::size_t p = 0; p < points.size(); ++p) {
-            auto [found, inserted] = rankOf.try_emplace(points[p].mat, merged.size());
-            if (inserted) {
-                merged.emplace_back();
-                merged.back().mat = points[p].mat;
+    std::vector<std::size_t> multiple; // the points determined more than once
+    // The points are grouped by their key, which RadiateStation gives: a table as long as the GéoBase,
+    // read nearly in order since the points mostly come in the order of their first sighting. Sightings
+    // without a key, made elsewhere, have their points grouped by identifier.
+    std::vector<int> rankOfKey; // -1 for a key not seen yet
+    std::unordered_map<std::string_view, std::size_t> rankOfName;
+    for (const bool byName : {false, true}) {
+        merged.clear();
+        multiple.clear();
+        if (byName) rankOfName.reserve(total);
+        bool complete = true;
+        for (std::size_t st = 0; st < stations.size() && complete; ++st) {
+            const std::vector<RadiatedSighting>& points = stations[st].points;
+            for (std::size_t p = 0; p < points.size(); ++p) {
+                const RadiatedSighting& s = points[p];
+                std::size_t rank = merged.size();
+                if (byName) {
+                    rank = rankOfName.try_emplace(s.mat, rank).first->second;
+                } else if (s.key < 0) {
+                    complete = false;
+                    break;
+                } else {
+                    const auto key = static_cast<std::size_t>(s.key);
+                    if (key >= rankOfKey.size())
+                        rankOfKey.resize(std::max(key + 1, 2 * rankOfKey.size()), -1);
+                    if (rankOfKey[key] < 0)
+                        rankOfKey[key] = static_cast<int>(rank);
+                    else
+                        rank = static_cast<std::size_t>(rankOfKey[key]);
+                }
+                if (rank == merged.size()) {
+                    // Summed at once, while the sighting is at hand: most points have no other.
+                    RadiatedPoint& point = merged.emplace_back();
+                    point.mat = s.mat;
+                    point.determinations.push_back({st, p});
+                    Summarise(point, stations, tolerances);
+                    continue;
+                }
+                RadiatedPoint& point = merged[rank];
+                point.determinations.push_back({st, p});
+                if (point.determinations.size() == 2) multiple.push_back(rank);
             }
-            merged[found->second].determinations.push_back({st, p});
         }
+        if (complete) break;
     }
-
-    for (RadiatedPoint& point : merged) {
-        double sumX = 0.0, sumY = 0.0, sumZ = 0.0, minZ = 0.0, maxZ = 0.0;
-        int withZ = 0;
-        const auto& determinations = point.determinations;
-        auto sighting = [&](const Determination& d) -> const RadiatedSighting& {
-            return stations[d.station].points[d.point];
-        };
-        for (const Determination& d : determinations) {
-            const RadiatedSighting& s = sighting(d);
-            sumX += s.x, sumY += s.y;
-            if (!IsKnown(s.z)) continue;
-            sumZ += s.z;
-            minZ = withZ == 0 ? s.z : std::min(minZ, s.z);
-            maxZ = withZ == 0 ? s.z : std::max(maxZ, s.z);
-            ++withZ;
-        }
-        const auto n = static_cast<double>(determinations.size());
-        point.x = sumX / n;
-        point.y = sumY / n;
-        if (withZ > 0) point.z = sumZ / withZ;
-        point.spreadZ = maxZ - minZ;
-        // Every pair: a point is seldom determined from more than a few stations.
-        for (std::size_t a = 0; a < determinations.size(); ++a)
-            for (std::size_t b = a + 1; b < determinations.size(); ++b) {
-                const RadiatedSighting &sa = sighting(determinations[a]), &sb = sighting(determinations[b]);
-                point.spreadXY = std::max(point.spreadXY, std::hypot(sa.x - sb.x, sa.y - sb.y));
-            }
-        point.outOfTolerance =
-            point.spreadXY > tolerances.customDistance || point.spreadZ > tolerances.customHeight;
-    }
+    for (std::size_t rank : multiple)
+        Summarise(merged[rank], stations, tolerances);
     return merged;
 }
 

@@ -5,6 +5,7 @@
 #include "calc/Tolerances.h"
 #include "core/Undefined.h"
 
+#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -32,6 +33,8 @@ struct RadiationSettings {
 // One radiated sighting: the repetitions of one point from one station merged into the first of them.
 struct RadiatedSighting {
     int index = -1;              // the first sighting element of that point from the station
+    int key = -1;                // of a new point: the first element of the GéoBase bearing its identifier,
+                                 // the same from every station, which the merge groups by
     std::string mat;             // the point sighted
     std::string code;            // the sighting's code (its symbol)
     int repetitions = 1;         // sightings of the point merged
@@ -89,10 +92,27 @@ struct Determination {
     std::size_t point = 0;   // rank of the sighting in its station's points
 };
 
+// The determinations of one point, in the order of the stations. Most points are seen from one station
+// only: that one is kept in place, without a block of memory of its own.
+class Determinations {
+public:
+    std::size_t size() const { return m_size; }
+    bool empty() const { return m_size == 0; }
+    const Determination* begin() const { return m_size <= 1 ? &m_first : m_all.data(); }
+    const Determination* end() const { return begin() + m_size; }
+    const Determination& operator[](std::size_t i) const { return begin()[i]; }
+    void push_back(const Determination& determination);
+
+private:
+    Determination m_first;
+    std::vector<Determination> m_all; // every one, the first included, once there are two
+    std::size_t m_size = 0;
+};
+
 // A new point and all its determinations: the plain mean of their X, Y (and of their Z where known).
 struct RadiatedPoint {
     std::string mat;
-    std::vector<Determination> determinations; // in the order of the stations
+    Determinations determinations; // in the order of the stations
     double x = kUndefined;
     double y = kUndefined;
     double z = kUndefined;

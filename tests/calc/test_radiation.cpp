@@ -4,9 +4,13 @@
 // and found again by hand.
 #include "ExactReadings.h"
 #include "GeoLines.h"
+#include "TestSupport.h"
 #include "calc/Radiation.h"
+#include "calc/RadiationListing.h"
 #include "calc/RadiationTexts.h"
 #include "geobase/Selection.h"
+#include "settings/ListingObject.h"
+#include "ui/ScriptedFrontEnd.h"
 
 #include <string>
 #include <vector>
@@ -378,11 +382,92 @@ TEST(RadiationMerge, APointFromSeveralStationsKeepsTheMeanAndItsSpread) {
     EXPECT_NEAR(points[1].y, kP[0].y, kTenthMm);
     EXPECT_NEAR(points[1].z, kP[0].z, kTenthMm);
 
+    // Sightings made elsewhere, without the key RadiateStation gives, are grouped by identifier alike.
+    std::vector<RadiatedStation> unkeyed = stations;
+    unkeyed[1].points[0].key = -1;
+    const std::vector<RadiatedPoint> byName = MergeDeterminations(unkeyed, tolerances);
+    ASSERT_EQ(byName.size(), points.size());
+    for (std::size_t i = 0; i < points.size(); ++i) {
+        EXPECT_EQ(byName[i].mat, points[i].mat);
+        ASSERT_EQ(byName[i].determinations.size(), points[i].determinations.size());
+        for (std::size_t d = 0; d < points[i].determinations.size(); ++d)
+            EXPECT_EQ(byName[i].determinations[d].station, points[i].determinations[d].station);
+        EXPECT_EQ(byName[i].x, points[i].x);
+        EXPECT_EQ(byName[i].spreadXY, points[i].spreadXY);
+    }
+
     tolerances.customDistance = 0.007; // 8 mm sin(AV) is more
     EXPECT_TRUE(MergeDeterminations(stations, tolerances)[0].outOfTolerance);
     tolerances.customDistance = 0.01;
     tolerances.customHeight = std::fabs(up) - 0.0005;
     EXPECT_TRUE(MergeDeterminations(stations, tolerances)[0].outOfTolerance);
+}
+
+// The listing in plain text, byte for byte: each station's points in the surveyor's columns (the code
+// first, so left-aligned with the identifiers), its checks of known points, the sightings that gave
+// nothing, then the points seen from several stations with their mean.
+TEST(RadiationListing, StationsTheirPointsChecksAndRepeatedPointsAreTabulated) {
+    Geo geo = OneStation();
+    const Reading again = Read(kS1, kHi, kV0, kP[2], kHp);
+    geo.Sta("S1", kHi, kV0).Mes("P3", kHp, again.ah, again.av, again.di + 0.004, "MUR");
+    geo.Mes("P5", kHp, 50.0, 100.0, 0.0);
+    std::vector<RadiatedStation> stations;
+    for (int index : {2, 9})
+        stations.push_back(RadiateStation(geo, index, RadiationSettings{}));
+    const std::vector<RadiatedPoint> points = MergeDeterminations(stations, Tolerances{});
+    const std::vector<std::string> columns = RadiationColumns("CS,N,X,Y,Z,GI");
+
+    ui::ScriptedFrontEnd frontEnd;
+    TempDir folder;
+    const std::string file = folder / "rayon.cpr";
+    CDlgCfgListing listing{frontEnd};
+    listing.SetFormat(kListingTextNoPageCount);
+    listing.SetDeciCoor(3);
+    listing.SetDeciAlti(3);
+    listing.SetDeciDist(3);
+    listing.SetDeciDeni(3);
+    listing.SetDeciAngl(4);
+    ASSERT_TRUE(listing.OpenListing(file, "w"));
+    WriteRadiation(listing, {stations, points, columns, true});
+    ASSERT_TRUE(listing.CloseListing(file, false));
+    EXPECT_EQ(ReadBytes(file), R"(| Station S1, reprise 1 |
+X = 1652345.678   Y = 8176543.210   Z = 150.000   HI = 1.550
+V0 = 37.4150 (celui de la GéoBase)
+
+Points rayonnés
+---------------
+| Code  | Matricule |      X      |      Y      |    Z    |   Gis.   |
+| BORNE |        P1 | 1652465.678 | 8176628.210 | 153.200 |  60.7653 |
+|       |        P2 | 1652281.678 | 8176773.210 | 147.100 | 382.7224 |
+|       |        P3 | 1652035.678 | 8176531.210 | 160.400 | 297.5369 |
+|       |        P4 | 1652390.678 | 8176393.210 | 139.800 | 181.4453 |
+
+Contrôle des points connus
+--------------------------
+| Matricule |  Gis.   |   DH    | Ecart long. | Ecart transv. | Ecart Z |
+| K1        | 59.0334 | 500.000 |      +0.000 |        +0.000 |  +0.000 |
+
+| Station S1, reprise 2 |
+X = 1652345.678   Y = 8176543.210   Z = 150.000   HI = 1.550
+V0 = 37.4150 (celui de la GéoBase)
+
+Points rayonnés
+---------------
+| Code | Matricule |      X      |      Y      |    Z    |   Gis.   |
+| MUR  |        P3 | 1652035.674 | 8176531.210 | 160.400 | 297.5369 |
+
+| Visées non calculées |
+| P5 : sans distance   |
+
+| Points déterminés plusieurs fois |
+
+| Matricule | Station |      X      |      Y      |    Z    |
+| P3        | S1(1)   | 1652035.678 | 8176531.210 | 160.400 |
+| P3        | S1(2)   | 1652035.674 | 8176531.210 | 160.400 |
+| P3        | Moyenne | 1652035.676 | 8176531.210 | 160.400 |
+Ecarts : 0.004 m en XY, 0.000 m en Z
+
+)");
 }
 
 } // namespace
