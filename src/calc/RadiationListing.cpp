@@ -46,19 +46,43 @@ std::string Title(const std::string& token) {
     return ColumnOf(token)->title;
 }
 
-std::string Cell(const CDlgCfgListing& listing, const RadiatedSighting& s, const std::string& token) {
+// The position of each column in kColumns.
+std::vector<std::size_t> ColumnRanks(const std::vector<std::string>& columns) {
+    std::vector<std::size_t> ranks;
+    for (const std::string& token : columns) {
+        const Column* column = ColumnOf(token);
+        ranks.push_back(column ? static_cast<std::size_t>(column - kColumns.data()) : kColumns.size());
+    }
+    return ranks;
+}
+
+// The text of the column of that rank in kColumns.
+std::string Cell(const CDlgCfgListing& listing, const RadiatedSighting& s, std::size_t rank) {
     const bool swap = CPointGen::SwapXY();
-    if (token == "N") return s.mat;
-    if (token == "X") return listing.FormatCoor(swap ? s.y : s.x);
-    if (token == "Y") return listing.FormatCoor(swap ? s.x : s.y);
-    if (token == "Z") return listing.FormatAlti(s.z);
-    if (token == "GI") return listing.FormatAngl(s.bearing, -1, true);
-    if (token == "DH") return listing.FormatDist(s.dh);
-    if (token == "HP") return listing.FormatAlti(s.hp);
-    if (token == "AH") return listing.FormatAngl(s.ah, -1, true);
-    if (token == "AV") return listing.FormatAngl(s.av);
-    if (token == "DI") return listing.FormatDist(s.di);
-    return s.code;
+    switch (rank) {
+    case 0:
+        return s.mat;
+    case 1:
+        return listing.FormatCoor(swap ? s.y : s.x);
+    case 2:
+        return listing.FormatCoor(swap ? s.x : s.y);
+    case 3:
+        return listing.FormatAlti(s.z);
+    case 4:
+        return listing.FormatAngl(s.bearing, -1, true);
+    case 5:
+        return listing.FormatDist(s.dh);
+    case 6:
+        return listing.FormatAlti(s.hp);
+    case 7:
+        return listing.FormatAngl(s.ah, -1, true);
+    case 8:
+        return listing.FormatAngl(s.av);
+    case 9:
+        return listing.FormatDist(s.di);
+    default:
+        return s.code;
+    }
 }
 
 void WriteStationHeading(CDlgCfgListing& listing, const RadiatedStation& result) {
@@ -80,37 +104,40 @@ void WriteStationHeading(CDlgCfgListing& listing, const RadiatedStation& result)
 }
 
 void WritePoints(CDlgCfgListing& listing, const RadiatedStation& result,
-                 const std::vector<std::string>& columns) {
+                 const std::vector<std::string>& columns, ListingTable& table) {
     if (result.points.empty()) return;
-    std::vector<Row> rows;
-    rows.reserve(result.points.size() + 1);
-    Row titles;
-    for (const std::string& token : columns)
-        titles.push_back(Title(token));
-    rows.push_back(std::move(titles));
+    const std::vector<std::size_t> ranks = ColumnRanks(columns);
+    table.Clear(columns.size());
+    std::string* titles = table.AddRow();
+    for (std::size_t c = 0; c < columns.size(); ++c)
+        titles[c] = Title(columns[c]);
     for (const RadiatedSighting& point : result.points) {
-        Row row;
-        row.reserve(columns.size());
-        for (const std::string& token : columns)
-            row.push_back(Cell(listing, point, token));
-        rows.push_back(std::move(row));
+        std::string* row = table.AddRow();
+        for (std::size_t c = 0; c < ranks.size(); ++c)
+            row[c] = Cell(listing, point, ranks[c]);
     }
     listing.rtfWriteTabTitle(rayon::kListPointsTitle);
     // The identifier and the code are texts; the others numbers.
     const bool nameFirst = !columns.empty() && (columns.front() == "N" || columns.front() == "CS");
-    DrawTable(listing, rows, true, nameFirst ? 1 : 0);
+    DrawTable(listing, table, true, nameFirst ? 1 : 0);
     Blank(listing);
 }
 
-void WriteChecks(CDlgCfgListing& listing, const RadiatedStation& result) {
+void WriteChecks(CDlgCfgListing& listing, const RadiatedStation& result, ListingTable& table) {
     if (result.checks.empty()) return;
-    std::vector<Row> rows{Row(std::begin(rayon::kListCheckColumns), std::end(rayon::kListCheckColumns))};
-    for (const RadiationCheck& check : result.checks)
-        rows.push_back({check.sighting.mat, listing.FormatAngl(check.sighting.bearing, -1, true),
-                        listing.FormatDist(check.sighting.dh), listing.FormatDeni(check.along),
-                        listing.FormatDeni(check.across), listing.FormatDeni(check.dz)});
+    table.Clear(std::size(rayon::kListCheckColumns));
+    std::copy(std::begin(rayon::kListCheckColumns), std::end(rayon::kListCheckColumns), table.AddRow());
+    for (const RadiationCheck& check : result.checks) {
+        std::string* row = table.AddRow();
+        row[0] = check.sighting.mat;
+        row[1] = listing.FormatAngl(check.sighting.bearing, -1, true);
+        row[2] = listing.FormatDist(check.sighting.dh);
+        row[3] = listing.FormatDeni(check.along);
+        row[4] = listing.FormatDeni(check.across);
+        row[5] = listing.FormatDeni(check.dz);
+    }
     listing.rtfWriteTabTitle(rayon::kListChecksTitle);
-    DrawTable(listing, rows, true, 1);
+    DrawTable(listing, table, true, 1);
     Blank(listing);
 }
 
@@ -170,11 +197,12 @@ std::vector<std::string> RadiationColumns(std::string_view text) {
 }
 
 void WriteRadiation(CDlgCfgListing& listing, const RadiationReport& report) {
+    ListingTable table; // filled again for each table
     for (const RadiatedStation& result : report.stations) {
         if (!result.usable) continue;
         WriteStationHeading(listing, result);
-        WritePoints(listing, result, report.columns);
-        if (report.checks) WriteChecks(listing, result);
+        WritePoints(listing, result, report.columns, table);
+        if (report.checks) WriteChecks(listing, result, table);
         WriteSkipped(listing, result);
     }
     const bool multiple = std::any_of(report.points.begin(), report.points.end(),

@@ -121,10 +121,13 @@ int CDlgCfgListing::Emit(std::string_view text, bool mayBreak) {
 }
 
 void CDlgCfgListing::EndLine() {
-    if (IsRichText())
+    if (IsRichText()) {
         Raw("\\pard\\plain\\f0\\fs20 " + RtfEscape(m_pending) + "\\par\n");
-    else
-        Raw(m_pending + "\n");
+    } else {
+        m_pending += '\n';
+        Raw(m_pending);
+        m_pending.pop_back();
+    }
     if (m_output == ListingOutput::TextWindow || m_echo) m_frontEnd.TextLine(m_pending);
     ++m_lineCount;
     m_pending.clear();

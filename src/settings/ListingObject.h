@@ -4,6 +4,7 @@
 #include "ui/FrontEnd.h"
 
 #include <memory>
+#include <span>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -181,6 +182,12 @@ public:
     void rtfSetCellShading(int row, int col, int percent);
     void rtfSetCellStyle(int row, int col, unsigned style);
     void rtfOffsetLeft(int characters); // of the next tables
+    // Plain text only: one row of a table as rtfDrawTab writes it, "| text | text |" after the left
+    // offset, each text padded with blanks to its column's width (characters) on the sides its alignment
+    // says. For a big table whose texts are at hand, drawn without filling its cells first. `widths` and
+    // `aligns` have one item per text. Returns the lines written.
+    int WritePlainTableRow(std::span<const std::string_view> texts, std::span<const int> widths,
+                           std::span<const RtfAlign> aligns);
 
 private:
     struct Sep {
@@ -195,7 +202,8 @@ private:
     void BreakPageIfFull();
     template <class Apply>
     void ForCells(int row, int col, Apply apply);
-    std::string PlainTableRow(int row) const;
+    void AppendPlainTableRow(std::string& line, std::span<const std::string_view> texts,
+                             std::span<const int> widths, std::span<const RtfAlign> aligns) const;
 
     ui::FrontEnd& m_frontEnd;
     int m_format = kDefaultListingFormat;
@@ -215,6 +223,7 @@ private:
     int m_page = 0;
     int m_lineCount = 0;
     std::string m_pending; // the line being written
+    std::string m_row;     // a table's row in plain text, kept to be filled again
     bool m_lineOpen = false;
 
     Sep m_sep[3] = {{-1, '='}, {-1, '-'}, {-1, '*'}};

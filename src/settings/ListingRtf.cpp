@@ -190,22 +190,32 @@ void CDlgCfgListing::rtfOffsetLeft(int characters) {
     m_offsetLeft = std::max(characters, 0);
 }
 
-// A row of the table in plain text: "| cell | cell |", each cell padded to its column's width.
-std::string CDlgCfgListing::PlainTableRow(int row) const {
-    const int cols = static_cast<int>(m_colWidths.size());
-    std::string line(static_cast<std::size_t>(m_offsetLeft), ' ');
+// A row of a table in plain text: "| cell | cell |", each cell padded to its column's width.
+void CDlgCfgListing::AppendPlainTableRow(std::string& line, std::span<const std::string_view> texts,
+                                         std::span<const int> widths,
+                                         std::span<const RtfAlign> aligns) const {
+    line.append(static_cast<std::size_t>(m_offsetLeft), ' ');
     line += '|';
-    for (int c = 0; c < cols; ++c) {
-        const RtfCell& cell = m_cells[static_cast<std::size_t>(row * cols + c)];
-        const int width = m_colWidths[static_cast<std::size_t>(c)];
-        const int blanks = std::max(0, width - static_cast<int>(Utf8Length(cell.text)));
-        const int before = cell.align == RtfAlign::Right    ? blanks
-                           : cell.align == RtfAlign::Center ? blanks / 2
-                                                            : 0;
-        line += ' ' + std::string(static_cast<std::size_t>(before), ' ') + cell.text +
-                std::string(static_cast<std::size_t>(blanks - before), ' ') + " |";
+    for (std::size_t c = 0; c < texts.size(); ++c) {
+        const int blanks = std::max(0, widths[c] - static_cast<int>(Utf8Length(texts[c])));
+        const int before = aligns[c] == RtfAlign::Right    ? blanks
+                           : aligns[c] == RtfAlign::Center ? blanks / 2
+                                                           : 0;
+        line += ' ';
+        line.append(static_cast<std::size_t>(before), ' ');
+        line += texts[c];
+        line.append(static_cast<std::size_t>(blanks - before), ' ');
+        line += " |";
     }
-    return line;
+}
+
+int CDlgCfgListing::WritePlainTableRow(std::span<const std::string_view> texts, std::span<const int> widths,
+                                       std::span<const RtfAlign> aligns) {
+    if (m_lineOpen) EndLine();
+    m_row.clear();
+    AppendPlainTableRow(m_row, texts, widths, aligns);
+    m_row += '\n';
+    return Emit(m_row);
 }
 
 int CDlgCfgListing::rtfDrawTab() {
@@ -213,10 +223,18 @@ int CDlgCfgListing::rtfDrawTab() {
     const int cols = static_cast<int>(m_colWidths.size());
     if (m_rows == 0 || cols == 0) return 0;
     if (!IsRichText()) {
-        std::string text;
-        for (int r = 0; r < m_rows; ++r)
-            text += PlainTableRow(r) + "\n";
-        return Emit(text);
+        std::vector<std::string_view> texts(static_cast<std::size_t>(cols));
+        std::vector<RtfAlign> aligns(static_cast<std::size_t>(cols));
+        int lines = 0;
+        for (int r = 0; r < m_rows; ++r) {
+            for (std::size_t c = 0; c < texts.size(); ++c) {
+                const RtfCell& cell = m_cells[static_cast<std::size_t>(r * cols) + c];
+                texts[c] = cell.text;
+                aligns[c] = cell.align;
+            }
+            lines += WritePlainTableRow(texts, m_colWidths, aligns);
+        }
+        return lines;
     }
     std::string rtf;
     for (int r = 0; r < m_rows; ++r) {

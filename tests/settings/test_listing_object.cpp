@@ -1,9 +1,15 @@
 #include "SettingsTestSupport.h"
+#include "core/Angles.h"
+#include "core/Numbers.h"
 #include "core/Strings.h"
+#include "core/TextEncoding.h"
 #include "core/Undefined.h"
 #include "settings/ListingObject.h"
 
 #include <clocale>
+#include <cmath>
+#include <cstdint>
+#include <string_view>
 #include <utility>
 
 namespace pyr::test {
@@ -84,6 +90,83 @@ TEST_F(ListingObject, NumbersFollowTheStoreDecimalsAndNeverShowTheUndefinedMarke
     EXPECT_EQ(listing.FormatAngl(-10.0, 4, true), "390.0000");
     EXPECT_EQ(listing.FormatAngl(399.999996, 5, true), "0.00000");
     EXPECT_EQ(listing.FormatAngl(-0.0123, 4), "-0.0123");
+}
+
+// Listings write their numbers from the digits directly; they must be the very texts that the general
+// conversion gives: ties of the exact binary value to the even digit, values a hair on either side of a
+// half, the sign of what rounds to zero, sizes beyond the direct writing.
+TEST_F(ListingObject, NumbersAreTheTextsOfTheGeneralConversion) {
+    std::vector<double> values = {0.0,    -0.0,   0.5,    1.5,       2.5,          -2.5,         0.125,
+                                  0.375,  1.0625, 1e-300, -1e-300,   123.456789,   -0.0004,      399.999996,
+                                  4.5e15, 1e300,  -1e300, 9.9999999, 651234.56785, 6862000.00005};
+    std::uint64_t state = 12345;
+    auto next = [&state] {
+        state = state * 6364136223846793005u + 1442695040888963407u;
+        return state >> 11;
+    };
+    for (int i = 0; i < 5000; ++i) {
+        const double unit = static_cast<double>(next()) / 9007199254740992.0; // [0, 1)
+        const int decimals = static_cast<int>(next() % 10);
+        double scaled = std::ldexp(unit, static_cast<int>(next() % 80) - 30);
+        values.push_back(i % 2 ? scaled : -scaled);
+        // A half of the last decimal, and the doubles beside it.
+        const double half = (std::floor(unit * 1e7) + 0.5) / std::pow(10.0, decimals);
+        values.insert(values.end(), {half, std::nextafter(half, 0.0), std::nextafter(half, 1e9)});
+    }
+    for (const double value : values)
+        for (int decimals = 0; decimals <= 12; ++decimals) {
+            ASSERT_EQ(listing.FormatCoor(value, decimals), FormatFixedShown(value, decimals))
+                << std::hexfloat << value << " " << decimals;
+            const double direction = WrapGrads(value);
+            const std::string turn =
+                FormatFixedShown(RoundToDecimals(direction, decimals) >= 400.0 ? 0.0 : direction, decimals);
+            ASSERT_EQ(listing.FormatAngl(value, decimals, true), turn) << std::hexfloat << value;
+        }
+}
+
+// A table in plain text: columns as wide as their widest text counted in characters, the left offset, the
+// alignments; a table that reaches the foot of a page goes on on the next one under the descriptor.
+TEST_F(ListingObject, PlainTableRowsArePaddedAlignedAndBrokenAcrossPages) {
+    listing.SetPageLength(20);
+    listing.SetPageWidth(40);
+    listing.SetPageCount();
+    ASSERT_TRUE(listing.OpenListing(file, "w"));
+    listing.WriteHeader(1);
+    listing.SetDescriptor("| Point |");
+    listing.WriteText("ligne ouverte");
+    listing.rtfOffsetLeft(2);
+    listing.rtfInitTab(15, 3);
+    listing.rtfSetColWidth(0, 5);
+    listing.rtfSetColWidth(1, 4);
+    listing.rtfSetColWidth(2, 6);
+    listing.rtfSetCellAlign(-1, 1, RtfAlign::Right);
+    listing.rtfSetCellAlign(0, -1, RtfAlign::Center);
+    listing.rtfSetCellValue(0, 0, "Nom");
+    listing.rtfSetCellValue(0, 1, "X");
+    listing.rtfSetCellValue(0, 2, "Côté");
+    for (int r = 1; r < 15; ++r) {
+        listing.rtfSetCellValue(r, 0, "Pé" + std::to_string(r));
+        listing.rtfSetCellValue(r, 1, std::to_string(r * 7));
+    }
+    EXPECT_EQ(listing.rtfDrawTab(), 15);
+    const std::string_view texts[] = {"été", "1", "trop long"};
+    const int widths[] = {4, 3, 2};
+    const RtfAlign aligns[] = {RtfAlign::Left, RtfAlign::Right, RtfAlign::Center};
+    EXPECT_EQ(listing.WritePlainTableRow(texts, widths, aligns), 1);
+    listing.WriteFooter();
+    listing.CloseListing(file, false);
+
+    const std::string rule(40, '-'), head = "PYRALIS Calculs Topo        chantier.cin\n" + rule + "\n\n";
+    const std::string foot = rule + "\n" + std::string(17, ' ') + "Page ";
+    std::string rows = "ligne ouverte\n  |  Nom  |  X   |  Côté  |\n";
+    for (int r = 1; r < 15; ++r) {
+        const std::string name = "Pé" + std::to_string(r), x = std::to_string(r * 7);
+        rows += "  | " + name + std::string(5 - Utf8Length(name), ' ') + " | " +
+                std::string(4 - x.size(), ' ') + x + " |        |\n";
+        if (r == 13) rows += foot + "1\n" + head + "| Point |\n"; // 15 lines a page
+    }
+    rows += "  | été  |   1 | trop long |\n";
+    EXPECT_EQ(ReadBytes(file), head + rows + std::string(12, '\n') + foot + "2\n");
 }
 
 TEST_F(ListingObject, LayoutIsReadWithinItsLimits) {
