@@ -16,6 +16,9 @@ namespace {
 // Lines of a plain-text page's footer, with the page count: a separator and the page number.
 constexpr int kFooterLines = 2;
 constexpr std::string_view kHeaderName = "PYRALIS Calculs Topo";
+// What the listing gathers before writing it to its file: a listing of a million lines goes out in a
+// hundred writes, not in tens of thousands.
+constexpr std::size_t kBufferBytes = 1 << 20;
 
 } // namespace
 
@@ -58,6 +61,7 @@ bool CDlgCfgListing::OpenListing(const std::string& path, std::string_view mode)
         return false;
     }
     m_writer = std::move(writer);
+    m_buffer.clear();
     m_documentStarted = false;
     m_output = ListingOutput::File;
     m_inPage = false;
@@ -79,6 +83,7 @@ bool CDlgCfgListing::CloseListing(const std::string& path, bool view) {
     if (!m_writer) return false;
     if (m_lineOpen) EndLine();
     if (IsRichText() && m_documentStarted) Raw("}\n");
+    Flush();
     const bool written = m_writer->Commit();
     if (!written) m_error = m_writer->Error();
     m_writer.reset();
@@ -97,7 +102,13 @@ void CDlgCfgListing::ViewListing(const std::string& path) {
 void CDlgCfgListing::Raw(std::string_view bytes) {
     if (m_output != ListingOutput::File || !m_writer) return;
     if (IsRichText() && !m_documentStarted) rtfInit();
-    m_writer->Write(bytes);
+    m_buffer += bytes;
+    if (m_buffer.size() >= kBufferBytes) Flush();
+}
+
+void CDlgCfgListing::Flush() {
+    if (m_writer && !m_buffer.empty()) m_writer->Write(m_buffer);
+    m_buffer.clear();
 }
 
 // --- Lines and pages -----------------------------------------------------------------------------------

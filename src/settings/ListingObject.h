@@ -197,6 +197,7 @@ private:
     std::string SepLine(int index) const;
     int Deci(int index, int storeDecimals) const;
     void Raw(std::string_view bytes);
+    void Flush(); // what Raw gathered, into the file
     int Emit(std::string_view text, bool mayBreak = true);
     void EndLine();
     void BreakPageIfFull();
@@ -212,6 +213,7 @@ private:
     int m_deci[5] = {-1, -1, -1, -1, -1};
 
     std::unique_ptr<SafeFileWriter> m_writer; // the listing being written, null when none is open
+    std::string m_buffer;                     // bytes for m_writer, not yet given to it
     std::string m_fileName;                   // shown in the plain-text header
     int m_error = 0;
     bool m_documentStarted = false; // the RTF prologue is written
