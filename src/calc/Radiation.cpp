@@ -111,7 +111,8 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
     for (int first = 0; first < static_cast<int>(entries.size()); ++first) {
         Entry& head = entries[static_cast<std::size_t>(first)];
         if (head.repetition) continue;
-        RadiatedSighting s;
+        // Built in its place among the new points, and taken out again when it is none.
+        RadiatedSighting& s = result.points.emplace_back();
         s.index = head.reduced.index;
         s.mat = std::move(head.reduced.mat);
         s.code = carnet.GetAt(s.index)->sym();
@@ -128,12 +129,10 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
             }
         }
 
-        if (!IsKnown(s.ah)) {
-            result.skipped.push_back({s.index, std::move(s.mat), rayon::kReasonNoDirection});
-            continue;
-        }
-        if (!IsKnown(s.dh) || !(s.dh > 0.0)) {
-            result.skipped.push_back({s.index, std::move(s.mat), rayon::kReasonNoDistance});
+        if (!IsKnown(s.ah) || !IsKnown(s.dh) || !(s.dh > 0.0)) {
+            result.skipped.push_back({s.index, std::move(s.mat),
+                                      IsKnown(s.ah) ? rayon::kReasonNoDistance : rayon::kReasonNoDirection});
+            result.points.pop_back();
             continue;
         }
         s.bearing = WrapGrads(station.v0 + s.ah);
@@ -152,25 +151,52 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
             if (IsKnown(s.z) && IsKnown(check.knownZ)) check.dz = s.z - check.knownZ;
             check.sighting = std::move(s);
             result.checks.push_back(std::move(check));
+            result.points.pop_back();
         } else {
             // The first element bearing the identifier names the point for the merge.
             s.key = carnet.Find(0, s.mat);
-            result.points.push_back(std::move(s));
         }
     }
     return result;
 }
 
-void Determinations::push_back(const Determination& determination) {
-    if (m_size == 0) {
-        m_first = determination;
-    } else {
-        if (m_size == 1) {
-            m_all.reserve(4);
-            m_all.push_back(m_first);
-        }
-        m_all.push_back(determination);
+Determinations& Determinations::operator=(const Determinations& other) {
+    if (this == &other) return *this;
+    m_first = other.m_first;
+    m_size = other.m_size;
+    m_capacity = other.m_size > 1 ? other.m_size : 0;
+    m_all.reset();
+    if (m_capacity > 0) {
+        m_all = std::make_unique<Determination[]>(m_capacity);
+        std::copy(other.begin(), other.end(), m_all.get());
     }
+    return *this;
+}
+
+Determinations& Determinations::operator=(Determinations&& other) noexcept {
+    m_first = other.m_first;
+    m_size = std::exchange(other.m_size, 0);
+    m_capacity = std::exchange(other.m_capacity, 0);
+    m_all = std::move(other.m_all);
+    return *this;
+}
+
+void Determinations::push_back(const Determination& determination) {
+    if (m_size >= 1 && m_size == m_capacity) {
+        const std::uint32_t capacity = std::max<std::uint32_t>(4, 2 * m_capacity);
+        auto all = std::make_unique<Determination[]>(capacity);
+        std::copy(begin(), end(), all.get());
+        m_all = std::move(all);
+        m_capacity = capacity;
+    } else if (m_size == 1) {
+        m_all = std::make_unique<Determination[]>(4);
+        m_all[0] = m_first;
+        m_capacity = 4;
+    }
+    if (m_size == 0)
+        m_first = determination;
+    else
+        m_all[m_size] = determination;
     ++m_size;
 }
 
@@ -253,12 +279,14 @@ std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation
                     // Summed at once, while the sighting is at hand: most points have no other.
                     RadiatedPoint& point = merged.emplace_back();
                     point.mat = s.mat;
-                    point.determinations.push_back({st, p});
+                    point.determinations.push_back(
+                        {static_cast<std::uint32_t>(st), static_cast<std::uint32_t>(p)});
                     Summarise(point, stations, tolerances);
                     continue;
                 }
                 RadiatedPoint& point = merged[rank];
-                point.determinations.push_back({st, p});
+                point.determinations.push_back(
+                    {static_cast<std::uint32_t>(st), static_cast<std::uint32_t>(p)});
                 if (point.determinations.size() == 2) multiple.push_back(rank);
             }
         }

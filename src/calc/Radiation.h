@@ -6,6 +6,8 @@
 #include "core/Undefined.h"
 
 #include <cstddef>
+#include <cstdint>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -88,25 +90,33 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
 
 // Where one station placed a new point.
 struct Determination {
-    std::size_t station = 0; // rank of the station among those radiated
-    std::size_t point = 0;   // rank of the sighting in its station's points
+    std::uint32_t station = 0; // rank of the station among those radiated
+    std::uint32_t point = 0;   // rank of the sighting in its station's points
 };
 
 // The determinations of one point, in the order of the stations. Most points are seen from one station
 // only: that one is kept in place, without a block of memory of its own.
 class Determinations {
 public:
+    Determinations() = default;
+    Determinations(const Determinations& other) { *this = other; }
+    Determinations(Determinations&& other) noexcept { *this = std::move(other); }
+    Determinations& operator=(const Determinations& other);
+    Determinations& operator=(Determinations&& other) noexcept;
+    ~Determinations() = default;
+
     std::size_t size() const { return m_size; }
     bool empty() const { return m_size == 0; }
-    const Determination* begin() const { return m_size <= 1 ? &m_first : m_all.data(); }
+    const Determination* begin() const { return m_size <= 1 ? &m_first : m_all.get(); }
     const Determination* end() const { return begin() + m_size; }
     const Determination& operator[](std::size_t i) const { return begin()[i]; }
     void push_back(const Determination& determination);
 
 private:
     Determination m_first;
-    std::vector<Determination> m_all; // every one, the first included, once there are two
-    std::size_t m_size = 0;
+    std::uint32_t m_size = 0;
+    std::uint32_t m_capacity = 0;           // of m_all
+    std::unique_ptr<Determination[]> m_all; // every one, the first included, once there are two
 };
 
 // A new point and all its determinations: the plain mean of their X, Y (and of their Z where known).

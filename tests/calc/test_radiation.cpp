@@ -366,6 +366,11 @@ TEST(RadiationMerge, APointFromSeveralStationsKeepsTheMeanAndItsSpread) {
     ASSERT_EQ(mp.determinations.size(), 3u);
     EXPECT_EQ(mp.determinations[1].station, 1u);
     EXPECT_EQ(mp.determinations[1].point, 1u);
+    RadiatedPoint copy = mp, moved = std::move(copy); // each with its own determinations
+    copy = moved;
+    ASSERT_EQ(copy.determinations.size(), 3u);
+    EXPECT_EQ(copy.determinations[2].station, 2u);
+    EXPECT_EQ(moved.determinations[2].station, 2u);
     EXPECT_NEAR(mp.x, p.x + off * std::sin(g) / 3.0, kTenthMm);
     EXPECT_NEAR(mp.y, p.y + off * std::cos(g) / 3.0, kTenthMm);
     EXPECT_NEAR(mp.z, p.z + up / 2.0, kTenthMm); // S3 gives no altitude
