@@ -9,6 +9,7 @@
 #include <cstdint>
 #include <memory>
 #include <string>
+#include <utility>
 #include <vector>
 
 // Radiated points: every point sighted from an oriented station placed by its bearing (V0 + AH) and its
