@@ -1,9 +1,11 @@
 // The store's arrays, accessors and look-ups, on small GéoBases built in each test.
 #include "geobase/Carnet.h"
 
+#include <algorithm>
 #include <cmath>
 #include <gtest/gtest.h>
 #include <memory>
+#include <string>
 
 using namespace pyr;
 
@@ -207,4 +209,39 @@ TEST(Store, ComputedPointsAreRoundedToTheDecimalsSettings) {
     EXPECT_EQ(p.x(), 651325.412);
     EXPECT_EQ(CCarnet::formatAng(123.456789), 123.4568);
     SetStoreDecimals(4, 3, 5);
+}
+
+// The index grows as a reader appends: thousands of identifiers, short and long ones that share their first
+// sixteen bytes, looked up between the appends, every answer the same as a scan of the elements gives.
+TEST(Store, TheIndexAnswersLikeAScanWhileItGrowsUnderAppends) {
+    CCarnet c;
+    auto name = [](int n) {
+        // Long names differ only past the bytes an index line holds.
+        return n % 3 == 0 ? "TRES_LONG_PREFIXE_" + std::to_string(n) : "P" + std::to_string(n % 1500);
+    };
+    auto scan = [&c](int kind, const std::string& mat, int start, int direction) {
+        if (direction == 0) {
+            for (int i = std::max(start, 0); i < c.GetSize(); ++i)
+                if (c.GetType(i) == kind && c.matAt(i) == mat) return i;
+        } else {
+            for (int i = std::min(start, c.GetSize() - 1); i >= 0; --i)
+                if (c.GetType(i) == kind && c.matAt(i) == mat) return i;
+        }
+        return -1;
+    };
+    for (int n = 0; n < 6000; ++n) {
+        if (n % 2 == 0)
+            c.Add(std::make_unique<CPointGen>(name(n), n, n, n), kKindPoint);
+        else
+            c.Add(std::make_unique<CMesure>(name(n), 1.3, 10.0, 100.0, n), kKindMesure);
+        if (n % 997 != 0) continue;
+        for (int probe = 0; probe <= n; probe += 7) {
+            const std::string mat = name(probe);
+            ASSERT_EQ(c.Find(kKindPoint, mat), scan(kKindPoint, mat, 0, 0)) << mat;
+            ASSERT_EQ(c.Find(kKindMesure, mat, n / 2, -1), scan(kKindMesure, mat, n / 2, -1)) << mat;
+        }
+    }
+    EXPECT_EQ(c.Find(kKindPoint, "TRES_LONG_PREFIXE_"), -1);
+    EXPECT_EQ(c.Find(kKindPoint, "TRES_LONG_PREFIXE_5997"), -1); // a measure, not a point
+    EXPECT_EQ(c.findMat("TRES_LONG_PREFIXE_5994"), 5994);
 }
