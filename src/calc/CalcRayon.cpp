@@ -1,5 +1,6 @@
 #include "calc/CalcRayon.h"
 
+#include "calc/CalculV0Texts.h"
 #include "calc/RadiationListing.h"
 #include "calc/RadiationTexts.h"
 #include "calc/SessionTexts.h"
@@ -77,7 +78,7 @@ bool CCalcRayon::Open(ui::FrontEnd& frontEnd) {
         m_stations.push_back(reprise == 1 ? carnet.matAt(i) : carnet.StationDesignation(i));
     }
     if (m_stations.empty()) {
-        frontEnd.MessageBox(Sprintf(rayon::kMsgNoStation, m_session.Path().c_str()), ui::kCaption,
+        frontEnd.MessageBox(Sprintf(v0::kMsgNoStation, m_session.Path().c_str()), ui::kCaption,
                             ui::kIconWarning);
         return false;
     }
@@ -114,7 +115,7 @@ bool CCalcRayon::ChooseStation(std::string_view designation) {
             return true;
         }
     if (m_frontEnd)
-        m_frontEnd->MessageBox(Sprintf(rayon::kMsgStationUnknown, std::string(designation).c_str()),
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgStationUnknown, std::string(designation).c_str()),
                                ui::kCaption, ui::kIconWarning);
     return false;
 }
@@ -152,7 +153,7 @@ std::vector<int> CCalcRayon::ChosenStations() {
     for (int index : m_stationIndex)
         if (list->Contains(m_session.Carnet().GetAt(index)->mat())) chosen.push_back(index);
     if (chosen.empty())
-        m_frontEnd->MessageBox(Sprintf(rayon::kMsgNoStationInList, m_list.c_str()), ui::kCaption,
+        m_frontEnd->MessageBox(Sprintf(v0::kMsgNoStationInList, m_list.c_str()), ui::kCaption,
                                ui::kIconWarning);
     return chosen;
 }

@@ -1,9 +1,6 @@
 #include "calc/CalcRayonDriver.h"
 
 #include "calc/CalcRayonForm.h"
-#include "calc/RadiationTexts.h"
-#include "core/Strings.h"
-#include "geobase/Carnet.h"
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/Selection.h"
 
@@ -22,34 +19,9 @@ constexpr const char* kHelpSave = "écrire les points nouveaux (et les V0 calcul
 } // namespace
 
 void CCalcRayonDriver::DeclareOptions(ui::DialogOptions& options) {
-    using Type = RadiationType;
-    options.Value("type", "unique|liste|toutes", kHelpType, [this](const std::string& word) {
-        const struct {
-            const char* word;
-            Type type;
-        } types[] = {{"unique", Type::Unique}, {"liste", Type::Liste}, {"toutes", Type::Toutes}};
-        for (const auto& [name, type] : types)
-            if (EqualIgnoringCase(word, name)) {
-                m_requests.type = type;
-                return std::string();
-            }
-        return Sprintf(rayon::kBadType, word.c_str());
-    });
-    options.Value("station", "NOM", kHelpStation, [this](const std::string& designation) {
-        std::string name;
-        int reprise = 0;
-        if (!CCarnet::extrStaRep(designation, name, reprise) || name.empty())
-            return Sprintf(rayon::kBadStation, designation.c_str());
-        m_requests.station = designation;
-        if (!m_requests.type) m_requests.type = Type::Unique;
-        return std::string();
-    });
-    options.Value("liste", "SELECTION", kHelpList, [this](const std::string& selection) {
-        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
-        m_requests.list = selection;
-        if (!m_requests.type) m_requests.type = Type::Liste;
-        return std::string();
-    });
+    DeclareTypeOption(options, m_requests.choice, kHelpType);
+    DeclareStationOption(options, m_requests.choice, kHelpStation);
+    DeclareListOption(options, m_requests.choice, kHelpList);
     options.Value("points", "SELECTION", kHelpPoints, [this](const std::string& selection) {
         if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
         m_requests.points = selection;
@@ -62,10 +34,10 @@ ui::DialogResult CCalcRayonDriver::Run(ui::FrontEnd& frontEnd) {
     CCalcRayon& rayon = m_model;
     rayon.SetInputs(Inputs());
     if (GeoBaseNamed()) rayon.SetGeoBase(GeoBase());
-    if (m_requests.type) rayon.SetType(*m_requests.type);
+    if (m_requests.choice.type) rayon.SetType(*m_requests.choice.type);
     if (!rayon.Open(frontEnd)) return rayon.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
-    if ((m_requests.station && !rayon.ChooseStation(*m_requests.station)) ||
-        (m_requests.list && !rayon.SetList(*m_requests.list)) ||
+    if ((m_requests.choice.station && !rayon.ChooseStation(*m_requests.choice.station)) ||
+        (m_requests.choice.list && !rayon.SetList(*m_requests.choice.list)) ||
         (m_requests.points && !rayon.SetPoints(*m_requests.points))) {
         rayon.Close(false, false);
         return ui::DialogResult::Failed;

@@ -25,9 +25,7 @@ public:
 private:
     CCalcRayon m_model;
     struct Requests {
-        std::optional<RadiationType> type;
-        std::optional<std::string> station;
-        std::optional<std::string> list;
+        StationChoiceRequests choice;
         std::optional<std::string> points;
         ComputationRequests computation;
     } m_requests;

@@ -41,27 +41,8 @@ std::string ReadNumber(const char* option, const std::string& text, std::optiona
 
 void CCalculV0Driver::DeclareOptions(ui::DialogOptions& options) {
     using Type = V0CalculationType;
-    options.Value("type", "unique|liste|toutes", kHelpType, [this](const std::string& word) {
-        const struct {
-            const char* word;
-            Type type;
-        } types[] = {{"unique", Type::Unique}, {"liste", Type::Liste}, {"toutes", Type::Toutes}};
-        for (const auto& [name, type] : types)
-            if (EqualIgnoringCase(word, name)) {
-                m_requests.type = type;
-                return std::string();
-            }
-        return Sprintf(v0::kBadType, word.c_str());
-    });
-    options.Value("station", "NOM", kHelpStation, [this](const std::string& designation) {
-        std::string name;
-        int reprise = 0;
-        if (!CCarnet::extrStaRep(designation, name, reprise) || name.empty())
-            return Sprintf(v0::kBadStation, designation.c_str());
-        m_requests.station = designation;
-        m_requests.type = Type::Unique;
-        return std::string();
-    });
+    DeclareTypeOption(options, m_requests.choice, kHelpType);
+    DeclareStationOption(options, m_requests.choice, kHelpStation);
     options.Value("references", "SELECTION", kHelpReferences, [this](const std::string& selection) {
         if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
         m_requests.references = selection;
@@ -75,15 +56,10 @@ void CCalculV0Driver::DeclareOptions(ui::DialogOptions& options) {
     for (const auto& [name, valueName, value] : coordinates)
         options.Value(name, valueName, valueName + std::string(kHelpCoordinate),
                       [this, name = name, value = value](const std::string& text) {
-                          m_requests.type = Type::Unique;
+                          m_requests.choice.type = Type::Unique;
                           return ReadNumber(name, text, *value);
                       });
-    options.Value("liste", "SELECTION", kHelpList, [this](const std::string& selection) {
-        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
-        m_requests.list = selection;
-        m_requests.type = Type::Liste;
-        return std::string();
-    });
+    DeclareListOption(options, m_requests.choice, kHelpList);
     options.ZeroOrOne("ponderation", kHelpWeighting,
                       [this](bool weighted) { m_requests.weighted = weighted; });
     options.Switch("forcer", kHelpForce, [this] {
@@ -91,7 +67,7 @@ void CCalculV0Driver::DeclareOptions(ui::DialogOptions& options) {
         return std::string();
     });
     options.Value("v0", "VALEUR", kHelpV0, [this](const std::string& text) {
-        m_requests.type = Type::Unique;
+        m_requests.choice.type = Type::Unique;
         return ReadNumber("v0", text, m_requests.v0);
     });
     DeclareComputationOptions(options, m_requests.computation, kHelpSave);
@@ -99,7 +75,7 @@ void CCalculV0Driver::DeclareOptions(ui::DialogOptions& options) {
 
 bool CCalculV0Driver::ApplyRequests(ui::FrontEnd& frontEnd) {
     CCalculV0Sta& v0 = m_model;
-    if (m_requests.station && !v0.ChooseStation(*m_requests.station)) return false;
+    if (m_requests.choice.station && !v0.ChooseStation(*m_requests.choice.station)) return false;
     if ((m_requests.x || m_requests.y || m_requests.z) &&
         !v0.SetStationCoordinates(m_requests.x.value_or(kUndefined), m_requests.y.value_or(kUndefined),
                                   m_requests.z.value_or(kUndefined)))
@@ -116,10 +92,10 @@ ui::DialogResult CCalculV0Driver::Run(ui::FrontEnd& frontEnd) {
     CCalculV0Sta& v0 = m_model;
     v0.SetInputs(Inputs());
     if (GeoBaseNamed()) v0.SetGeoBase(GeoBase());
-    if (m_requests.type) v0.SetType(*m_requests.type);
+    if (m_requests.choice.type) v0.SetType(*m_requests.choice.type);
     if (m_requests.weighted) v0.SetWeighted(*m_requests.weighted);
     if (m_requests.forced) v0.SetForced(true);
-    if (m_requests.list) v0.SetList(*m_requests.list);
+    if (m_requests.choice.list) v0.SetList(*m_requests.choice.list);
     if (!v0.Open(frontEnd)) return v0.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
     if (!ApplyRequests(frontEnd)) return ui::DialogResult::Failed;
     const bool done = m_requests.v0 ? v0.EnterV0(*m_requests.v0) : v0.Calculate();

@@ -28,11 +28,9 @@ private:
     CCalculV0Sta m_model;
     // What the command line asked for, applied once the GéoBase is open.
     struct Requests {
-        std::optional<V0CalculationType> type;
+        StationChoiceRequests choice;
         std::optional<bool> weighted;
         bool forced = false;
-        std::optional<std::string> list;
-        std::optional<std::string> station;
         std::optional<std::string> references;
         std::optional<double> x, y, z;
         std::optional<double> v0;

@@ -1,5 +1,12 @@
 #include "calc/ComputationOptions.h"
 
+#include "calc/CalculV0Sta.h"
+#include "calc/CalculV0Texts.h"
+#include "core/Strings.h"
+#include "geobase/Carnet.h"
+#include "geobase/GeoBaseMessages.h"
+#include "geobase/Selection.h"
+
 namespace pyr {
 
 namespace {
@@ -27,6 +34,43 @@ void DeclareComputationOptions(ui::DialogOptions& options, ComputationRequests& 
 void DeclareSwitchOptions(ui::DialogOptions& options, ComputationRequests& requests) {
     options.ZeroOrOne("plani", kHelpPlani, [&requests](bool on) { requests.plani = on; });
     options.ZeroOrOne("alti", kHelpAlti, [&requests](bool on) { requests.alti = on; });
+}
+
+void DeclareTypeOption(ui::DialogOptions& options, StationChoiceRequests& requests, const char* help) {
+    options.Value("type", "unique|liste|toutes", help, [&requests](const std::string& word) {
+        using Type = V0CalculationType;
+        const struct {
+            const char* word;
+            Type type;
+        } types[] = {{"unique", Type::Unique}, {"liste", Type::Liste}, {"toutes", Type::Toutes}};
+        for (const auto& [name, type] : types)
+            if (EqualIgnoringCase(word, name)) {
+                requests.type = type;
+                return std::string();
+            }
+        return Sprintf(v0::kBadType, word.c_str());
+    });
+}
+
+void DeclareStationOption(ui::DialogOptions& options, StationChoiceRequests& requests, const char* help) {
+    options.Value("station", "NOM", help, [&requests](const std::string& designation) {
+        std::string name;
+        int reprise = 0;
+        if (!CCarnet::extrStaRep(designation, name, reprise) || name.empty())
+            return Sprintf(v0::kBadStation, designation.c_str());
+        requests.station = designation;
+        requests.type = V0CalculationType::Unique;
+        return std::string();
+    });
+}
+
+void DeclareListOption(ui::DialogOptions& options, StationChoiceRequests& requests, const char* help) {
+    options.Value("liste", "SELECTION", help, [&requests](const std::string& selection) {
+        if (!IsValidSelString(selection)) return std::string(msg::kNoSelection);
+        requests.list = selection;
+        requests.type = V0CalculationType::Liste;
+        return std::string();
+    });
 }
 
 } // namespace pyr

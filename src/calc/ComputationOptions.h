@@ -23,4 +23,18 @@ void DeclareComputationOptions(ui::DialogOptions& options, ComputationRequests& 
 // Declares "--plani 0|1" and "--alti 0|1".
 void DeclareSwitchOptions(ui::DialogOptions& options, ComputationRequests& requests);
 
+// The stations a computation takes, as the orientation of stations chooses them (CalculV0Sta.h).
+enum class V0CalculationType;
+struct StationChoiceRequests {
+    std::optional<V0CalculationType> type;
+    std::optional<std::string> station; // "S1" or "S1(2)"
+    std::optional<std::string> list;    // a selection of stations
+};
+// Declares "--type unique|liste|toutes".
+void DeclareTypeOption(ui::DialogOptions& options, StationChoiceRequests& requests, const char* help);
+// Declares "--station NOM", which makes the type "unique".
+void DeclareStationOption(ui::DialogOptions& options, StationChoiceRequests& requests, const char* help);
+// Declares "--liste SELECTION", which makes the type "liste".
+void DeclareListOption(ui::DialogOptions& options, StationChoiceRequests& requests, const char* help);
+
 } // namespace pyr

@@ -18,9 +18,6 @@ inline constexpr const char* kKeyColumns = "RayonContenu";
 inline constexpr const char* kDefaultColumns = "N,X,Y,Z,GI,DH";
 
 // Messages.
-inline constexpr const char* kMsgNoStation = "La GéoBase <%s> ne contient aucune station !";
-inline constexpr const char* kMsgStationUnknown = "La station <%s> n'existe pas dans la GéoBase !";
-inline constexpr const char* kMsgNoStationInList = "Aucune station de la GéoBase n'est dans la liste <%s> !";
 inline constexpr const char* kMsgNothingRadiated = "Aucun point n'a pu être rayonné !";
 inline constexpr const char* kMsgStationsNotUsed =
     "%d station(s) non utilisée(s) : voir les raisons affichées.";
@@ -29,11 +26,6 @@ inline constexpr const char* kMsgOutOfTolerance =
 inline constexpr const char* kQuestionOutOfTolerance =
     "Le point <%s> est déterminé %d fois avec un écart de %.3f m en planimétrie\net de %.3f m en altitude, "
     "hors tolérance.\nVoulez-vous quand même l'enregistrer ?";
-
-// The command line.
-inline constexpr const char* kBadType = "Type de calcul inconnu : « %s » (unique, liste ou toutes).";
-inline constexpr const char* kBadStation =
-    "Désignation de station incorrecte : « %s » (S1, ou S1(2) pour une reprise).";
 
 // Why a station or a sighting gave nothing.
 inline constexpr const char* kReasonNoPlace = "pas de coordonnées";
