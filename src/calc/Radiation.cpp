@@ -247,50 +247,40 @@ std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation
     merged.reserve(total);
     std::vector<std::size_t> multiple; // the points determined more than once
     // The points are grouped by their key, which RadiateStation gives: a table as long as the GéoBase,
-    // read nearly in order since the points mostly come in the order of their first sighting. Sightings
-    // without a key, made elsewhere, have their points grouped by identifier.
+    // read nearly in order since the points mostly come in the order of their first sighting. When some
+    // sightings were made elsewhere, without a key, every point is grouped by its identifier.
+    const bool byName = std::any_of(stations.begin(), stations.end(), [](const RadiatedStation& station) {
+        return std::any_of(station.points.begin(), station.points.end(),
+                           [](const RadiatedSighting& s) { return s.key < 0; });
+    });
     std::vector<int> rankOfKey; // -1 for a key not seen yet
     std::unordered_map<std::string_view, std::size_t> rankOfName;
-    for (const bool byName : {false, true}) {
-        merged.clear();
-        multiple.clear();
-        if (byName) rankOfName.reserve(total);
-        bool complete = true;
-        for (std::size_t st = 0; st < stations.size() && complete; ++st) {
-            const std::vector<RadiatedSighting>& points = stations[st].points;
-            for (std::size_t p = 0; p < points.size(); ++p) {
-                const RadiatedSighting& s = points[p];
-                std::size_t rank = merged.size();
-                if (byName) {
-                    rank = rankOfName.try_emplace(s.mat, rank).first->second;
-                } else if (s.key < 0) {
-                    complete = false;
-                    break;
-                } else {
-                    const auto key = static_cast<std::size_t>(s.key);
-                    if (key >= rankOfKey.size())
-                        rankOfKey.resize(std::max(key + 1, 2 * rankOfKey.size()), -1);
-                    if (rankOfKey[key] < 0)
-                        rankOfKey[key] = static_cast<int>(rank);
-                    else
-                        rank = static_cast<std::size_t>(rankOfKey[key]);
-                }
-                if (rank == merged.size()) {
-                    // Summed at once, while the sighting is at hand: most points have no other.
-                    RadiatedPoint& point = merged.emplace_back();
-                    point.mat = s.mat;
-                    point.determinations.push_back(
-                        {static_cast<std::uint32_t>(st), static_cast<std::uint32_t>(p)});
-                    Summarise(point, stations, tolerances);
-                    continue;
-                }
-                RadiatedPoint& point = merged[rank];
-                point.determinations.push_back(
-                    {static_cast<std::uint32_t>(st), static_cast<std::uint32_t>(p)});
-                if (point.determinations.size() == 2) multiple.push_back(rank);
+    if (byName) rankOfName.reserve(total);
+    auto rankOf = [&](const RadiatedSighting& s) {
+        const std::size_t next = merged.size();
+        if (byName) return rankOfName.try_emplace(s.mat, next).first->second;
+        const auto key = static_cast<std::size_t>(s.key);
+        if (key >= rankOfKey.size()) rankOfKey.resize(std::max(key + 1, 2 * rankOfKey.size()), -1);
+        if (rankOfKey[key] < 0) rankOfKey[key] = static_cast<int>(next);
+        return static_cast<std::size_t>(rankOfKey[key]);
+    };
+    for (std::size_t st = 0; st < stations.size(); ++st) {
+        const std::vector<RadiatedSighting>& points = stations[st].points;
+        for (std::size_t p = 0; p < points.size(); ++p) {
+            const std::size_t rank = rankOf(points[p]);
+            const Determination determination{static_cast<std::uint32_t>(st), static_cast<std::uint32_t>(p)};
+            if (rank == merged.size()) {
+                // Summed at once, while the sighting is at hand: most points have no other.
+                RadiatedPoint& point = merged.emplace_back();
+                point.mat = points[p].mat;
+                point.determinations.push_back(determination);
+                Summarise(point, stations, tolerances);
+                continue;
             }
+            RadiatedPoint& point = merged[rank];
+            point.determinations.push_back(determination);
+            if (point.determinations.size() == 2) multiple.push_back(rank);
         }
-        if (complete) break;
     }
     for (std::size_t rank : multiple)
         Summarise(merged[rank], stations, tolerances);
