@@ -163,6 +163,10 @@ std::vector<int> CCalcRayon::ChosenStations() {
 void CCalcRayon::Show(const RadiatedStation& result) {
     CPyrTxtWnd txt(*m_frontEnd);
     const std::string designation = result.station.Designation();
+    // What the orientation on the references said of them (a reference out of tolerance): in the text
+    // window, not in a box for each of thousands of stations.
+    for (const std::string& warning : result.v0.warnings)
+        txt.PrintText(warning);
     if (!result.usable) {
         txt.Print(rayon::kLineStationNotUsed, designation.c_str(), result.reason.c_str());
         return;
@@ -173,6 +177,7 @@ void CCalcRayon::Show(const RadiatedStation& result) {
                                : std::string();
     txt.Print(rayon::kLineStation, designation.c_str(), static_cast<int>(result.points.size()),
               static_cast<int>(result.checks.size()), v0.c_str());
+    if (m_settings.computeV0 && !result.v0Computed) txt.PrintText(rayon::kLineV0Kept);
     for (const SkippedSighting& skipped : result.skipped)
         txt.Print(rayon::kLineSkipped, skipped.mat.c_str(), skipped.reason.c_str());
 }

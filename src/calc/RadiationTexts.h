@@ -37,6 +37,8 @@ inline constexpr const char* kReasonNoDirection = "sans angle horizontal";
 // Lines of the text window.
 inline constexpr const char* kLineStation = "Station %s : %d point(s) rayonné(s), %d contrôle(s)%s";
 inline constexpr const char* kLineV0Computed = ", V0 calculé = %s gr";
+inline constexpr const char* kLineV0Kept =
+    "    V0 non calculé sur les références : celui de la GéoBase est gardé.";
 inline constexpr const char* kLineStationNotUsed = "Station %s non utilisée : %s";
 inline constexpr const char* kLineSkipped = "    Visée sur <%s> non calculée : %s";
 inline constexpr const char* kLineOutOfTolerance =
