@@ -30,16 +30,7 @@ std::vector<ui::Control> CCalcRayonForm::Controls() const {
     using K = ControlKind;
     std::vector<std::string> columns(std::begin(kColumns), std::end(kColumns));
     if (CPointGen::SwapXY()) std::swap(columns[1], columns[2]);
-    return {
-        Ctl(kType, K::Group, "typeDeCalcul", "&Type de calcul :").At(0, 0, 1, 4),
-        Ctl(kUnique, K::Radio, "unique", "Unique").In(kType),
-        Ctl(kListe, K::Radio, "liste", "Liste").In(kType).At(0, 1),
-        Ctl(kToutes, K::Radio, "toutes", "Toutes").In(kType).At(0, 2),
-        Ctl(kLabelList, K::Label, "etiquetteStationsListe", "Stations de la l&iste :")
-            .In(kType)
-            .At(1, 0)
-            .Buddy(kList),
-        Ctl(kList, K::Edit, "stationsListe").In(kType).At(1, 1, 1, 2).Width(20),
+    std::vector<ui::Control> controls{
         Ctl(kLabelStation, K::Label, "etiquetteStation", "&Station :").At(1, 0).Buddy(kStation),
         Ctl(kStation, K::Combo, "station").At(1, 1).Width(12),
         Ctl(kLabelPoints, K::Label, "etiquettePoints", "&Points à calculer :").At(1, 2).Buddy(kPoints),
@@ -55,6 +46,9 @@ std::vector<ui::Control> CCalcRayonForm::Controls() const {
         Ctl(ui::kIdOk, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
         Ctl(ui::kIdCancel, K::Button, "annuler", "Annuler").In(ui::kButtonRow).At(0, 1),
     };
+    const std::vector<ui::Control> type = kTypeGroup.Controls();
+    controls.insert(controls.begin(), type.begin(), type.end());
+    return controls;
 }
 
 bool CCalcRayonForm::Open(ui::FrontEnd& frontEnd) {
@@ -97,21 +91,8 @@ ui::ControlState CCalcRayonForm::State(int id) const {
     ui::ControlState state;
     CCalcRayon& model = m_model;
     const RadiationType type = model.Type();
+    if (kTypeGroup.Holds(id)) return kTypeGroup.State(id, type, model.List());
     switch (id) {
-    case kUnique:
-        state.checked = type == RadiationType::Unique;
-        break;
-    case kListe:
-        state.checked = type == RadiationType::Liste;
-        break;
-    case kToutes:
-        state.checked = type == RadiationType::Toutes;
-        break;
-    case kLabelList:
-    case kList:
-        state.enabled = type == RadiationType::Liste;
-        if (id == kList) state.text = model.List();
-        break;
     case kLabelStation:
     case kStation:
         state.enabled = type == RadiationType::Unique;
@@ -150,19 +131,16 @@ ui::ControlState CCalcRayonForm::State(int id) const {
 void CCalcRayonForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event) {
     (void)frontEnd;
     using ui::EventKind;
+    if (const std::optional<V0CalculationType> type = kTypeGroup.Chosen(id, event)) {
+        m_model.SetType(*type);
+        return;
+    }
+    if (const std::optional<std::string> list = kTypeGroup.TypedList(id, event)) {
+        if (*list != m_model.List()) m_model.SetList(*list);
+        return;
+    }
+    if (kTypeGroup.Holds(id)) return;
     switch (id) {
-    case kUnique:
-    case kListe:
-    case kToutes:
-        if (event.kind == EventKind::Check && event.on)
-            m_model.SetType(id == kUnique  ? RadiationType::Unique
-                            : id == kListe ? RadiationType::Liste
-                                           : RadiationType::Toutes);
-        return;
-    case kList:
-        if (event.kind == EventKind::Text && Trimmed(event.text) != m_model.List())
-            m_model.SetList(Trimmed(event.text));
-        return;
     case kStation: {
         const auto& stations = m_model.StationNames();
         if (event.kind == EventKind::Select && event.rank >= 0 &&

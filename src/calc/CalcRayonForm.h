@@ -1,6 +1,7 @@
 #pragma once
 
 #include "calc/CalcRayon.h"
+#include "calc/StationTypeGroup.h"
 #include "ui/Form.h"
 
 namespace pyr {
@@ -28,6 +29,8 @@ public:
         kStatus,
         kCalculate,
     };
+    // "&Type de calcul :", from kType to kList.
+    static constexpr StationTypeGroup kTypeGroup{kType};
 
     // The new points shown at most: beyond, the listing gives them all.
     static constexpr std::size_t kShownPoints = 2000;

@@ -53,17 +53,7 @@ bool ReadTyped(std::string_view text, double& value) {
 std::vector<ui::Control> CCalculV0Form::Controls() const {
     using K = ControlKind;
     const bool swap = CPointGen::SwapXY();
-    return {
-        Ctl(kType, K::Group, "typeDeCalcul", "&Type de calcul :").At(0, 0, 1, 4),
-        Ctl(kUnique, K::Radio, "unique", "Unique").In(kType),
-        Ctl(kListe, K::Radio, "liste", "Liste").In(kType).At(0, 1),
-        Ctl(kToutes, K::Radio, "toutes", "Toutes").In(kType).At(0, 2),
-        Ctl(kLabelList, K::Label, "etiquetteStationsListe", "Stations de la l&iste :")
-            .In(kType)
-            .At(1, 0)
-            .Buddy(kList),
-        Ctl(kList, K::Edit, "stationsListe").In(kType).At(1, 1, 1, 2).Width(20),
-
+    std::vector<ui::Control> controls{
         // The station and its coordinates one above the other, the references it offers beside them;
         // under them, the references as the computation left them, across the whole dialog.
         Ctl(kLabelStation, K::Label, "etiquetteStation", "&Station :").At(1, 0).Buddy(kStation),
@@ -105,6 +95,9 @@ std::vector<ui::Control> CCalculV0Form::Controls() const {
         Ctl(ui::kIdOk, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
         Ctl(ui::kIdCancel, K::Button, "annuler", "Annuler").In(ui::kButtonRow).At(0, 1),
     };
+    const std::vector<ui::Control> type = kTypeGroup.Controls();
+    controls.insert(controls.begin(), type.begin(), type.end());
+    return controls;
 }
 
 bool CCalculV0Form::Open(ui::FrontEnd& frontEnd) {
@@ -137,21 +130,8 @@ ui::ControlState CCalculV0Form::State(int id) const {
     const StationPlace& station = m_model.Station();
     const V0Result* result = m_model.StationResult();
     const bool swap = CPointGen::SwapXY();
+    if (kTypeGroup.Holds(id)) return kTypeGroup.State(id, type, m_model.List());
     switch (id) {
-    case kUnique:
-        state.checked = unique;
-        break;
-    case kListe:
-        state.checked = type == V0CalculationType::Liste;
-        break;
-    case kToutes:
-        state.checked = type == V0CalculationType::Toutes;
-        break;
-    case kLabelList:
-    case kList:
-        state.enabled = type == V0CalculationType::Liste;
-        if (id == kList) state.text = m_model.List();
-        break;
     case kStation:
         state.items = m_model.Stations();
         state.current = m_model.StationRank();
@@ -245,20 +225,16 @@ void CCalculV0Form::TypeV0(ui::FrontEnd& frontEnd, const std::string& text) {
 
 void CCalculV0Form::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event) {
     using ui::EventKind;
-    switch (id) {
-    case kUnique:
-    case kListe:
-    case kToutes:
-        if (event.kind == EventKind::Check && event.on)
-            m_model.SetType(id == kUnique  ? V0CalculationType::Unique
-                            : id == kListe ? V0CalculationType::Liste
-                                           : V0CalculationType::Toutes);
-        return;
-    case kList: {
-        const std::string_view list = Trimmed(event.text);
-        if (event.kind == EventKind::Text && list != m_model.List()) m_model.SetList(list);
+    if (const std::optional<V0CalculationType> type = kTypeGroup.Chosen(id, event)) {
+        m_model.SetType(*type);
         return;
     }
+    if (const std::optional<std::string> list = kTypeGroup.TypedList(id, event)) {
+        if (*list != m_model.List()) m_model.SetList(*list);
+        return;
+    }
+    if (kTypeGroup.Holds(id)) return;
+    switch (id) {
     case kStation: {
         const auto& stations = m_model.Stations();
         if (event.kind != EventKind::Select || event.rank < 0 ||

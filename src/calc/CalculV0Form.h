@@ -1,6 +1,7 @@
 #pragma once
 
 #include "calc/CalculV0Sta.h"
+#include "calc/StationTypeGroup.h"
 #include "ui/Form.h"
 
 #include <array>
@@ -45,6 +46,8 @@ public:
         kCalculate,
         kGraphic,
     };
+    // "&Type de calcul :", from kType to kList.
+    static constexpr StationTypeGroup kTypeGroup{kType};
 
     // `dialog` gives the command's inputs when the window opens; `model` is the dialog shown.
     CCalculV0Form(const ui::DialogModel& dialog, CCalculV0Sta& model) : m_dialog(dialog), m_model(model) {}
