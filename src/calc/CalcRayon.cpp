@@ -71,6 +71,11 @@ bool CCalcRayon::Open(ui::FrontEnd& frontEnd) {
         return false;
     }
     ReadOptions();
+    // The results of another opening view the elements of the GéoBase then open.
+    m_results.clear();
+    m_newPoints.clear();
+    m_stationIndex.clear();
+    m_stations.clear();
     const CCarnet& carnet = m_session.Carnet();
     for (int i = carnet.Find(kKindStation, ""); i >= 0; i = carnet.Find(kKindStation, "", i + 1)) {
         m_stationIndex.push_back(i);
@@ -179,36 +184,36 @@ void CCalcRayon::Show(const RadiatedStation& result) {
               static_cast<int>(result.checks.size()), v0.c_str());
     if (m_settings.computeV0 && !result.v0Computed) txt.PrintText(rayon::kLineV0Kept);
     for (const SkippedSighting& skipped : result.skipped)
-        txt.Print(rayon::kLineSkipped, skipped.mat.c_str(), skipped.reason.c_str());
+        txt.Print(rayon::kLineSkipped, std::string(skipped.mat).c_str(), skipped.reason.c_str());
 }
 
 bool CCalcRayon::Calculate() {
     if (!m_frontEnd || !m_session.IsOpen()) return false;
-    m_results.clear();
-    m_newPoints.clear();
     m_notUsed = m_outOfTolerance = 0;
     m_written = false;
     std::optional<CSelection> points;
     if (!m_points.empty()) points = CSelection::Parse(m_points);
 
+    // Computed again into the results of the last run, which keep their room.
+    const std::vector<int> chosen = ChosenStations();
+    m_results.resize(chosen.size());
     int used = 0;
-    for (int index : ChosenStations()) {
-        RadiatedStation result =
-            RadiateStation(m_session.Carnet(), index, m_settings, points ? &*points : nullptr);
+    for (std::size_t k = 0; k < chosen.size(); ++k) {
+        RadiatedStation& result = m_results[k];
+        RadiateStation(m_session.Carnet(), chosen[k], m_settings, points ? &*points : nullptr, result);
         Show(result);
         if (result.usable)
             ++used;
         else
             ++m_notUsed;
-        m_results.push_back(std::move(result));
     }
-    m_newPoints = MergeDeterminations(m_results, m_settings.tolerances);
+    MergeDeterminations(m_results, m_settings.tolerances, m_newPoints);
 
     CPyrTxtWnd txt(*m_frontEnd);
     for (const RadiatedPoint& point : m_newPoints) {
         if (!point.outOfTolerance) continue;
         ++m_outOfTolerance;
-        txt.Print(rayon::kLineOutOfTolerance, point.mat.c_str(),
+        txt.Print(rayon::kLineOutOfTolerance, std::string(point.mat).c_str(),
                   static_cast<int>(point.determinations.size()), point.spreadXY, point.spreadZ);
     }
     if (!m_results.empty()) txt.Print(rayon::kLineTotal, static_cast<int>(m_newPoints.size()), used);
@@ -239,11 +244,11 @@ bool CCalcRayon::Enregistrer() {
                 ++stations;
         for (const RadiatedPoint& point : m_newPoints) {
             if (point.outOfTolerance &&
-                m_frontEnd->Ask(Sprintf(rayon::kQuestionOutOfTolerance, point.mat.c_str(),
+                m_frontEnd->Ask(Sprintf(rayon::kQuestionOutOfTolerance, std::string(point.mat).c_str(),
                                         static_cast<int>(point.determinations.size()), point.spreadXY,
                                         point.spreadZ),
                                 ui::kCaption, ui::Buttons::YesNo, ui::Answer::No) != ui::Answer::Yes) {
-                txt.Print(rayon::kLineNotWritten, point.mat.c_str());
+                txt.Print(rayon::kLineNotWritten, std::string(point.mat).c_str());
                 continue;
             }
             if (m_session.WritePoint(point.mat, point.x, point.y, point.z)) ++points;

@@ -66,7 +66,7 @@ std::vector<std::string> CCalcRayonForm::ResultLines() const {
     for (const RadiatedPoint& point : m_model.NewPoints()) {
         if (lines.size() == kShownPoints) break;
         const bool several = point.determinations.size() > 1;
-        lines.push_back(point.mat + '\t' + Fixed(swap ? point.y : point.x, xy) + '\t' +
+        lines.push_back(std::string(point.mat) + '\t' + Fixed(swap ? point.y : point.x, xy) + '\t' +
                         Fixed(swap ? point.x : point.y, xy) + '\t' + Fixed(point.z, z) + '\t' +
                         std::to_string(point.determinations.size()) + '\t' +
                         (several ? Fixed(point.spreadXY, xy) : "-") + '\t' +

@@ -57,11 +57,28 @@ void MergeRepetitions(const std::vector<Entry>& entries, int first, RadiatedSigh
 RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSettings& settings,
                                const CSelection* points) {
     RadiatedStation result;
+    RadiateStation(carnet, stationIndex, settings, points, result);
+    return result;
+}
+
+void RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSettings& settings,
+                    const CSelection* points, RadiatedStation& result) {
+    {
+        // Started afresh, the lists emptied but keeping their room.
+        std::vector<RadiatedSighting> found = std::move(result.points);
+        std::vector<RadiationCheck> checks = std::move(result.checks);
+        std::vector<SkippedSighting> skipped = std::move(result.skipped);
+        found.clear(), checks.clear(), skipped.clear();
+        result = RadiatedStation{};
+        result.points = std::move(found);
+        result.checks = std::move(checks);
+        result.skipped = std::move(skipped);
+    }
     result.station = StationPlaceAt(carnet, stationIndex);
     StationPlace& station = result.station;
     if (!station.HasPlace()) {
         result.reason = rayon::kReasonNoPlace;
-        return result;
+        return;
     }
     if (settings.computeV0) {
         result.v0 = ComputeStationV0(carnet, station, DefaultReferences(carnet, stationIndex), settings.v0);
@@ -72,32 +89,33 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
     }
     if (!station.IsOriented()) {
         result.reason = settings.computeV0 ? rayon::kReasonNoReference : rayon::kReasonNoV0;
-        return result;
+        return;
     }
     result.usable = true;
 
     int end = carnet.Find(kKindStation, "", stationIndex + 1);
     if (end < 0) end = carnet.GetSize();
 
-    // The sightings reduced, then each point's repetitions linked behind its first sighting: sorted by
-    // identifier, those of one point follow one another in GéoBase order. The identifiers are those of the
-    // elements themselves, which outlive this function.
+    // The sightings reduced, then each point's repetitions linked behind its first sighting: sorted by the
+    // rank of their identifier, those of one point follow one another in GéoBase order.
+    const int stationKey = carnet.NameRank(stationIndex);
     std::vector<Entry> entries;
-    std::vector<std::pair<std::string_view, int>> byPoint;
+    std::vector<std::pair<int, int>> byPoint; // identifier's rank, entry
     entries.reserve(static_cast<std::size_t>(end - stationIndex));
     byPoint.reserve(static_cast<std::size_t>(end - stationIndex));
     for (int i = stationIndex + 1; i < end; ++i) {
         if (!IsSightingKind(carnet.GetType(i))) continue;
+        const int key = carnet.NameRank(i);
+        if (key == stationKey) continue;
         const auto* visee = static_cast<const CVisee*>(carnet.GetAt(i));
-        const std::string& mat = visee->mat();
-        if (mat == station.name || (points && !points->Contains(mat))) continue;
+        if (points && !points->Contains(visee->mat())) continue;
         Entry entry{ReduceSighting(carnet, station, i, settings.reduction)};
         // A target height of 0 is the one the surveyor wrote, not what the vertical offset made of it: the
         // replacement takes its place, still lowered by that offset. Without target heights every height
         // is 0 by choice and stays so.
         if (settings.replaceZeroTargetHeight && settings.reduction.targetHeights && visee->hp() == 0.0)
             entry.reduced.hp += settings.zeroTargetHeight;
-        byPoint.emplace_back(mat, static_cast<int>(entries.size()));
+        byPoint.emplace_back(key, static_cast<int>(entries.size()));
         entries.push_back(std::move(entry));
     }
     std::sort(byPoint.begin(), byPoint.end());
@@ -114,8 +132,9 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
         // Built in its place among the new points, and taken out again when it is none.
         RadiatedSighting& s = result.points.emplace_back();
         s.index = head.reduced.index;
-        s.mat = std::move(head.reduced.mat);
-        s.code = carnet.GetAt(s.index)->sym();
+        const CElement& sighted = *carnet.GetAt(s.index);
+        s.mat = sighted.mat();
+        s.code = sighted.sym();
         s.reference = carnet.GetType(s.index) == kKindReference;
         if (head.next < 0) {
             s.hp = head.reduced.hp, s.ah = head.reduced.ah, s.av = head.reduced.av, s.di = head.reduced.di;
@@ -130,13 +149,14 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
         }
 
         if (!IsKnown(s.ah) || !IsKnown(s.dh) || !(s.dh > 0.0)) {
-            result.skipped.push_back({s.index, std::move(s.mat),
-                                      IsKnown(s.ah) ? rayon::kReasonNoDistance : rayon::kReasonNoDirection});
+            result.skipped.push_back(
+                {s.index, s.mat, IsKnown(s.ah) ? rayon::kReasonNoDistance : rayon::kReasonNoDirection});
             result.points.pop_back();
             continue;
         }
         s.bearing = WrapGrads(station.v0 + s.ah);
-        const double sinG = SinGrads(s.bearing), cosG = CosGrads(s.bearing);
+        double sinG = 0.0, cosG = 0.0;
+        SinCosGrads(s.bearing, sinG, cosG);
         s.x = station.x + s.dh * sinG;
         s.y = station.y + s.dh * cosG;
         // A zenith angle of 0 or 200 gr is no line of sight that a height difference can follow.
@@ -144,20 +164,18 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
             s.z = station.z + TrigonometricHeightDifference(s.dh, s.av, station.hi, s.hp);
 
         RadiationCheck check;
-        if (PointPlace(carnet, s.mat, check.knownX, check.knownY, check.knownZ)) {
+        if (PointPlaceOf(carnet, s.index, check.knownX, check.knownY, check.knownZ)) {
             const double dx = s.x - check.knownX, dy = s.y - check.knownY;
             check.along = dx * sinG + dy * cosG;
             check.across = dx * cosG - dy * sinG;
             if (IsKnown(s.z) && IsKnown(check.knownZ)) check.dz = s.z - check.knownZ;
-            check.sighting = std::move(s);
-            result.checks.push_back(std::move(check));
+            check.sighting = s;
+            result.checks.push_back(check);
             result.points.pop_back();
         } else {
-            // The first element bearing the identifier names the point for the merge.
-            s.key = carnet.Find(0, s.mat);
+            s.key = carnet.NameRank(s.index);
         }
     }
-    return result;
 }
 
 Determinations& Determinations::operator=(const Determinations& other) {
@@ -240,41 +258,54 @@ void Summarise(RadiatedPoint& point, const std::vector<RadiatedStation>& station
 
 std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
                                                const Tolerances& tolerances) {
-    std::size_t total = 0;
-    for (const RadiatedStation& station : stations)
-        total += station.points.size();
     std::vector<RadiatedPoint> merged;
+    MergeDeterminations(stations, tolerances, merged);
+    return merged;
+}
+
+void MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances,
+                         std::vector<RadiatedPoint>& merged) {
+    merged.clear();
+    std::size_t total = 0;
+    // The points are grouped by their key, which RadiateStation gives: the rank of their identifier, read
+    // nearly in order since the points mostly come in the order of their first sighting. When some
+    // sightings were made elsewhere, without a key, every point is grouped by its identifier.
+    bool byName = false;
+    int lastKey = -1;
+    for (const RadiatedStation& station : stations) {
+        total += station.points.size();
+        for (const RadiatedSighting& s : station.points) {
+            byName = byName || s.key < 0;
+            lastKey = std::max(lastKey, s.key);
+        }
+    }
     merged.reserve(total);
     std::vector<std::size_t> multiple; // the points determined more than once
-    // The points are grouped by their key, which RadiateStation gives: a table as long as the GéoBase,
-    // read nearly in order since the points mostly come in the order of their first sighting. When some
-    // sightings were made elsewhere, without a key, every point is grouped by its identifier.
-    const bool byName = std::any_of(stations.begin(), stations.end(), [](const RadiatedStation& station) {
-        return std::any_of(station.points.begin(), station.points.end(),
-                           [](const RadiatedSighting& s) { return s.key < 0; });
-    });
-    std::vector<int> rankOfKey; // -1 for a key not seen yet
+    std::vector<int> rankOfKey;        // -1 for a key not seen yet
     std::unordered_map<std::string_view, std::size_t> rankOfName;
-    if (byName) rankOfName.reserve(total);
+    if (byName)
+        rankOfName.reserve(total);
+    else
+        rankOfKey.assign(static_cast<std::size_t>(lastKey + 1), -1);
     auto rankOf = [&](const RadiatedSighting& s) {
         const std::size_t next = merged.size();
         if (byName) return rankOfName.try_emplace(s.mat, next).first->second;
-        const auto key = static_cast<std::size_t>(s.key);
-        if (key >= rankOfKey.size()) rankOfKey.resize(std::max(key + 1, 2 * rankOfKey.size()), -1);
-        if (rankOfKey[key] < 0) rankOfKey[key] = static_cast<int>(next);
-        return static_cast<std::size_t>(rankOfKey[key]);
+        int& rank = rankOfKey[static_cast<std::size_t>(s.key)];
+        if (rank < 0) rank = static_cast<int>(next);
+        return static_cast<std::size_t>(rank);
     };
     for (std::size_t st = 0; st < stations.size(); ++st) {
         const std::vector<RadiatedSighting>& points = stations[st].points;
         for (std::size_t p = 0; p < points.size(); ++p) {
-            const std::size_t rank = rankOf(points[p]);
+            const RadiatedSighting& s = points[p];
+            const std::size_t rank = rankOf(s);
             const Determination determination{static_cast<std::uint32_t>(st), static_cast<std::uint32_t>(p)};
             if (rank == merged.size()) {
-                // Summed at once, while the sighting is at hand: most points have no other.
+                // Most points have no other determination: one is its own mean, without spread.
                 RadiatedPoint& point = merged.emplace_back();
-                point.mat = points[p].mat;
+                point.mat = s.mat;
                 point.determinations.push_back(determination);
-                Summarise(point, stations, tolerances);
+                point.x = s.x, point.y = s.y, point.z = s.z;
                 continue;
             }
             RadiatedPoint& point = merged[rank];
@@ -284,7 +315,6 @@ std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation
     }
     for (std::size_t rank : multiple)
         Summarise(merged[rank], stations, tolerances);
-    return merged;
 }
 
 } // namespace pyr

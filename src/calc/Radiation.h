@@ -9,6 +9,7 @@
 #include <cstdint>
 #include <memory>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -18,6 +19,9 @@
 // point whose planimetry the GéoBase already holds is a check of the station, not a new point. A point
 // radiated from several stations keeps the plain mean of its determinations, its spread checked against
 // the tolerances. Angles in grads, bearings clockwise from the Y axis; lengths in metres.
+//
+// A job radiates a million sightings at once: the identifiers and codes of the results are viewed in the
+// GéoBase's own elements, not copied, and hold while the GéoBase they come from stays open.
 namespace pyr {
 
 class CCarnet;
@@ -36,10 +40,10 @@ struct RadiationSettings {
 // One radiated sighting: the repetitions of one point from one station merged into the first of them.
 struct RadiatedSighting {
     int index = -1;              // the first sighting element of that point from the station
-    int key = -1;                // of a new point: the first element of the GéoBase bearing its identifier,
-                                 // the same from every station, which the merge groups by
-    std::string mat;             // the point sighted
-    std::string code;            // the sighting's code (its symbol)
+    int key = -1;                // of a new point: the rank of its identifier in the GéoBase, the same
+                                 // from every station, which the merge groups by
+    std::string_view mat;        // the point sighted
+    std::string_view code;       // the sighting's code (its symbol)
     int repetitions = 1;         // sightings of the point merged
     bool reference = false;      // a reference sighting (1002)
     double hp = kUndefined;      // target height used (ValeurDeHp0 in place of 0 when asked)
@@ -67,7 +71,7 @@ struct RadiationCheck {
 // A sighting that gave no point, and why ("sans distance", "sans angle horizontal").
 struct SkippedSighting {
     int index = -1;
-    std::string mat;
+    std::string_view mat;
     std::string reason;
 };
 
@@ -88,6 +92,9 @@ struct RadiatedStation {
 // its references when settings.computeV0 is on (its own, if it has one, when that fails).
 RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSettings& settings,
                                const CSelection* points = nullptr);
+// The same, into `result`, whose lists keep the room they had: a job radiated again takes no new memory.
+void RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSettings& settings,
+                    const CSelection* points, RadiatedStation& result);
 
 // Where one station placed a new point.
 struct Determination {
@@ -122,7 +129,7 @@ private:
 
 // A new point and all its determinations: the plain mean of their X, Y (and of their Z where known).
 struct RadiatedPoint {
-    std::string mat;
+    std::string_view mat;
     Determinations determinations; // in the order of the stations
     double x = kUndefined;
     double y = kUndefined;
@@ -135,5 +142,8 @@ struct RadiatedPoint {
 // The new points of the stations radiated, each once, in the order of their first determination.
 std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
                                                const Tolerances& tolerances);
+// The same, into `merged`, which keeps its room.
+void MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances,
+                         std::vector<RadiatedPoint>& merged);
 
 } // namespace pyr

@@ -61,7 +61,7 @@ std::string Cell(const CDlgCfgListing& listing, const RadiatedSighting& s, std::
     const bool swap = CPointGen::SwapXY();
     switch (rank) {
     case 0:
-        return s.mat;
+        return std::string(s.mat);
     case 1:
         return listing.FormatCoor(swap ? s.y : s.x);
     case 2:
@@ -81,7 +81,7 @@ std::string Cell(const CDlgCfgListing& listing, const RadiatedSighting& s, std::
     case 9:
         return listing.FormatDist(s.di);
     default:
-        return s.code;
+        return std::string(s.code);
     }
 }
 
@@ -145,27 +145,40 @@ void WriteSkipped(CDlgCfgListing& listing, const RadiatedStation& result) {
     if (result.skipped.empty()) return;
     Row lines{rayon::kListSkippedTitle};
     for (const SkippedSighting& skipped : result.skipped)
-        lines.push_back(Sprintf(rayon::kListSkipped, skipped.mat.c_str(), skipped.reason.c_str()));
+        lines.push_back(Sprintf(rayon::kListSkipped, std::string(skipped.mat).c_str(), skipped.reason.c_str()));
     DrawFrame(listing, lines, false);
     Blank(listing);
 }
 
-void WriteMultiple(CDlgCfgListing& listing, const RadiationReport& report) {
+void WriteMultiple(CDlgCfgListing& listing, const RadiationReport& report, ListingTable& table) {
     const bool swap = CPointGen::SwapXY();
+    // A station names the determinations of many points: its designation is formed once.
+    std::vector<std::string> designations(report.stations.size());
+    auto designation = [&](std::uint32_t rank) -> const std::string& {
+        std::string& text = designations[rank];
+        if (text.empty()) text = report.stations[rank].station.Designation();
+        return text;
+    };
     for (const RadiatedPoint& point : report.points) {
         if (point.determinations.size() < 2) continue;
-        std::vector<Row> rows{
-            Row(std::begin(rayon::kListMultipleColumns), std::end(rayon::kListMultipleColumns))};
-        if (swap) std::swap(rows[0][2], rows[0][3]);
+        table.Clear(std::size(rayon::kListMultipleColumns));
+        std::string* titles = table.AddRow();
+        std::copy(std::begin(rayon::kListMultipleColumns), std::end(rayon::kListMultipleColumns), titles);
+        if (swap) std::swap(titles[2], titles[3]);
+        auto addRow = [&](std::string_view name, double x, double y, double z) {
+            std::string* row = table.AddRow();
+            row[0] = point.mat;
+            row[1] = name;
+            row[2] = listing.FormatCoor(swap ? y : x);
+            row[3] = listing.FormatCoor(swap ? x : y);
+            row[4] = listing.FormatAlti(z);
+        };
         for (const Determination& d : point.determinations) {
-            const RadiatedStation& station = report.stations[d.station];
-            const RadiatedSighting& s = station.points[d.point];
-            rows.push_back({point.mat, station.station.Designation(), listing.FormatCoor(swap ? s.y : s.x),
-                            listing.FormatCoor(swap ? s.x : s.y), listing.FormatAlti(s.z)});
+            const RadiatedSighting& s = report.stations[d.station].points[d.point];
+            addRow(designation(d.station), s.x, s.y, s.z);
         }
-        rows.push_back({point.mat, rayon::kListMean, listing.FormatCoor(swap ? point.y : point.x),
-                        listing.FormatCoor(swap ? point.x : point.y), listing.FormatAlti(point.z)});
-        DrawTable(listing, rows, true, 2);
+        addRow(rayon::kListMean, point.x, point.y, point.z);
+        DrawTable(listing, table, true, 2);
         listing.WriteLine(rayon::kListSpread, listing.FormatDist(point.spreadXY).c_str(),
                           listing.FormatAlti(point.spreadZ).c_str(),
                           point.outOfTolerance ? rayon::kListOutOfTolerance : "");
@@ -210,7 +223,7 @@ void WriteRadiation(CDlgCfgListing& listing, const RadiationReport& report) {
     if (multiple) {
         DrawFrame(listing, {rayon::kListMultipleTitle}, true);
         Blank(listing);
-        WriteMultiple(listing, report);
+        WriteMultiple(listing, report, table);
     }
     WriteUnused(listing, report);
 }

@@ -11,21 +11,25 @@ std::string StationPlace::Designation() const {
     return Sprintf("%s(%d)", name.c_str(), reprise);
 }
 
+bool PointPlaceOf(const CCarnet& carnet, int index, double& x, double& y, double& z) {
+    x = y = z = kUndefined;
+    for (int i : carnet.SameMat(index)) {
+        if (carnet.GetType(i) != kKindPoint) continue;
+        const auto* point = static_cast<const CPointGen*>(carnet.GetAt(i));
+        if (!IsKnown(x) && point->hasXY()) x = point->x(), y = point->y();
+        if (!IsKnown(z) && point->hasZ()) z = point->z();
+        if (IsKnown(x) && IsKnown(z)) break;
+    }
+    return IsKnown(x);
+}
+
 bool PointPlace(const CCarnet& carnet, std::string_view mat, double& x, double& y, double& z) {
     const int first = carnet.findMat(mat);
     if (first < 0) {
         x = y = z = kUndefined;
         return false;
     }
-    // One look-up when the first element holds both, as it mostly does.
-    const auto* point = static_cast<const CPointGen*>(carnet.GetAt(first));
-    if (point->hasXY() && point->hasZ()) {
-        x = point->x(), y = point->y(), z = point->z();
-        return true;
-    }
-    if (!carnet.hasXY(mat, x, y)) x = y = kUndefined;
-    if (!carnet.hasZ(mat, z)) z = kUndefined;
-    return IsKnown(x);
+    return PointPlaceOf(carnet, first, x, y, z);
 }
 
 StationPlace StationPlaceAt(const CCarnet& carnet, int stationIndex) {
@@ -93,7 +97,9 @@ ReducedSighting ReduceSighting(const CCarnet& carnet, const StationPlace& statio
 }
 
 double TrigonometricHeightDifference(double dh, double zenith, double hi, double hp) {
-    return dh * CosGrads(zenith) / SinGrads(zenith) + hi - hp + CurvatureRefraction(dh);
+    double sinZ = 0.0, cosZ = 0.0;
+    SinCosGrads(zenith, sinZ, cosZ);
+    return dh * cosZ / sinZ + hi - hp + CurvatureRefraction(dh);
 }
 
 } // namespace pyr

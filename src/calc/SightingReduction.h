@@ -39,6 +39,8 @@ StationPlace StationPlaceAt(const CCarnet& carnet, int stationIndex);
 // The planimetry and altitude of a point, each from the first of its elements that holds it. False when
 // its planimetry is unknown (x and y are then kUndefined; z may still be known).
 bool PointPlace(const CCarnet& carnet, std::string_view mat, double& x, double& y, double& z);
+// The same for the point the element at `index` names (a sighting of it, say), without a search by name.
+bool PointPlaceOf(const CCarnet& carnet, int index, double& x, double& y, double& z);
 
 // The eccentric offsets written in front of an element, back to `limit` (excluded): radial along the line
 // of sight, tangential across it, vertical upwards, in metres; 0 when none.

@@ -22,10 +22,8 @@ double NearGrads(double grads, double reference) {
     return reference + delta;
 }
 
-namespace {
-
-// Sine and cosine of an angle in grads, reduced exactly to an octant first: the quadrant is taken
-// out as a whole number of 100 gr, the remainder lies within [-50, 50] gr.
+// Reduced exactly to an octant first: the quadrant is taken out as a whole number of 100 gr, the
+// remainder lies within [-50, 50] gr.
 void SinCosGrads(double grads, double& s, double& c) {
     double r = std::remainder(grads, 400.0); // exact, in [-200, 200]
     double q = std::round(r / 100.0);        // quadrant -2..2
@@ -51,8 +49,6 @@ void SinCosGrads(double grads, double& s, double& c) {
     s += 0.0;
     c += 0.0;
 }
-
-} // namespace
 
 double SinGrads(double grads) {
     double s, c;

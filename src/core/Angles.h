@@ -22,6 +22,8 @@ double NearGrads(double grads, double reference);
 
 double SinGrads(double grads);
 double CosGrads(double grads);
+// Both at once, for the price of one: exact at every multiple of 100 gr.
+void SinCosGrads(double grads, double& s, double& c);
 
 // Bearing (gisement) from A to B: clockwise from the +Y axis (north), X being the easting, in
 // [0, 400). Zero for two identical points.

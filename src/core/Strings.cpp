@@ -21,9 +21,13 @@ std::string VSprintf(const char* format, std::va_list args) {
     const locale_t previous = cLocale ? uselocale(cLocale) : nullptr;
     std::va_list again;
     va_copy(again, args);
-    const int size = std::vsnprintf(nullptr, 0, format, args);
+    // Most texts are a line: formed once on the stack, formed again only when longer.
+    char line[256];
+    const int size = std::vsnprintf(line, sizeof line, format, args);
     std::string text;
-    if (size > 0) {
+    if (size > 0 && static_cast<std::size_t>(size) < sizeof line) {
+        text.assign(line, static_cast<std::size_t>(size));
+    } else if (size > 0) {
         text.resize(static_cast<std::size_t>(size));
         std::vsnprintf(text.data(), text.size() + 1, format, again);
     }

@@ -293,6 +293,19 @@ int CCarnet::findMat(std::string_view mat) const {
     return mat.empty() ? -1 : Find(kKindPoint, mat, 0, 0);
 }
 
+const std::vector<int>& CCarnet::SameMat(int index) const {
+    const CarnetIndex& names = Index();
+    return names.WithNameRank(names.NameRankOf(index));
+}
+
+int CCarnet::NameRank(int index) const {
+    return Index().NameRankOf(index);
+}
+
+int CCarnet::NameCount() const {
+    return static_cast<int>(Index().NameCount());
+}
+
 int CCarnet::lastInd(std::string_view mat) const {
     return mat.empty() ? -1 : Find(kKindPoint, mat, GetSize() - 1, -1);
 }

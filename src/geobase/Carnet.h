@@ -92,6 +92,14 @@ public:
     // (direction -1), -1 when there is none. An empty identifier matches every element of the kind.
     int Find(int kind, std::string_view mat, int start = 0, int direction = 0) const;
     int findMat(std::string_view mat) const; // first point (1006) of that identifier
+    // The elements bearing the identifier of the element at `index`, itself included, in increasing
+    // order, found without searching for the identifier; empty for an element without one. Valid until
+    // the GéoBase changes.
+    const std::vector<int>& SameMat(int index) const;
+    // The rank of that identifier among the GéoBase's identifiers (in the order of their first element),
+    // -1 without: a key as dense as the identifiers are many. NameCount() is one past the last rank.
+    int NameRank(int index) const;
+    int NameCount() const;
     int lastInd(std::string_view mat) const; // last point of that identifier
     bool hasPnt(std::string_view mat) const;
     bool hasPnt(int index) const;

@@ -28,6 +28,7 @@ bool CarnetIndex::Name::Is(std::string_view text) const {
 void CarnetIndex::Clear() {
     m_valid = false;
     m_names.clear();
+    m_rankOf.clear();
     std::fill(m_slots.begin(), m_slots.end(), 0);
     for (auto& list : m_byKind)
         list.clear();
@@ -43,6 +44,7 @@ void CarnetIndex::Build(const std::vector<std::unique_ptr<CElement>>& elements, 
     // Mostly a point and its sightings, or a station's name and its point's: half as many identifiers
     // as elements is room enough to start with.
     m_names.reserve(elements.size() / 2 + 16);
+    m_rankOf.reserve(elements.size());
     Reserve(elements.size() / 2 + 16);
     for (std::size_t i = 0; i < elements.size(); ++i)
         Add(static_cast<int>(i), *elements[i], kinds[i]);
@@ -83,17 +85,23 @@ std::size_t CarnetIndex::SlotOf(std::string_view mat, std::uint64_t hash) const 
 void CarnetIndex::Add(int index, const CElement& element, int kind) {
     if (IsKnownKind(kind)) m_byKind[static_cast<std::size_t>(kind - kKindComment)].push_back(index);
     const std::string& mat = element.mat();
-    if (mat.empty()) return;
+    if (mat.empty()) {
+        m_rankOf.push_back(-1);
+        return;
+    }
     const std::uint64_t hash = std::hash<std::string_view>{}(mat);
     std::size_t slot = SlotOf(mat, hash);
     if (m_slots[slot] != 0) {
-        m_names[(m_slots[slot] & kRankBits) - 1].indices.push_back(index);
+        const std::uint64_t rank = (m_slots[slot] & kRankBits) - 1;
+        m_names[rank].indices.push_back(index);
+        m_rankOf.push_back(static_cast<int>(rank));
         return;
     }
     if (2 * (m_names.size() + 1) > m_slots.size()) {
         Reserve(m_names.size() + 1);
         slot = SlotOf(mat, hash);
     }
+    m_rankOf.push_back(static_cast<int>(m_names.size()));
     Name& name = m_names.emplace_back();
     name.indices.push_back(index);
     name.hash = hash;

@@ -30,6 +30,19 @@ public:
     const std::vector<int>* WithMat(std::string_view mat) const;
     // The indices of the elements of that kind, in increasing order.
     const std::vector<int>& WithKind(int kind) const;
+    // The rank of the identifier of the element at `index` among the identifiers, in the order of their
+    // first element, -1 for an element without one: a dense key, read without hashing the identifier.
+    int NameRankOf(int index) const {
+        const auto at = static_cast<std::size_t>(index);
+        return at < m_rankOf.size() ? m_rankOf[at] : -1;
+    }
+    // The indices of the elements bearing the identifier of that rank, in increasing order.
+    const std::vector<int>& WithNameRank(int rank) const {
+        return rank >= 0 && static_cast<std::size_t>(rank) < m_names.size()
+                   ? m_names[static_cast<std::size_t>(rank)].indices
+                   : m_none;
+    }
+    std::size_t NameCount() const { return m_names.size(); }
 
 private:
     // One identifier: one cache line, its text held in it when short, so that a look-up in a store of a
@@ -56,6 +69,7 @@ private:
     std::size_t m_size = 0;
     std::uint64_t m_identifierChanges = 0;
     std::vector<Name> m_names; // in the order of their first element
+    std::vector<int> m_rankOf; // of each element, its identifier's rank in m_names, -1 without
     // Open addressing, probed in sequence: 0 for an empty slot, else the upper half of the identifier's
     // hash and its rank in m_names plus one.
     std::vector<std::uint64_t> m_slots;

@@ -16,9 +16,6 @@ namespace {
 // Lines of a plain-text page's footer, with the page count: a separator and the page number.
 constexpr int kFooterLines = 2;
 constexpr std::string_view kHeaderName = "PYRALIS Calculs Topo";
-// What the listing gathers before writing it to its file: a listing of a million lines goes out in a
-// hundred writes, not in tens of thousands.
-constexpr std::size_t kBufferBytes = 1 << 20;
 
 } // namespace
 

@@ -215,6 +215,9 @@ private:
     std::unique_ptr<SafeFileWriter> m_writer; // the listing being written, null when none is open
     std::string m_buffer;                     // bytes for m_writer, not yet given to it
     std::string m_fileName;                   // shown in the plain-text header
+    // What the listing gathers before writing it to its file: a listing of a million lines goes out in a
+    // hundred writes, not in tens of thousands.
+    static constexpr std::size_t kBufferBytes = 1 << 20;
     int m_error = 0;
     bool m_documentStarted = false; // the RTF prologue is written
     ListingOutput m_output = ListingOutput::File;

@@ -212,10 +212,28 @@ void CDlgCfgListing::AppendPlainTableRow(std::string& line, std::span<const std:
 int CDlgCfgListing::WritePlainTableRow(std::span<const std::string_view> texts, std::span<const int> widths,
                                        std::span<const RtfAlign> aligns) {
     if (m_lineOpen) EndLine();
-    m_row.clear();
-    AppendPlainTableRow(m_row, texts, widths, aligns);
-    m_row += '\n';
-    return Emit(m_row);
+    const bool oneLine = std::none_of(texts.begin(), texts.end(), [](std::string_view text) {
+        return text.find('\n') != std::string_view::npos;
+    });
+    if (!oneLine) {
+        m_row.clear();
+        AppendPlainTableRow(m_row, texts, widths, aligns);
+        m_row += '\n';
+        return Emit(m_row);
+    }
+    BreakPageIfFull();
+    if (m_output == ListingOutput::File && m_writer && !m_echo) {
+        // Formed straight into what goes to the file.
+        AppendPlainTableRow(m_buffer, texts, widths, aligns);
+        m_buffer += '\n';
+        ++m_lineCount;
+        if (m_buffer.size() >= kBufferBytes) Flush();
+        return 1;
+    }
+    m_lineOpen = true;
+    AppendPlainTableRow(m_pending, texts, widths, aligns);
+    EndLine();
+    return 1;
 }
 
 int CDlgCfgListing::rtfDrawTab() {

@@ -63,7 +63,7 @@ void ExpectAllFinite(const RadiatedStation& r) {
 std::vector<std::string> Mats(const std::vector<RadiatedSighting>& points) {
     std::vector<std::string> mats;
     for (const RadiatedSighting& s : points)
-        mats.push_back(s.mat);
+        mats.emplace_back(s.mat);
     return mats;
 }
 

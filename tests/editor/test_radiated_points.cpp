@@ -28,7 +28,7 @@ TEST(RadiatedPoints, AFieldBookRadiatedFindsTheCoordinatesItsInstrumentComputed)
     const CCarnet& instrument = computed.Set(kKeyPointsCalcules, "1").ReadFile("nikon-raw-calcule.raw");
     ASSERT_EQ(ReportText(bare), "");
 
-    std::map<std::string, double> curvature; // the term in our altitudes, the station's included
+    std::map<std::string, double, std::less<>> curvature; // the term in our altitudes, the station's included
     int points = 0, checks = 0;
     for (int s = geo.Find(kKindStation, "", 0); s >= 0; s = geo.Find(kKindStation, "", s + 1)) {
         RadiationSettings settings;
@@ -41,12 +41,12 @@ TEST(RadiatedPoints, AFieldBookRadiatedFindsTheCoordinatesItsInstrumentComputed)
             SCOPED_TRACE(p.mat);
             double x = 0.0, y = 0.0, z = 0.0;
             ASSERT_TRUE(instrument.hasXY(p.mat, x, y) && instrument.hasZ(p.mat, z));
-            curvature[p.mat] = carried + CurvatureRefraction(p.dh);
+            curvature[std::string(p.mat)] = carried + CurvatureRefraction(p.dh);
             EXPECT_NEAR(p.x, x, 0.001);
             EXPECT_NEAR(p.y, y, 0.001);
-            EXPECT_NEAR(p.z - curvature[p.mat], z, 0.001);
+            EXPECT_NEAR(p.z - curvature.find(p.mat)->second, z, 0.001);
             ++points;
-            auto point = std::make_unique<CPointGen>(p.mat, 0.0, 0.0, 0.0);
+            auto point = std::make_unique<CPointGen>(std::string(p.mat), 0.0, 0.0, 0.0);
             point->setPt(p.x, p.y, p.z);
             geo.Add(std::move(point), kKindPoint); // after the last station: it belongs to no station
         }

@@ -4,8 +4,11 @@
 #include <algorithm>
 #include <cmath>
 #include <gtest/gtest.h>
+#include <map>
 #include <memory>
+#include <set>
 #include <string>
+#include <vector>
 
 using namespace pyr;
 
@@ -141,6 +144,7 @@ TEST(Store, TheIndexFollowsAppendsRemovalsAndRenaming) {
     c.GetAt(11)->setMat("P8bis");
     EXPECT_EQ(c.findMat("P8"), -1);
     EXPECT_EQ(c.findMat("P8bis"), 11);
+    EXPECT_EQ(c.SameMat(11), std::vector<int>{11});
 
     // A deep copy has its own index.
     CCarnet copy = c;
@@ -241,6 +245,23 @@ TEST(Store, TheIndexAnswersLikeAScanWhileItGrowsUnderAppends) {
             ASSERT_EQ(c.Find(kKindMesure, mat, n / 2, -1), scan(kKindMesure, mat, n / 2, -1)) << mat;
         }
     }
+    // Every element finds the others of its identifier, and one rank per identifier, without a search.
+    std::map<std::string, std::vector<int>> byName;
+    for (int i = 0; i < c.GetSize(); ++i)
+        byName[c.matAt(i)].push_back(i);
+    std::set<int> ranks;
+    for (const auto& [mat, indices] : byName) {
+        const int rank = c.NameRank(indices.front());
+        EXPECT_TRUE(ranks.insert(rank).second) << mat;
+        EXPECT_LT(rank, c.NameCount());
+        for (int i : indices) {
+            ASSERT_EQ(c.NameRank(i), rank) << mat;
+            ASSERT_EQ(c.SameMat(i), indices) << mat;
+        }
+    }
+    EXPECT_EQ(c.NameCount(), static_cast<int>(byName.size()));
+    EXPECT_EQ(c.NameRank(c.GetSize()), -1);
+    EXPECT_TRUE(c.SameMat(-1).empty());
     EXPECT_EQ(c.Find(kKindPoint, "TRES_LONG_PREFIXE_"), -1);
     EXPECT_EQ(c.Find(kKindPoint, "TRES_LONG_PREFIXE_5997"), -1); // a measure, not a point
     EXPECT_EQ(c.findMat("TRES_LONG_PREFIXE_5994"), 5994);
