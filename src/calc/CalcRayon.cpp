@@ -74,6 +74,7 @@ bool CCalcRayon::Open(ui::FrontEnd& frontEnd) {
     // The results of another opening view the elements of the GéoBase then open.
     m_results.clear();
     m_newPoints.clear();
+    m_memory.release();
     m_stationIndex.clear();
     m_stations.clear();
     const CCarnet& carnet = m_session.Carnet();
@@ -196,7 +197,10 @@ bool CCalcRayon::Calculate() {
 
     // Computed again into the results of the last run, which keep their room.
     const std::vector<int> chosen = ChosenStations();
-    m_results.resize(chosen.size());
+    if (m_results.size() > chosen.size())
+        m_results.erase(m_results.begin() + static_cast<std::ptrdiff_t>(chosen.size()), m_results.end());
+    while (m_results.size() < chosen.size())
+        m_results.emplace_back(&m_memory);
     int used = 0;
     for (std::size_t k = 0; k < chosen.size(); ++k) {
         RadiatedStation& result = m_results[k];

@@ -3,8 +3,10 @@
 #include "calc/CalculV0Sta.h"
 #include "calc/ComputationSession.h"
 #include "calc/Radiation.h"
+#include "core/LargeBlocks.h"
 #include "ui/DialogModel.h"
 
+#include <memory_resource>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -71,12 +73,14 @@ public:
 
     // ---- What is shown
     const std::vector<RadiatedStation>& Results() const { return m_results; }
-    const std::vector<RadiatedPoint>& NewPoints() const { return m_newPoints; }
+    const RadiatedPoints& NewPoints() const { return m_newPoints; }
     int NotUsed() const { return m_notUsed; }
     int OutOfTolerance() const { return m_outOfTolerance; }
     const CCarnet& Carnet() const { return m_session.Carnet(); }
 
 private:
+    static constexpr std::size_t kFirstBlockBytes = 4 * kHugePageBytes;
+
     void LoadSettings();
     void ReadOptions();
     std::vector<int> ChosenStations();
@@ -97,8 +101,11 @@ private:
     std::string m_list;
     std::string m_points;
 
+    // The sightings of the stations radiated, for as long as the GéoBase stays open: a job's results are
+    // taken together, and kept for the next run.
+    std::pmr::monotonic_buffer_resource m_memory{kFirstBlockBytes, LargeBlocks()};
     std::vector<RadiatedStation> m_results;
-    std::vector<RadiatedPoint> m_newPoints;
+    RadiatedPoints m_newPoints{LargeBlocks()};
     int m_notUsed = 0;
     int m_outOfTolerance = 0;
     bool m_written = false;

@@ -63,17 +63,7 @@ RadiatedStation RadiateStation(const CCarnet& carnet, int stationIndex, const Ra
 
 void RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSettings& settings,
                     const CSelection* points, RadiatedStation& result) {
-    {
-        // Started afresh, the lists emptied but keeping their room.
-        std::vector<RadiatedSighting> found = std::move(result.points);
-        std::vector<RadiationCheck> checks = std::move(result.checks);
-        std::vector<SkippedSighting> skipped = std::move(result.skipped);
-        found.clear(), checks.clear(), skipped.clear();
-        result = RadiatedStation{};
-        result.points = std::move(found);
-        result.checks = std::move(checks);
-        result.skipped = std::move(skipped);
-    }
+    result.Clear();
     result.station = StationPlaceAt(carnet, stationIndex);
     StationPlace& station = result.station;
     if (!station.HasPlace()) {
@@ -256,15 +246,14 @@ void Summarise(RadiatedPoint& point, const std::vector<RadiatedStation>& station
 
 } // namespace
 
-std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
-                                               const Tolerances& tolerances) {
-    std::vector<RadiatedPoint> merged;
+RadiatedPoints MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances) {
+    RadiatedPoints merged;
     MergeDeterminations(stations, tolerances, merged);
     return merged;
 }
 
 void MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances,
-                         std::vector<RadiatedPoint>& merged) {
+                         RadiatedPoints& merged) {
     merged.clear();
     std::size_t total = 0;
     // The points are grouped by their key, which RadiateStation gives: the rank of their identifier, read
@@ -295,7 +284,7 @@ void MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tol
         return static_cast<std::size_t>(rank);
     };
     for (std::size_t st = 0; st < stations.size(); ++st) {
-        const std::vector<RadiatedSighting>& points = stations[st].points;
+        const RadiatedSightings& points = stations[st].points;
         for (std::size_t p = 0; p < points.size(); ++p) {
             const RadiatedSighting& s = points[p];
             const std::size_t rank = rankOf(s);

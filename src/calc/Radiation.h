@@ -8,6 +8,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <memory>
+#include <memory_resource>
 #include <string>
 #include <string_view>
 #include <utility>
@@ -57,6 +58,9 @@ struct RadiatedSighting {
     double z = kUndefined; // unknown without the station's altitude, HI, AV or HP
 };
 
+// A station's radiated sightings, in memory the caller may give: a whole job's are a hundred megabytes.
+using RadiatedSightings = std::pmr::vector<RadiatedSighting>;
+
 // A sighting of a point whose planimetry is known: what the radiation gives beside what the GéoBase holds.
 struct RadiationCheck {
     RadiatedSighting sighting;
@@ -77,14 +81,29 @@ struct SkippedSighting {
 
 // What the radiation made of one station occurrence.
 struct RadiatedStation {
+    RadiatedStation() = default;
+    explicit RadiatedStation(std::pmr::memory_resource* memory) : points(memory) {}
+
     StationPlace station;                 // its V0 is the one used (computed when asked and possible)
     bool usable = false;                  // placed and oriented
     std::string reason;                   // why not, in French, when not usable
     bool v0Computed = false;              // oriented on its references by the V0 rules ("RayonV0Calcule")
     V0Result v0;                          // that computation, when it was made
-    std::vector<RadiatedSighting> points; // new points, in GéoBase order of their first sighting
+    RadiatedSightings points;             // new points, in GéoBase order of their first sighting
     std::vector<RadiationCheck> checks;   // known points
     std::vector<SkippedSighting> skipped;
+
+    // Emptied for another run, its lists keeping their room and their memory.
+    void Clear() {
+        station = StationPlace{};
+        usable = false;
+        reason.clear();
+        v0Computed = false;
+        v0 = V0Result{};
+        points.clear();
+        checks.clear();
+        skipped.clear();
+    }
 };
 
 // Radiates the sightings of the station occurrence at `stationIndex` (limited to the points of `points`
@@ -139,11 +158,12 @@ struct RadiatedPoint {
     bool outOfTolerance = false; // spreadXY > TolDistances or spreadZ > TolAltitudes
 };
 
+using RadiatedPoints = std::pmr::vector<RadiatedPoint>;
+
 // The new points of the stations radiated, each once, in the order of their first determination.
-std::vector<RadiatedPoint> MergeDeterminations(const std::vector<RadiatedStation>& stations,
-                                               const Tolerances& tolerances);
+RadiatedPoints MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances);
 // The same, into `merged`, which keeps its room.
 void MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances,
-                         std::vector<RadiatedPoint>& merged);
+                         RadiatedPoints& merged);
 
 } // namespace pyr

@@ -15,7 +15,7 @@ class CDlgCfgListing;
 
 struct RadiationReport {
     const std::vector<RadiatedStation>& stations;
-    const std::vector<RadiatedPoint>& points;
+    const RadiatedPoints& points;
     const std::vector<std::string>& columns; // tokens of "RayonContenu"
     bool checks;                             // "ControleV0Rayonne": the checks of known points listed
 };

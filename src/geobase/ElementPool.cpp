@@ -2,7 +2,6 @@
 
 #include <cstdlib>
 #include <new>
-#include <sys/mman.h>
 
 #if defined(__SANITIZE_ADDRESS__)
 #define PYR_ELEMENT_POOL 0
@@ -32,11 +31,7 @@ void* SlotAllocator::Allocate(std::size_t size) {
     }
     const std::size_t bytes = slot * kGrain;
     if (static_cast<std::size_t>(m_end - m_next) < bytes) {
-        void* block = std::aligned_alloc(kBlockBytes, kBlockBytes);
-        if (!block) throw std::bad_alloc();
-#ifdef MADV_HUGEPAGE
-        madvise(block, kBlockBytes, MADV_HUGEPAGE); // a hint: without huge pages the block still works
-#endif
+        void* block = AllocateHugePageBlock(kBlockBytes);
         // The few bytes left at the end of the previous block are given up.
         m_next = static_cast<char*>(block);
         m_end = m_next + kBlockBytes;

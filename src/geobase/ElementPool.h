@@ -1,5 +1,7 @@
 #pragma once
 
+#include "core/LargeBlocks.h"
+
 #include <cstddef>
 #include <mutex>
 #include <vector>
@@ -11,7 +13,7 @@ namespace pyr {
 // ordinary allocator. The blocks stay with the process. Safe to share between threads.
 class SlotAllocator {
 public:
-    static constexpr std::size_t kBlockBytes = std::size_t{2} << 20; // one huge page
+    static constexpr std::size_t kBlockBytes = kHugePageBytes;
     static constexpr std::size_t kGrain = 16;                        // sizes are rounded up to this
     static constexpr std::size_t kLargest = 512;
 

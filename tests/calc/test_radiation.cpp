@@ -60,7 +60,7 @@ void ExpectAllFinite(const RadiatedStation& r) {
                       c.across, c.dz});
 }
 
-std::vector<std::string> Mats(const std::vector<RadiatedSighting>& points) {
+std::vector<std::string> Mats(const RadiatedSightings& points) {
     std::vector<std::string> mats;
     for (const RadiatedSighting& s : points)
         mats.emplace_back(s.mat);
@@ -353,7 +353,7 @@ TEST(RadiationMerge, APointFromSeveralStationsKeepsTheMeanAndItsSpread) {
     for (int index : {3, 6, 9})
         stations.push_back(RadiateStation(geo, index, RadiationSettings{}));
     Tolerances tolerances;
-    std::vector<RadiatedPoint> points = MergeDeterminations(stations, tolerances);
+    RadiatedPoints points = MergeDeterminations(stations, tolerances);
     ASSERT_EQ(points.size(), 3u);
     EXPECT_EQ(points[0].mat, "P");
     EXPECT_EQ(points[1].mat, "Q");
@@ -390,7 +390,7 @@ TEST(RadiationMerge, APointFromSeveralStationsKeepsTheMeanAndItsSpread) {
     // Sightings made elsewhere, without the key RadiateStation gives, are grouped by identifier alike.
     std::vector<RadiatedStation> unkeyed = stations;
     unkeyed[1].points[0].key = -1;
-    const std::vector<RadiatedPoint> byName = MergeDeterminations(unkeyed, tolerances);
+    const RadiatedPoints byName = MergeDeterminations(unkeyed, tolerances);
     ASSERT_EQ(byName.size(), points.size());
     for (std::size_t i = 0; i < points.size(); ++i) {
         EXPECT_EQ(byName[i].mat, points[i].mat);
@@ -419,7 +419,7 @@ TEST(RadiationListing, StationsTheirPointsChecksAndRepeatedPointsAreTabulated) {
     std::vector<RadiatedStation> stations;
     for (int index : {2, 9})
         stations.push_back(RadiateStation(geo, index, RadiationSettings{}));
-    const std::vector<RadiatedPoint> points = MergeDeterminations(stations, Tolerances{});
+    const RadiatedPoints points = MergeDeterminations(stations, Tolerances{});
     const std::vector<std::string> columns = RadiationColumns("CS,N,X,Y,Z,GI");
 
     ui::ScriptedFrontEnd frontEnd;
