@@ -6,6 +6,7 @@
 #include <charconv>
 #include <climits>
 #include <cmath>
+#include <iterator>
 #include <vector>
 
 namespace pyr {
@@ -31,6 +32,12 @@ std::string ToChars(double value, std::chars_format format, int precision) {
     auto result = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value, format, precision);
     return std::string(buffer.data(), result.ptr);
 }
+
+// 10^0 to 10^22: the powers of ten that a double holds exactly.
+constexpr double kExactPowersOfTen[] = {1e0,  1e1,  1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                        1e8,  1e9,  1e10, 1e11, 1e12, 1e13, 1e14, 1e15,
+                                        1e16, 1e17, 1e18, 1e19, 1e20, 1e21, 1e22};
+constexpr double kTwoTo52 = 4503599627370496.0;
 
 } // namespace
 
@@ -64,8 +71,30 @@ void AppendShortest(std::string& out, double value) {
 double RoundToDecimals(double value, int decimals) {
     if (IsUndefined(value) || !std::isfinite(value)) return value;
     if (decimals < 0) decimals = 6;
+    if (static_cast<std::size_t>(decimals) < std::size(kExactPowersOfTen)) {
+        const double scale = kExactPowersOfTen[decimals];
+        // |value| × 10^n, rounded once to the nearest double.
+        const double scaled = std::fabs(value * scale);
+        if (scaled < kTwoTo52) {
+            // The nearest integer, exact: beside 2^52 a double has no room for a fraction.
+            const double whole = (scaled + kTwoTo52) - kTwoTo52;
+            // Below 2^52 every half-integer is a double, and rounding keeps the order: the exact product
+            // and its double lie on the same side of any half, and round to the same integer, the one the
+            // text shows; whole / 10^n, the correctly rounded quotient of two exact values, is then the
+            // double nearest to the text, the one reading it gives. A double that is itself a half may be
+            // the rounding of a product on either side of it: the text settles it.
+            if (std::fabs(scaled - whole) != 0.5) return std::copysign(whole, value) / scale;
+        }
+    }
+    return detail::RoundThroughText(value, decimals);
+}
+
+namespace detail {
+
+double RoundThroughText(double value, int decimals) {
+    if (IsUndefined(value) || !std::isfinite(value)) return value;
+    if (decimals < 0) decimals = 6;
     double rounded = value;
-    // Rounded as the decimal text would show it, without a string in between.
     if (decimals <= kStackPrecision) {
         char buffer[kStackBuffer];
         auto result =
@@ -76,6 +105,8 @@ double RoundToDecimals(double value, int decimals) {
     ParseDouble(FormatFixed(value, decimals), rounded);
     return rounded;
 }
+
+} // namespace detail
 
 bool ParseDouble(std::string_view text, double& value) {
     text = Trimmed(text);

@@ -20,8 +20,9 @@ std::string FormatGeneral(double value);
 std::string FormatShortest(double value);
 void AppendShortest(std::string& out, double value);
 
-// Rounds to n decimals the way the store does it: formatted with "%.*f", then read back.
-// The undefined value stays undefined.
+// Rounds to n decimals the way the store does it: the double read back from the text "%.*f" writes,
+// bit for bit, found without the text for the coordinates and angles of a job. The undefined value
+// stays undefined.
 double RoundToDecimals(double value, int decimals);
 
 // Strict reading of a whole field: optional blanks around, an optional sign, the number, nothing else.
@@ -32,5 +33,10 @@ bool ParseInt(std::string_view text, long long& value);
 // longest prefix that is a number is read, and a text that does not start with a number reads as 0.
 double LenientAtof(std::string_view text);
 int LenientAtoi(std::string_view text);
+
+namespace detail {
+// RoundToDecimals the long way, through the decimal text: what its quick way must always agree with.
+double RoundThroughText(double value, int decimals);
+} // namespace detail
 
 } // namespace pyr

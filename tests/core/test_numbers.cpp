@@ -1,9 +1,12 @@
 #include "core/Numbers.h"
 #include "core/Undefined.h"
 
+#include <bit>
 #include <clocale>
 #include <cmath>
+#include <cstdint>
 #include <gtest/gtest.h>
+#include <random>
 
 using namespace pyr;
 
@@ -29,10 +32,91 @@ TEST(Numbers, ShortestFormReadsBackExactlyAndNeverUsesAnExponent) {
     EXPECT_EQ(FormatShortest(kUndefined), "-999999");
 }
 
-TEST(Numbers, RoundingGoesThroughTheTextAndKeepsTheUndefinedValue) {
+TEST(Numbers, RoundingGivesWhatTheTextReadsBackAndKeepsTheUndefinedValue) {
     EXPECT_EQ(RoundToDecimals(651325.41249, 3), 651325.412);
     EXPECT_EQ(RoundToDecimals(12.34567, 4), 12.3457);
     EXPECT_EQ(RoundToDecimals(kUndefined, 2), kUndefined);
+    // The decimal text of the double decides, not the decimals typed: 2.675 is held as 2.67499999...
+    EXPECT_EQ(RoundToDecimals(2.675, 2), 2.67);
+    EXPECT_EQ(RoundToDecimals(1.005, 2), 1.0);
+    // An exact half goes to the even neighbour, as printf does.
+    EXPECT_EQ(RoundToDecimals(0.125, 2), 0.12);
+    EXPECT_EQ(RoundToDecimals(0.375, 2), 0.38);
+    EXPECT_EQ(RoundToDecimals(-2.5, 0), -2.0);
+    // A negative value that rounds to nothing is read back as -0, as "-0.00" is.
+    EXPECT_TRUE(std::signbit(RoundToDecimals(-0.001, 2)));
+    EXPECT_FALSE(std::signbit(RoundToDecimals(0.001, 2)));
+    EXPECT_TRUE(std::isnan(RoundToDecimals(NAN, 3)));
+    EXPECT_EQ(RoundToDecimals(-INFINITY, 3), -INFINITY);
+}
+
+namespace {
+
+// Counts the values whose rounding differs, bit for bit (the sign of zero included), from the text's.
+struct RoundingCheck {
+    int checked = 0;
+    int differing = 0;
+    void operator()(double value, int decimals) {
+        ++checked;
+        const double quick = RoundToDecimals(value, decimals);
+        const double text = detail::RoundThroughText(value, decimals);
+        if (std::bit_cast<std::uint64_t>(quick) == std::bit_cast<std::uint64_t>(text)) return;
+        if (++differing <= 10)
+            ADD_FAILURE() << FormatShortest(value) << " to " << decimals
+                          << " decimals: " << FormatShortest(quick) << " instead of " << FormatShortest(text);
+    }
+};
+
+} // namespace
+
+TEST(Numbers, RoundingIsBitForBitThatOfTheTextOnCoordinatesHalvesAndLimits) {
+    RoundingCheck check;
+    std::mt19937_64 random(20240611);
+    std::uniform_real_distribution<double> exponent(-3.0, 7.0), unit(0.0, 1.0);
+    std::uniform_int_distribution<int> decimals(0, 8), ulps(-6, 6);
+    // Coordinates, distances and angles of every size a job holds, of both signs.
+    for (int i = 0; i < 1000000; ++i) {
+        const double value = std::pow(10.0, exponent(random)) * (unit(random) < 0.5 ? -1.0 : 1.0);
+        check(value, decimals(random));
+    }
+    // Values written with one decimal more than kept, ending in 5, and their neighbours a few ulps
+    // away: the product lands on a half, or just beside it, where the two ways could part.
+    for (int i = 0; i < 400000; ++i) {
+        const int n = decimals(random);
+        const double tenths = std::floor(std::pow(10.0, exponent(random) + 1.0)) * 10.0 + 5.0;
+        const double value = tenths / std::pow(10.0, n + 1) * (unit(random) < 0.5 ? -1.0 : 1.0);
+        double nearby = value;
+        for (int step = ulps(random); step != 0; step += step > 0 ? -1 : 1)
+            nearby = std::nextafter(nearby, step > 0 ? INFINITY : -INFINITY);
+        check(value, n);
+        check(nearby, n);
+    }
+    // Exact halves: q / 2^(n+1), q odd, is the only kind of double that ends in a 5 just after its n-th
+    // decimal (0.125 to 2 decimals, -2.5 to none). Then their neighbours, a binary digit off.
+    for (int n = 0; n <= 8; ++n) {
+        const double halves = std::ldexp(1.0, n + 1);
+        std::uniform_int_distribution<long long> odd(0, static_cast<long long>(halves * 5e6));
+        for (int i = 0; i < 4000; ++i) {
+            const double value = static_cast<double>(2 * (i < 2000 ? i : odd(random)) + 1) / halves;
+            for (double v : {value, -value, std::nextafter(value, 0.0), std::nextafter(value, INFINITY)})
+                check(v, n);
+        }
+    }
+    // Zeros, and magnitudes around 2^52 / 10^n where the quick way gives way to the text.
+    for (int n = 0; n <= 25; ++n) {
+        check(0.0, n);
+        check(-0.0, n);
+        const double limit = 0x1p52 / std::pow(10.0, n);
+        for (double factor : {0.999, 0.9999999, 1.0, 1.0000001, 1.001}) {
+            double value = limit * factor;
+            for (int step = 0; step < 8; ++step) {
+                check(value, n);
+                check(-value, n);
+                value = std::nextafter(value, INFINITY);
+            }
+        }
+    }
+    EXPECT_EQ(check.differing, 0) << "of " << check.checked;
 }
 
 TEST(Numbers, StrictParsingRefusesTrailingText) {
