@@ -221,18 +221,15 @@ bool CChange_Rep::MovePoint(int index) {
     double x = point.x(), y = point.y();
     if (m_options.projection && !ProjectOntoLine(m_line, x, y)) return false;
     if (m_options.changeFrame) IntoFrame2(m_change, x, y);
+    if (!std::isfinite(x) || !std::isfinite(y)) return false;
 
-    std::unique_ptr<CElement> before = m_carnet->copyElement(index);
+    // The state before kept for the undo, then the point rewritten where it stands.
+    ElementChange change{index, m_carnet->copyElement(index)};
     auto& written = static_cast<CPointGen&>(*m_carnet->GetAt(index));
-    if (!m_options.swapYZ) {
-        if (!written.setPt(x, y)) return false;
-    } else {
-        const double z = written.z();
-        if (!std::isfinite(x) || !std::isfinite(y) || !written.setPt(x, z)) return false;
-        // Y' goes into Z with the planimetry's decimals: swapped back, the point comes back whole.
-        if (!m_options.keepZ) written.setZ(RoundToDecimals(y, CPointGen::DeciXY()));
-    }
-    m_changes.push_back({index, std::move(before), m_carnet->copyElement(index)});
+    if (!written.setPt(x, m_options.swapYZ ? written.z() : y)) return false;
+    // Y' goes into Z with the planimetry's decimals: swapped back, the point comes back whole.
+    if (m_options.swapYZ && !m_options.keepZ) written.setZ(RoundToDecimals(y, CPointGen::DeciXY()));
+    m_changes.push_back(std::move(change));
     return true;
 }
 
@@ -243,10 +240,13 @@ bool CChange_Rep::TurnStation(int index) {
     const double v0 =
         WrapGrads(RoundToDecimals(TurnedV0(station.v0(), m_change.rotation), CStation::DeciAng()));
     if (!std::isfinite(v0)) return false;
-    std::unique_ptr<CElement> before = m_carnet->copyElement(index);
+    m_changes.push_back({index, m_carnet->copyElement(index)});
     station.setV0(v0);
-    m_changes.push_back({index, std::move(before), m_carnet->copyElement(index)});
     return true;
+}
+
+bool ElementChange::Exchange(CCarnet& carnet) {
+    return carnet.ExchangeAt(index, other);
 }
 
 } // namespace pyr

@@ -89,11 +89,17 @@ enum ChangeRepSwitchIndex : std::size_t {
     kSwitchKeepZ,
 };
 
-// An element the change rewrote: its index and its copies before and after, for the editor's undo.
+// An element the change rewrote, for the editor's undo: its index and a copy of the state that is not in
+// the GéoBase, the store holding the other. Once the change is made, the copy is the element before it;
+// Exchange puts it back and keeps the element after the change instead, and exchanging again redoes the
+// change. Both states are kept for one copy.
 struct ElementChange {
     int index;
-    std::unique_ptr<CElement> before;
-    std::unique_ptr<CElement> after;
+    std::unique_ptr<CElement> other;
+
+    // Undoes or redoes the change: false, and nothing changed, when the GéoBase no longer holds an element
+    // of that kind at that index.
+    bool Exchange(CCarnet& carnet);
 };
 
 // The dialog "Changement de repère", opened by the GéoBase editor on the GéoBase it holds: the two common

@@ -138,7 +138,10 @@ ui::DialogResult CGeoEditor::ReadFieldBook(const Reading& reading, CPyrTxtWnd& t
     const ui::DialogResult read = RunConversion(converter, target);
     if (read != ui::DialogResult::Ok) return read;
 
-    if (target == &fresh) m_carnet = std::move(fresh);
+    if (target == &fresh) {
+        m_carnet = std::move(fresh);
+        m_tracked.clear();
+    }
     Notify(kPartGeoBase);
     const std::string path = m_carnet.PathName();
     if (!m_carnet.BackUp(&frontEnd) || !m_carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
@@ -191,9 +194,13 @@ ui::DialogResult CGeoEditor::ChangeFrame(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd
         txt.Print("%s", msg::kNoChange);
         return shown;
     }
-    for (ElementChange& element : change.Changes())
-        m_tracked.push_back(std::move(element));
-    change.Changes().clear();
+    std::vector<ElementChange>& changes = change.Changes();
+    if (m_tracked.empty())
+        m_tracked.swap(changes);
+    else
+        m_tracked.insert(m_tracked.end(), std::make_move_iterator(changes.begin()),
+                         std::make_move_iterator(changes.end()));
+    changes.clear();
     Notify(kPartGeoBase);
     const std::string path = m_carnet.PathName();
     if (!m_carnet.BackUp(&frontEnd) || !m_carnet.Save(path, &frontEnd)) return ui::DialogResult::Failed;
@@ -223,6 +230,7 @@ bool CGeoEditor::Load(const std::string& path, CPyrTxtWnd& txt, ui::FrontEnd& fr
     // The next command opens the last GéoBase: never a file that is not one.
     if (!carnet.LoadedFileIsForeign()) WriteLastGeoBase(Inputs().paramPath, WholePath(path));
     m_carnet = std::move(carnet);
+    m_tracked.clear();
     Notify(kPartGeoBase);
     return true;
 }
@@ -241,6 +249,7 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
     CPyrTxtWnd txt(frontEnd);
     if (m_reading && !FileExists(*path)) {
         m_carnet = CCarnet(); // a new GéoBase, made by the reading, recorded once it is saved
+        m_tracked.clear();
         m_carnet.SetPathName(*path);
     } else if (!Load(*path, txt, frontEnd)) {
         return ui::DialogResult::Failed;

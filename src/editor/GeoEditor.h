@@ -44,8 +44,8 @@ public:
     // "Changement de &repère...": the change of frame's dialog run by the front end on the open GéoBase,
     // saved when it changed it. Failed when it was refused or could not be saved.
     ui::DialogResult ChangeFrame(ui::FrontEnd& frontEnd);
-    // The elements the changes of frame rewrote, with their copies before and after, oldest first: what
-    // the editor's undo takes back.
+    // The elements the changes of frame rewrote, oldest first, each with a copy of its state that the
+    // GéoBase does not hold (ElementChange): what the editor's undo takes back, one exchange each.
     const std::vector<ElementChange>& TrackedChanges() const { return m_tracked; }
     // "&Lecture": a field book of that format read into the open GéoBase through the reading dialog, run
     // by the front end (or, when the person wants a new GéoBase, into one named after the field book),
@@ -78,8 +78,8 @@ private:
     bool m_reduce = false;
     CReductionDriver m_reduction; // its options are declared among the editor's
     bool m_changeFrame = false;
-    CChangeRepDriver m_frameChange; // its options too
-    std::vector<ElementChange> m_tracked;
+    CChangeRepDriver m_frameChange;       // its options too
+    std::vector<ElementChange> m_tracked; // on the GéoBase open: forgotten when another one is opened
     std::optional<Reading> m_reading;
     ReadingRequests m_readingRequests;
 };

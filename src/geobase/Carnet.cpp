@@ -164,6 +164,16 @@ std::unique_ptr<CElement> CCarnet::copyElement(int index, int kind) const {
     return nullptr;
 }
 
+bool CCarnet::ExchangeAt(int index, std::unique_ptr<CElement>& element) {
+    if (!element || !ElementFitsKind(*element, GetType(index))) return false;
+    std::unique_ptr<CElement>& slot = m_elements[static_cast<size_t>(index)];
+    slot->m_inStore = false;
+    element->m_inStore = true;
+    slot.swap(element);
+    Changed(); // the index views the identifiers in the elements
+    return true;
+}
+
 // ---------------------------------------------------------------- accessors by index
 // The kind array tells the class of each element: Add refuses an element that does not fit its kind.
 

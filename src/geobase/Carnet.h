@@ -65,6 +65,10 @@ public:
     // A new copy of the element at that index, owned by the caller; with a kind (1002 or 1003, 1004 or
     // 1005), the copy is of that kind's class. Null outside the store.
     std::unique_ptr<CElement> copyElement(int index, int kind = -1) const;
+    // Puts `element` in the place of the element at that index, under the same kind, and hands the one that
+    // was there back in `element`: an element's two states exchanged without a copy. False, and nothing
+    // changed, outside the store or when the element cannot stand under that kind.
+    bool ExchangeAt(int index, std::unique_ptr<CElement>& element);
 
     // ---- Accessors by index: the value when the element there has it, else kUndefined (or "")
     std::string matAt(int index) const;

@@ -8,11 +8,14 @@
 #include "core/Angles.h"
 #include "geobase/Carnet.h"
 #include "geobase/GeoBaseMessages.h"
+#include "geobase/GeoFile.h"
 #include "settings/ParamStore.h"
 #include "ui/ScriptedFrontEnd.h"
 
 #include <cmath>
 #include <gtest/gtest.h>
+#include <string>
+#include <vector>
 
 namespace pyr {
 namespace {
@@ -114,6 +117,13 @@ protected:
         EXPECT_NEAR(geo.zAt(i), z, kTenthMm);
     }
     std::string LastMessage() const { return frontEnd.messages.empty() ? "" : frontEnd.messages.back().text; }
+    // The GéoBase as its file holds it: every element's every field, to the last digit written.
+    std::string GeoBaseText() const {
+        std::string text;
+        for (int i = 0; i < geo.GetSize(); ++i)
+            text += ElementLine(*geo.GetAt(i), geo.GetType(i)) + '\n';
+        return text;
+    }
 
     TempDir dir;
     CCarnet geo;
@@ -164,12 +174,36 @@ TEST_F(ChangeRep, AQuarterTurnMovesPointsAndTurnsOnlyKnownV0) {
     EXPECT_EQ(geo.v0At(1), kUndefined);
     EXPECT_EQ(dialog.StationsTurned(), 1);
 
-    // What the editor's undo gets: each element before and after.
+    // What the editor's undo gets: each element as it was before, in GéoBase order.
     ASSERT_EQ(dialog.Changes().size(), 4u);
     const ElementChange& first = dialog.Changes()[1];
     EXPECT_EQ(first.index, geo.findMat("P1"));
-    EXPECT_EQ(static_cast<const CPointGen&>(*first.before).x(), 10.0);
-    EXPECT_NEAR(static_cast<const CPointGen&>(*first.after).x(), -20.0, kTenthMm);
+    EXPECT_EQ(static_cast<const CPointGen&>(*first.other).x(), 10.0);
+}
+
+TEST_F(ChangeRep, ExchangingEachChangeUndoesItExactlyAndExchangingAgainRedoesIt) {
+    // A general turn, so that the coordinates written are rounded, with the V0 turned as well.
+    Frames({0, 0, 30, 40}, {1000, 2000, 1040.1, 2029.9});
+    dialog.Options().modifyV0 = true;
+    const std::string before = GeoBaseText();
+    ASSERT_TRUE(dialog.OnOK(frontEnd));
+    const std::string after = GeoBaseText();
+    ASSERT_NE(after, before);
+    ASSERT_EQ(dialog.Changes().size(), 4u); // S1 and the three points that are not fixed
+
+    std::vector<ElementChange>& changes = dialog.Changes();
+    for (auto change = changes.rbegin(); change != changes.rend(); ++change)
+        ASSERT_TRUE(change->Exchange(geo));
+    EXPECT_EQ(GeoBaseText(), before);
+    for (ElementChange& change : changes)
+        ASSERT_TRUE(change.Exchange(geo));
+    EXPECT_EQ(GeoBaseText(), after);
+
+    // A record put on another kind of element is refused and leaves both as they are.
+    ElementChange misplaced{geo.findMat("P1"), std::move(changes[0].other)};
+    EXPECT_FALSE(misplaced.Exchange(geo));
+    EXPECT_EQ(GeoBaseText(), after);
+    EXPECT_EQ(misplaced.other->mat(), "S1");
 }
 
 TEST_F(ChangeRep, DistancesThatDifferAreShownAndTheChangeIsMadeWithoutScale) {

@@ -62,8 +62,13 @@ TEST_F(ChangeRepCommand, PointsAndV0AreChangedSavedWithABackupAndTrackedForUndo)
     EXPECT_EQ(ReadBytes(dir / "a.bak"), kJob);
     EXPECT_NE(frontEnd.AllLines().find("GéoBase enregistrée dans <" + dir / "a.geo" + ">."),
               std::string::npos);
-    ASSERT_EQ(editor.TrackedChanges().size(), 3u);
-    EXPECT_EQ(editor.TrackedChanges()[0].index, 0);
+    // Tracked for the undo: each element changed, with the state before that the GéoBase no longer holds.
+    const std::vector<pyr::ElementChange>& tracked = editor.TrackedChanges();
+    ASSERT_EQ(tracked.size(), 3u);
+    EXPECT_EQ(tracked[0].index, 0);
+    EXPECT_EQ(static_cast<const pyr::CStation&>(*tracked[0].other).v0(), 50.0);
+    EXPECT_EQ(tracked[2].index, 3);
+    EXPECT_EQ(static_cast<const pyr::CPointGen&>(*tracked[2].other).x(), -35.5);
 }
 
 TEST_F(ChangeRepCommand, ARefusedRequestFailsAndLeavesTheFileAsItWas) {
@@ -101,12 +106,15 @@ TEST_F(ChangeRepCommand, ASelectionChangesOnlyItsPointsAndNothingSelectedIsNotSa
     const pyr::CCarnet saved = Saved();
     EXPECT_EQ(saved.xAt(2), 10.0);
     EXPECT_NEAR(saved.xAt(3), -4.25, 1e-4);
+    EXPECT_EQ(editor.TrackedChanges().size(), 1u);
 
     const std::string before = ReadBytes(dir / "a.geo");
     arguments.back() = "Z1-Z9";
     ASSERT_EQ(Run(arguments), DialogResult::Ok);
     EXPECT_EQ(LastMessage(), pyr::msg::kNoChange);
     EXPECT_EQ(ReadBytes(dir / "a.geo"), before);
+    // The GéoBase opened again: the change made on the former copy is no longer the undo's to take back.
+    EXPECT_TRUE(editor.TrackedChanges().empty());
 }
 
 // The change saves only once the former GéoBase is backed up: a backup that fails stops it.

@@ -155,6 +155,35 @@ TEST(Store, TheIndexFollowsAppendsRemovalsAndRenaming) {
     EXPECT_EQ(c.matAt(1), "A1");
 }
 
+TEST(Store, AnElementIsExchangedInPlaceUnderItsOwnKindWithoutACopy) {
+    CCarnet c = SmallJob();
+    EXPECT_EQ(c.findMat("A1"), 2); // builds the index
+    std::unique_ptr<CElement> element = std::make_unique<CPointGen>("A2", 5.0, 6.0);
+    const CElement* given = element.get();
+    const CElement* held = c.GetAt(2);
+    ASSERT_TRUE(c.ExchangeAt(2, element));
+    EXPECT_EQ(c.GetAt(2), given);
+    EXPECT_EQ(element.get(), held); // handed back as it was
+    EXPECT_EQ(c.xAt(2), 5.0);
+    EXPECT_EQ(c.findMat("A2"), 2);
+    EXPECT_EQ(c.findMat("A1"), -1);
+    // The element put in is the store's: renamed through a pointer, the index follows.
+    c.GetAt(2)->setMat("A4");
+    EXPECT_EQ(c.findMat("A4"), 2);
+
+    // Refused, and nothing exchanged: another kind's class, an index outside the store, no element.
+    std::unique_ptr<CElement> station = std::make_unique<CStation>("S9", 1.5);
+    EXPECT_FALSE(c.ExchangeAt(2, station));
+    EXPECT_FALSE(c.ExchangeAt(c.GetSize(), element));
+    EXPECT_FALSE(c.ExchangeAt(-1, element));
+    std::unique_ptr<CElement> none;
+    EXPECT_FALSE(c.ExchangeAt(2, none));
+    EXPECT_EQ(station->mat(), "S9");
+    EXPECT_EQ(element.get(), held);
+    EXPECT_EQ(c.GetAt(2), given);
+    ExpectInStep(c);
+}
+
 TEST(Store, WhetherAStationIsThereFollowsEveryChange) {
     CCarnet c;
     c.Add(std::make_unique<CPointGen>("A1", 1.0, 2.0), kKindPoint);
