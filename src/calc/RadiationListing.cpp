@@ -56,32 +56,32 @@ std::vector<std::size_t> ColumnRanks(const std::vector<std::string>& columns) {
     return ranks;
 }
 
-// The text of the column of that rank in kColumns.
-std::string Cell(const CDlgCfgListing& listing, const RadiatedSighting& s, std::size_t rank) {
+// The text of the column of that rank in kColumns, into the table.
+void AddCell(ListingTable& table, const CDlgCfgListing& listing, const RadiatedSighting& s, std::size_t rank) {
     const bool swap = CPointGen::SwapXY();
     switch (rank) {
     case 0:
-        return std::string(s.mat);
+        return table.Add(s.mat);
     case 1:
-        return listing.FormatCoor(swap ? s.y : s.x);
+        return table.Add(listing.FormatCoor(swap ? s.y : s.x));
     case 2:
-        return listing.FormatCoor(swap ? s.x : s.y);
+        return table.Add(listing.FormatCoor(swap ? s.x : s.y));
     case 3:
-        return listing.FormatAlti(s.z);
+        return table.Add(listing.FormatAlti(s.z));
     case 4:
-        return listing.FormatAngl(s.bearing, -1, true);
+        return table.Add(listing.FormatAngl(s.bearing, -1, true));
     case 5:
-        return listing.FormatDist(s.dh);
+        return table.Add(listing.FormatDist(s.dh));
     case 6:
-        return listing.FormatAlti(s.hp);
+        return table.Add(listing.FormatAlti(s.hp));
     case 7:
-        return listing.FormatAngl(s.ah, -1, true);
+        return table.Add(listing.FormatAngl(s.ah, -1, true));
     case 8:
-        return listing.FormatAngl(s.av);
+        return table.Add(listing.FormatAngl(s.av));
     case 9:
-        return listing.FormatDist(s.di);
+        return table.Add(listing.FormatDist(s.di));
     default:
-        return std::string(s.code);
+        return table.Add(s.code);
     }
 }
 
@@ -108,14 +108,11 @@ void WritePoints(CDlgCfgListing& listing, const RadiatedStation& result,
     if (result.points.empty()) return;
     const std::vector<std::size_t> ranks = ColumnRanks(columns);
     table.Clear(columns.size());
-    std::string* titles = table.AddRow();
-    for (std::size_t c = 0; c < columns.size(); ++c)
-        titles[c] = Title(columns[c]);
-    for (const RadiatedSighting& point : result.points) {
-        std::string* row = table.AddRow();
-        for (std::size_t c = 0; c < ranks.size(); ++c)
-            row[c] = Cell(listing, point, ranks[c]);
-    }
+    for (const std::string& column : columns)
+        table.Add(Title(column));
+    for (const RadiatedSighting& point : result.points)
+        for (std::size_t rank : ranks)
+            AddCell(table, listing, point, rank);
     listing.rtfWriteTabTitle(rayon::kListPointsTitle);
     // The identifier and the code are texts; the others numbers.
     const bool nameFirst = !columns.empty() && (columns.front() == "N" || columns.front() == "CS");
@@ -126,15 +123,14 @@ void WritePoints(CDlgCfgListing& listing, const RadiatedStation& result,
 void WriteChecks(CDlgCfgListing& listing, const RadiatedStation& result, ListingTable& table) {
     if (result.checks.empty()) return;
     table.Clear(std::size(rayon::kListCheckColumns));
-    std::copy(std::begin(rayon::kListCheckColumns), std::end(rayon::kListCheckColumns), table.AddRow());
+    table.AddRow(rayon::kListCheckColumns);
     for (const RadiationCheck& check : result.checks) {
-        std::string* row = table.AddRow();
-        row[0] = check.sighting.mat;
-        row[1] = listing.FormatAngl(check.sighting.bearing, -1, true);
-        row[2] = listing.FormatDist(check.sighting.dh);
-        row[3] = listing.FormatDeni(check.along);
-        row[4] = listing.FormatDeni(check.across);
-        row[5] = listing.FormatDeni(check.dz);
+        table.Add(check.sighting.mat);
+        table.Add(listing.FormatAngl(check.sighting.bearing, -1, true));
+        table.Add(listing.FormatDist(check.sighting.dh));
+        table.Add(listing.FormatDeni(check.along));
+        table.Add(listing.FormatDeni(check.across));
+        table.Add(listing.FormatDeni(check.dz));
     }
     listing.rtfWriteTabTitle(rayon::kListChecksTitle);
     DrawTable(listing, table, true, 1);
@@ -152,6 +148,9 @@ void WriteSkipped(CDlgCfgListing& listing, const RadiatedStation& result) {
 
 void WriteMultiple(CDlgCfgListing& listing, const RadiationReport& report, ListingTable& table) {
     const bool swap = CPointGen::SwapXY();
+    std::array<std::string_view, std::size(rayon::kListMultipleColumns)> titles;
+    std::copy(std::begin(rayon::kListMultipleColumns), std::end(rayon::kListMultipleColumns), titles.begin());
+    if (swap) std::swap(titles[2], titles[3]);
     // A station names the determinations of many points: its designation is formed once.
     std::vector<std::string> designations(report.stations.size());
     auto designation = [&](std::uint32_t rank) -> const std::string& {
@@ -162,16 +161,13 @@ void WriteMultiple(CDlgCfgListing& listing, const RadiationReport& report, Listi
     for (const RadiatedPoint& point : report.points) {
         if (point.determinations.size() < 2) continue;
         table.Clear(std::size(rayon::kListMultipleColumns));
-        std::string* titles = table.AddRow();
-        std::copy(std::begin(rayon::kListMultipleColumns), std::end(rayon::kListMultipleColumns), titles);
-        if (swap) std::swap(titles[2], titles[3]);
+        table.AddRow(titles);
         auto addRow = [&](std::string_view name, double x, double y, double z) {
-            std::string* row = table.AddRow();
-            row[0] = point.mat;
-            row[1] = name;
-            row[2] = listing.FormatCoor(swap ? y : x);
-            row[3] = listing.FormatCoor(swap ? x : y);
-            row[4] = listing.FormatAlti(z);
+            table.Add(point.mat);
+            table.Add(name);
+            table.Add(listing.FormatCoor(swap ? y : x));
+            table.Add(listing.FormatCoor(swap ? x : y));
+            table.Add(listing.FormatAlti(z));
         };
         for (const Determination& d : point.determinations) {
             const RadiatedSighting& s = report.stations[d.station].points[d.point];

@@ -1,5 +1,6 @@
 #include "TextEncoding.h"
 
+#include <bit>
 #include <cstdint>
 #include <cstring>
 
@@ -98,9 +99,16 @@ std::string FileBytesToUtf8(std::string_view bytes, bool* wasWindows1252) {
 }
 
 std::size_t Utf8Length(std::string_view text) {
-    std::size_t length = 0;
-    for (char c : text)
-        if ((static_cast<std::uint8_t>(c) & 0xC0) != 0x80) ++length;
+    // Every byte but the continuation bytes (10xxxxxx) starts a character; counted eight at a time, since
+    // a listing measures millions of texts.
+    std::size_t length = text.size(), i = 0;
+    for (; i + 8 <= text.size(); i += 8) {
+        std::uint64_t bytes = 0;
+        std::memcpy(&bytes, text.data() + i, 8);
+        length -= static_cast<std::size_t>(std::popcount(bytes & ~(bytes << 1) & 0x8080808080808080u));
+    }
+    for (; i < text.size(); ++i)
+        if ((static_cast<std::uint8_t>(text[i]) & 0xC0) == 0x80) --length;
     return length;
 }
 

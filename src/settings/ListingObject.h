@@ -188,6 +188,9 @@ public:
     // `aligns` have one item per text. Returns the lines written.
     int WritePlainTableRow(std::span<const std::string_view> texts, std::span<const int> widths,
                            std::span<const RtfAlign> aligns);
+    // The same when the texts' lengths in characters are known already.
+    int WritePlainTableRow(std::span<const std::string_view> texts, std::span<const std::size_t> lengths,
+                           std::span<const int> widths, std::span<const RtfAlign> aligns);
 
 private:
     struct Sep {
@@ -204,7 +207,8 @@ private:
     template <class Apply>
     void ForCells(int row, int col, Apply apply);
     void AppendPlainTableRow(std::string& line, std::span<const std::string_view> texts,
-                             std::span<const int> widths, std::span<const RtfAlign> aligns) const;
+                             std::span<const std::size_t> lengths, std::span<const int> widths,
+                             std::span<const RtfAlign> aligns) const;
 
     ui::FrontEnd& m_frontEnd;
     int m_format = kDefaultListingFormat;
@@ -229,6 +233,7 @@ private:
     int m_lineCount = 0;
     std::string m_pending; // the line being written
     std::string m_row;     // a table's row in plain text, kept to be filled again
+    std::vector<std::size_t> m_lengths; // of its texts, in characters
     bool m_lineOpen = false;
 
     Sep m_sep[3] = {{-1, '='}, {-1, '-'}, {-1, '*'}};

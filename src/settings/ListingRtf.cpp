@@ -192,12 +192,12 @@ void CDlgCfgListing::rtfOffsetLeft(int characters) {
 
 // A row of a table in plain text: "| cell | cell |", each cell padded to its column's width.
 void CDlgCfgListing::AppendPlainTableRow(std::string& line, std::span<const std::string_view> texts,
-                                         std::span<const int> widths,
+                                         std::span<const std::size_t> lengths, std::span<const int> widths,
                                          std::span<const RtfAlign> aligns) const {
     line.append(static_cast<std::size_t>(m_offsetLeft), ' ');
     line += '|';
     for (std::size_t c = 0; c < texts.size(); ++c) {
-        const int blanks = std::max(0, widths[c] - static_cast<int>(Utf8Length(texts[c])));
+        const int blanks = std::max(0, widths[c] - static_cast<int>(lengths[c]));
         const int before = aligns[c] == RtfAlign::Right    ? blanks
                            : aligns[c] == RtfAlign::Center ? blanks / 2
                                                            : 0;
@@ -211,27 +211,36 @@ void CDlgCfgListing::AppendPlainTableRow(std::string& line, std::span<const std:
 
 int CDlgCfgListing::WritePlainTableRow(std::span<const std::string_view> texts, std::span<const int> widths,
                                        std::span<const RtfAlign> aligns) {
+    m_lengths.resize(texts.size());
+    for (std::size_t c = 0; c < texts.size(); ++c)
+        m_lengths[c] = Utf8Length(texts[c]);
+    return WritePlainTableRow(texts, m_lengths, widths, aligns);
+}
+
+int CDlgCfgListing::WritePlainTableRow(std::span<const std::string_view> texts,
+                                       std::span<const std::size_t> lengths, std::span<const int> widths,
+                                       std::span<const RtfAlign> aligns) {
     if (m_lineOpen) EndLine();
     const bool oneLine = std::none_of(texts.begin(), texts.end(), [](std::string_view text) {
         return text.find('\n') != std::string_view::npos;
     });
     if (!oneLine) {
         m_row.clear();
-        AppendPlainTableRow(m_row, texts, widths, aligns);
+        AppendPlainTableRow(m_row, texts, lengths, widths, aligns);
         m_row += '\n';
         return Emit(m_row);
     }
     BreakPageIfFull();
     if (m_output == ListingOutput::File && m_writer && !m_echo) {
         // Formed straight into what goes to the file.
-        AppendPlainTableRow(m_buffer, texts, widths, aligns);
+        AppendPlainTableRow(m_buffer, texts, lengths, widths, aligns);
         m_buffer += '\n';
         ++m_lineCount;
         if (m_buffer.size() >= kBufferBytes) Flush();
         return 1;
     }
     m_lineOpen = true;
-    AppendPlainTableRow(m_pending, texts, widths, aligns);
+    AppendPlainTableRow(m_pending, texts, lengths, widths, aligns);
     EndLine();
     return 1;
 }

@@ -31,6 +31,10 @@ TEST(TextEncoding, Utf8IsKeptAndItsByteOrderMarkDropped) {
 
 TEST(TextEncoding, PaddingCountsCharactersNotBytes) {
     EXPECT_EQ(Utf8Length("Référence"), 9u);
+    // Counted eight bytes at a time: characters of every length across the edges of the words.
+    EXPECT_EQ(Utf8Length("Point levé près de l'église, côté nord \xF0\x9F\x93\x90 ÀÉÈ"), 44u);
+    EXPECT_EQ(Utf8Length("1234567é"), 8u);
+    EXPECT_EQ(Utf8Length(""), 0u);
     EXPECT_EQ(PadRight("Référence", 12), "Référence   ");
     EXPECT_EQ(PadRight("Station", 3), "Station");
 }
