@@ -13,12 +13,20 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
+#include <algorithm>
+#include <exception>
 #include <optional>
+#include <thread>
 
 namespace pyr {
 
 CCalcRayon::CCalcRayon()
-    : m_session({rayon::kJournal, session::kQuestionInvariantXY, session::kQuestionInvariantZ}) {}
+    : m_session({rayon::kJournal, session::kQuestionInvariantXY, session::kQuestionInvariantZ}) {
+    const unsigned workers = std::clamp(std::thread::hardware_concurrency(), 1u, kMostWorkers);
+    for (unsigned w = 0; w < workers; ++w)
+        m_memory.push_back(
+            std::make_unique<std::pmr::monotonic_buffer_resource>(kFirstBlockBytes, LargeBlocks()));
+}
 CCalcRayon::~CCalcRayon() = default;
 
 std::string CCalcRayon::Caption() const {
@@ -74,7 +82,8 @@ bool CCalcRayon::Open(ui::FrontEnd& frontEnd) {
     // The results of another opening view the elements of the GéoBase then open.
     m_results.clear();
     m_newPoints.clear();
-    m_memory.release();
+    for (auto& memory : m_memory)
+        memory->release();
     m_stationIndex.clear();
     m_stations.clear();
     const CCarnet& carnet = m_session.Carnet();
@@ -188,6 +197,35 @@ void CCalcRayon::Show(const RadiatedStation& result) {
         txt.Print(rayon::kLineSkipped, std::string(skipped.mat).c_str(), skipped.reason.c_str());
 }
 
+// Computed again into the results of the last run, which keep their room.
+void CCalcRayon::RadiateChosen(const std::vector<int>& chosen, const CSelection* points) {
+    const std::size_t workers = chosen.size() < kStationsForWorkers ? 1 : m_memory.size();
+    if (m_results.size() > chosen.size())
+        m_results.erase(m_results.begin() + static_cast<std::ptrdiff_t>(chosen.size()), m_results.end());
+    while (m_results.size() < chosen.size())
+        m_results.emplace_back(m_memory[m_results.size() % m_memory.size()].get());
+    const CCarnet& carnet = m_session.Carnet();
+    // The GéoBase's index built once before the workers share it: from here on they only read it.
+    carnet.NameCount();
+    std::vector<std::exception_ptr> failures(workers);
+    auto radiate = [&](std::size_t worker) {
+        try {
+            for (std::size_t k = worker; k < chosen.size(); k += workers)
+                RadiateStation(carnet, chosen[k], m_settings, points, m_results[k]);
+        } catch (...) {
+            failures[worker] = std::current_exception();
+        }
+    };
+    {
+        std::vector<std::jthread> threads;
+        for (std::size_t w = 1; w < workers; ++w)
+            threads.emplace_back(radiate, w);
+        radiate(0);
+    }
+    for (const std::exception_ptr& failure : failures)
+        if (failure) std::rethrow_exception(failure);
+}
+
 bool CCalcRayon::Calculate() {
     if (!m_frontEnd || !m_session.IsOpen()) return false;
     m_notUsed = m_outOfTolerance = 0;
@@ -195,16 +233,9 @@ bool CCalcRayon::Calculate() {
     std::optional<CSelection> points;
     if (!m_points.empty()) points = CSelection::Parse(m_points);
 
-    // Computed again into the results of the last run, which keep their room.
-    const std::vector<int> chosen = ChosenStations();
-    if (m_results.size() > chosen.size())
-        m_results.erase(m_results.begin() + static_cast<std::ptrdiff_t>(chosen.size()), m_results.end());
-    while (m_results.size() < chosen.size())
-        m_results.emplace_back(&m_memory);
+    RadiateChosen(ChosenStations(), points ? &*points : nullptr);
     int used = 0;
-    for (std::size_t k = 0; k < chosen.size(); ++k) {
-        RadiatedStation& result = m_results[k];
-        RadiateStation(m_session.Carnet(), chosen[k], m_settings, points ? &*points : nullptr, result);
+    for (const RadiatedStation& result : m_results) {
         Show(result);
         if (result.usable)
             ++used;

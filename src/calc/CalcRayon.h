@@ -6,6 +6,7 @@
 #include "core/LargeBlocks.h"
 #include "ui/DialogModel.h"
 
+#include <memory>
 #include <memory_resource>
 #include <string>
 #include <string_view>
@@ -80,6 +81,11 @@ public:
 
 private:
     static constexpr std::size_t kFirstBlockBytes = 4 * kHugePageBytes;
+    static constexpr unsigned kMostWorkers = 8;
+    // Below that many stations, a single worker: a thread costs more than it saves.
+    static constexpr std::size_t kStationsForWorkers = 64;
+
+    void RadiateChosen(const std::vector<int>& chosen, const CSelection* points);
 
     void LoadSettings();
     void ReadOptions();
@@ -101,9 +107,10 @@ private:
     std::string m_list;
     std::string m_points;
 
-    // The sightings of the stations radiated, for as long as the GéoBase stays open: a job's results are
-    // taken together, and kept for the next run.
-    std::pmr::monotonic_buffer_resource m_memory{kFirstBlockBytes, LargeBlocks()};
+    // The stations are radiated on every core, the station of rank k by worker k modulo their number.
+    // Each worker takes its stations' sightings from its own memory, kept for as long as the GéoBase stays
+    // open: a job's results are taken together, and kept for the next run.
+    std::vector<std::unique_ptr<std::pmr::monotonic_buffer_resource>> m_memory;
     std::vector<RadiatedStation> m_results;
     RadiatedPoints m_newPoints{LargeBlocks()};
     int m_notUsed = 0;

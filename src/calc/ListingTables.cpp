@@ -97,7 +97,7 @@ void DrawFrame(CDlgCfgListing& listing, const ListingRow& lines, bool bold) {
 }
 
 void Blank(CDlgCfgListing& listing) {
-    listing.WriteLine("\n");
+    listing.WriteText("\n");
 }
 
 } // namespace pyr

@@ -57,7 +57,8 @@ std::vector<std::size_t> ColumnRanks(const std::vector<std::string>& columns) {
 }
 
 // The text of the column of that rank in kColumns, into the table.
-void AddCell(ListingTable& table, const CDlgCfgListing& listing, const RadiatedSighting& s, std::size_t rank) {
+void AddCell(ListingTable& table, const CDlgCfgListing& listing, const RadiatedSighting& s,
+             std::size_t rank) {
     const bool swap = CPointGen::SwapXY();
     switch (rank) {
     case 0:
@@ -92,14 +93,14 @@ void WriteStationHeading(CDlgCfgListing& listing, const RadiatedStation& result)
     listing.WriteLine(rayon::kListStationPlace, listing.FormatCoor(swap ? station.y : station.x).c_str(),
                       listing.FormatCoor(swap ? station.x : station.y).c_str(),
                       listing.FormatAlti(station.z).c_str(), listing.FormatAlti(station.hi).c_str());
-    listing.WriteLine("\n");
+    listing.WriteText("\n");
     const std::string v0 = listing.FormatAngl(station.v0, -1, true);
     if (result.v0Computed)
         listing.WriteLine(rayon::kListV0Computed, v0.c_str(), result.v0.used,
                           listing.FormatAngl(result.v0.station.v0, -1, true).c_str());
     else
         listing.WriteLine(rayon::kListV0Own, v0.c_str());
-    listing.WriteLine("\n");
+    listing.WriteText("\n");
     Blank(listing);
 }
 
@@ -141,7 +142,8 @@ void WriteSkipped(CDlgCfgListing& listing, const RadiatedStation& result) {
     if (result.skipped.empty()) return;
     Row lines{rayon::kListSkippedTitle};
     for (const SkippedSighting& skipped : result.skipped)
-        lines.push_back(Sprintf(rayon::kListSkipped, std::string(skipped.mat).c_str(), skipped.reason.c_str()));
+        lines.push_back(
+            Sprintf(rayon::kListSkipped, std::string(skipped.mat).c_str(), skipped.reason.c_str()));
     DrawFrame(listing, lines, false);
     Blank(listing);
 }
@@ -178,7 +180,7 @@ void WriteMultiple(CDlgCfgListing& listing, const RadiationReport& report, Listi
         listing.WriteLine(rayon::kListSpread, listing.FormatDist(point.spreadXY).c_str(),
                           listing.FormatAlti(point.spreadZ).c_str(),
                           point.outOfTolerance ? rayon::kListOutOfTolerance : "");
-        listing.WriteLine("\n");
+        listing.WriteText("\n");
         Blank(listing);
     }
 }
@@ -228,10 +230,10 @@ void WriteRadiationTolerances(CDlgCfgListing& listing, const RadiationSettings& 
     const Tolerances& t = settings.tolerances;
     listing.WriteLine(rayon::kListTolerances, listing.FormatDist(t.customDistance).c_str(),
                       listing.FormatAlti(t.customHeight).c_str());
-    listing.WriteLine("\n");
+    listing.WriteText("\n");
     listing.WriteLine(rayon::kListOptions, settings.replaceZeroTargetHeight ? "oui" : "non",
                       settings.computeV0 ? "oui" : "non", checks ? "oui" : "non");
-    listing.WriteLine("\n");
+    listing.WriteText("\n");
 }
 
 } // namespace pyr

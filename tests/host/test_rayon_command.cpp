@@ -140,6 +140,46 @@ TEST_F(RayonCommand, APointOutOfToleranceIsWrittenOnlyWhenTheSurveyorAgrees) {
     ExpectPoint(Saved(), "P3", Place{kP3.x + 0.025, kP3.y, kP3.z});
 }
 
+// A job of two hundred stations is radiated on every core the machine has: each station's points, some of
+// them seen again from the next station, come out where the test put them, as from one station at a time.
+TEST_F(RayonCommand, AJobOfManyStationsRadiatedOnEveryCoreGivesEveryPointItsPlace) {
+    ComputeV0(false);
+    CCarnet carnet;
+    constexpr int kStations = 200, kPoints = 6;
+    auto stationPlace = [](int s) {
+        return Place{1000.0 + 80.0 * (s % 20), 2000.0 + 80.0 * (s / 20), 100.0 + s % 7};
+    };
+    auto pointPlace = [&](int s, int p) {
+        const Place at = stationPlace(s);
+        return Place{at.x + 7.0 * (p + 1), at.y - 5.0 * p, at.z + 0.3 * p};
+    };
+    for (int s = 0; s < kStations; ++s)
+        AddPoint(carnet, "S" + std::to_string(s), stationPlace(s));
+    for (int s = 0; s < kStations; ++s) {
+        const double v0 = std::fmod(17.3 * s, 400.0);
+        AddStation(carnet, "S" + std::to_string(s), kHi, v0);
+        for (int p = 0; p < kPoints; ++p)
+            AddSighting(carnet, "P" + std::to_string(s) + "_" + std::to_string(p), stationPlace(s), kHi,
+                        pointPlace(s, p), kHp, v0, kKindMesure);
+        if (s > 0) // the first point of the station before, seen again
+            AddSighting(carnet, "P" + std::to_string(s - 1) + "_0", stationPlace(s), kHi,
+                        pointPlace(s - 1, 0), kHp, v0, kKindMesure);
+    }
+    ASSERT_EQ(carnet.Save(dir / "chantier.geo"), 1);
+
+    const Outcome outcome = Run("--type toutes --enregistrer --oui");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(
+        Has(outcome.out, std::to_string(kStations * kPoints) + " point(s) nouveau(x) rayonné(s) depuis 200"))
+        << outcome.out;
+    const CCarnet saved = Saved();
+    for (int s = 0; s < kStations; ++s)
+        for (int p = 0; p < kPoints; ++p) {
+            const std::string name = "P" + std::to_string(s) + "_" + std::to_string(p);
+            ExpectPoint(saved, name.c_str(), pointPlace(s, p));
+        }
+}
+
 TEST_F(RayonCommand, BadRequestsAreRefusedWithAFrenchMessage) {
     for (const auto& [arguments, said] :
          {std::pair{"--station ZZ", "La station <ZZ> n'existe pas"},
