@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/LargeBlocks.h"
 #include "core/Undefined.h"
 #include "geobase/Elements.h"
 #include "geobase/Selection.h"
@@ -8,6 +9,7 @@
 #include <array>
 #include <cstddef>
 #include <memory>
+#include <memory_resource>
 #include <optional>
 #include <span>
 #include <string>
@@ -101,6 +103,9 @@ struct ElementChange {
     // of that kind at that index.
     bool Exchange(CCarnet& carnet);
 };
+// The records of a change, a million for a big job: kept in blocks of huge pages (LargeBlocks()), which the
+// first change of a process maps in a few page faults.
+using ElementChanges = std::pmr::vector<ElementChange>;
 
 // The dialog "Changement de repère", opened by the GéoBase editor on the GéoBase it holds: the two common
 // points in both frames (eight fields), the rotation and the translation computed at every edit, the
@@ -160,7 +165,7 @@ public:
     int StationsTurned() const { return m_stations; }
     bool Changed() const { return m_points > 0 || m_stations > 0; }
     // The elements rewritten by the last OK, in GéoBase order; taken by the editor.
-    std::vector<ElementChange>& Changes() { return m_changes; }
+    ElementChanges& Changes() { return m_changes; }
 
 private:
     std::optional<CommonPoints> Frame(int frame) const;
@@ -186,7 +191,7 @@ private:
 
     int m_points = 0;
     int m_stations = 0;
-    std::vector<ElementChange> m_changes;
+    ElementChanges m_changes{LargeBlocks()};
 };
 
 } // namespace pyr

@@ -194,7 +194,7 @@ ui::DialogResult CGeoEditor::ChangeFrame(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd
         txt.Print("%s", msg::kNoChange);
         return shown;
     }
-    std::vector<ElementChange>& changes = change.Changes();
+    ElementChanges& changes = change.Changes();
     if (m_tracked.empty())
         m_tracked.swap(changes);
     else

@@ -46,7 +46,7 @@ public:
     ui::DialogResult ChangeFrame(ui::FrontEnd& frontEnd);
     // The elements the changes of frame rewrote, oldest first, each with a copy of its state that the
     // GéoBase does not hold (ElementChange): what the editor's undo takes back, one exchange each.
-    const std::vector<ElementChange>& TrackedChanges() const { return m_tracked; }
+    const ElementChanges& TrackedChanges() const { return m_tracked; }
     // "&Lecture": a field book of that format read into the open GéoBase through the reading dialog, run
     // by the front end (or, when the person wants a new GéoBase, into one named after the field book),
     // then saved.
@@ -78,8 +78,8 @@ private:
     bool m_reduce = false;
     CReductionDriver m_reduction; // its options are declared among the editor's
     bool m_changeFrame = false;
-    CChangeRepDriver m_frameChange;       // its options too
-    std::vector<ElementChange> m_tracked; // on the GéoBase open: forgotten when another one is opened
+    CChangeRepDriver m_frameChange;          // its options too
+    ElementChanges m_tracked{LargeBlocks()}; // on the GéoBase open: forgotten when another one is opened
     std::optional<Reading> m_reading;
     ReadingRequests m_readingRequests;
 };

@@ -15,7 +15,6 @@
 #include <cmath>
 #include <gtest/gtest.h>
 #include <string>
-#include <vector>
 
 namespace pyr {
 namespace {
@@ -191,7 +190,7 @@ TEST_F(ChangeRep, ExchangingEachChangeUndoesItExactlyAndExchangingAgainRedoesIt)
     ASSERT_NE(after, before);
     ASSERT_EQ(dialog.Changes().size(), 4u); // S1 and the three points that are not fixed
 
-    std::vector<ElementChange>& changes = dialog.Changes();
+    ElementChanges& changes = dialog.Changes();
     for (auto change = changes.rbegin(); change != changes.rend(); ++change)
         ASSERT_TRUE(change->Exchange(geo));
     EXPECT_EQ(GeoBaseText(), before);

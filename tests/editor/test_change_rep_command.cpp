@@ -63,7 +63,7 @@ TEST_F(ChangeRepCommand, PointsAndV0AreChangedSavedWithABackupAndTrackedForUndo)
     EXPECT_NE(frontEnd.AllLines().find("GéoBase enregistrée dans <" + dir / "a.geo" + ">."),
               std::string::npos);
     // Tracked for the undo: each element changed, with the state before that the GéoBase no longer holds.
-    const std::vector<pyr::ElementChange>& tracked = editor.TrackedChanges();
+    const pyr::ElementChanges& tracked = editor.TrackedChanges();
     ASSERT_EQ(tracked.size(), 3u);
     EXPECT_EQ(tracked[0].index, 0);
     EXPECT_EQ(static_cast<const pyr::CStation&>(*tracked[0].other).v0(), 50.0);
