@@ -139,8 +139,11 @@ void RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSett
         }
 
         if (!IsKnown(s.ah) || !IsKnown(s.dh) || !(s.dh > 0.0)) {
-            result.skipped.push_back(
-                {s.index, s.mat, IsKnown(s.ah) ? rayon::kReasonNoDistance : rayon::kReasonNoDirection});
+            // A measured distance without its zenith angle cannot be brought to the horizontal.
+            const char* reason = !IsKnown(s.ah)                 ? rayon::kReasonNoDirection
+                                 : s.di > 0.0 && !IsKnown(s.av) ? rayon::kReasonNoZenith
+                                                                : rayon::kReasonNoDistance;
+            result.skipped.push_back({s.index, s.mat, reason});
             result.points.pop_back();
             continue;
         }
@@ -246,7 +249,8 @@ void Summarise(RadiatedPoint& point, const std::vector<RadiatedStation>& station
 
 } // namespace
 
-RadiatedPoints MergeDeterminations(const std::vector<RadiatedStation>& stations, const Tolerances& tolerances) {
+RadiatedPoints MergeDeterminations(const std::vector<RadiatedStation>& stations,
+                                   const Tolerances& tolerances) {
     RadiatedPoints merged;
     MergeDeterminations(stations, tolerances, merged);
     return merged;

@@ -268,7 +268,7 @@ TEST(RadiationSightings, SightingsWithoutDistanceOrDirectionAreNamedAndUnknownHe
     ASSERT_EQ(with.skipped.size(), 4u);
     const std::pair<const char*, const char*> expected[] = {{"A", rayon::kReasonNoDistance},
                                                             {"B", rayon::kReasonNoDirection},
-                                                            {"C", rayon::kReasonNoDistance},
+                                                            {"C", rayon::kReasonNoZenith},
                                                             {"E", rayon::kReasonNoDistance}};
     for (std::size_t i = 0; i < 4; ++i) {
         EXPECT_EQ(with.skipped[i].mat, expected[i].first);
