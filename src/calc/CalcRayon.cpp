@@ -74,18 +74,19 @@ void CCalcRayon::ReadOptions() {
 bool CCalcRayon::Open(ui::FrontEnd& frontEnd) {
     m_frontEnd = &frontEnd;
     LoadSettings();
-    if (!m_session.Open(frontEnd, *this)) {
-        m_cancelled = m_session.Cancelled();
-        return false;
-    }
-    ReadOptions();
-    // The results of another opening view the elements of the GéoBase then open.
+    // The results of another opening view the elements of the GéoBase then open, which the opening
+    // replaces, whether it succeeds or not.
     m_results.clear();
     m_newPoints.clear();
     for (auto& memory : m_memory)
         memory->release();
     m_stationIndex.clear();
     m_stations.clear();
+    if (!m_session.Open(frontEnd, *this)) {
+        m_cancelled = m_session.Cancelled();
+        return false;
+    }
+    ReadOptions();
     const CCarnet& carnet = m_session.Carnet();
     for (int i = carnet.Find(kKindStation, ""); i >= 0; i = carnet.Find(kKindStation, "", i + 1)) {
         m_stationIndex.push_back(i);

@@ -138,9 +138,11 @@ void RadiateStation(const CCarnet& carnet, int stationIndex, const RadiationSett
             }
         }
 
-        if (!IsKnown(s.ah) || !IsKnown(s.dh) || !(s.dh > 0.0)) {
-            // A measured distance without its zenith angle cannot be brought to the horizontal.
-            const char* reason = !IsKnown(s.ah)                 ? rayon::kReasonNoDirection
+        if (s.mat.empty() || !IsKnown(s.ah) || !IsKnown(s.dh) || !(s.dh > 0.0)) {
+            // A point without identifier could be neither written nor told from another. A measured
+            // distance without its zenith angle cannot be brought to the horizontal.
+            const char* reason = s.mat.empty()                  ? rayon::kReasonNoName
+                                 : !IsKnown(s.ah)               ? rayon::kReasonNoDirection
                                  : s.di > 0.0 && !IsKnown(s.av) ? rayon::kReasonNoZenith
                                                                 : rayon::kReasonNoDistance;
             result.skipped.push_back({s.index, s.mat, reason});

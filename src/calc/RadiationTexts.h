@@ -34,6 +34,7 @@ inline constexpr const char* kReasonNoReference = "aucune référence valide";
 inline constexpr const char* kReasonNoDistance = "sans distance";
 inline constexpr const char* kReasonNoDirection = "sans angle horizontal";
 inline constexpr const char* kReasonNoZenith = "sans angle vertical";
+inline constexpr const char* kReasonNoName = "sans matricule";
 
 // Lines of the text window.
 inline constexpr const char* kLineStation = "Station %s : %d point(s) rayonné(s), %d contrôle(s)%s";

@@ -165,7 +165,7 @@ std::unique_ptr<CElement> CCarnet::copyElement(int index, int kind) const {
 }
 
 bool CCarnet::ExchangeAt(int index, std::unique_ptr<CElement>& element) {
-    if (!element || !ElementFitsKind(*element, GetType(index))) return false;
+    if (!IsValidIndex(index) || !element || !ElementFitsKind(*element, GetType(index))) return false;
     std::unique_ptr<CElement>& slot = m_elements[static_cast<size_t>(index)];
     slot->m_inStore = false;
     element->m_inStore = true;

@@ -264,13 +264,16 @@ TEST(RadiationSightings, SightingsWithoutDistanceOrDirectionAreNamedAndUnknownHe
     const Reading r = Read(kS1, kHi, kV0, kP[0], kHp);
     geo.Mes("F", kHp, r.ah, r.av, 0.0).Mes("F", kHp, r.ah, r.av, r.di); // measured at the second go
     geo.Mes("G", kUndefined, r.ah, r.av, r.di);
+    // Two sightings without identifier, complete: no point to write, both named once.
+    geo.Mes("", kHp, r.ah, r.av, r.di).Mes("", kHp, r.ah + 10.0, r.av, r.di);
     const RadiatedStation with = RadiateStation(geo, 1, RadiationSettings{});
-    ASSERT_EQ(with.skipped.size(), 4u);
+    ASSERT_EQ(with.skipped.size(), 5u);
     const std::pair<const char*, const char*> expected[] = {{"A", rayon::kReasonNoDistance},
                                                             {"B", rayon::kReasonNoDirection},
                                                             {"C", rayon::kReasonNoZenith},
-                                                            {"E", rayon::kReasonNoDistance}};
-    for (std::size_t i = 0; i < 4; ++i) {
+                                                            {"E", rayon::kReasonNoDistance},
+                                                            {"", rayon::kReasonNoName}};
+    for (std::size_t i = 0; i < 5; ++i) {
         EXPECT_EQ(with.skipped[i].mat, expected[i].first);
         EXPECT_EQ(with.skipped[i].reason, expected[i].second);
     }
