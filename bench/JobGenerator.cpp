@@ -150,6 +150,25 @@ CCarnet MakeJobOfSize(int elementCount) {
     return carnet;
 }
 
+CCarnet MakePointSurvey(int count) {
+    static const char* const codes[] = {"BORNE", "ARBRE", "MUR", "BORDURE", "REGARD", "POTEAU", "FACADE",
+                                        "CANIVEAU", "TN", "AVALOIR", "HAIE", ""};
+    CCarnet carnet;
+    std::uint64_t state = 20261125;
+    const auto uniform = [&state](double low, double high) {
+        state = state * 6364136223846793005ULL + 1442695040888963407ULL;
+        return low + (high - low) * static_cast<double>(state >> 11) / 9007199254740992.0;
+    };
+    for (int i = 1; i <= count; ++i) {
+        const double z = i % 50 == 0 ? kUndefined : std::round(uniform(40, 120) * 1e3) / 1e3;
+        carnet.Add(std::make_unique<CPointGen>(std::to_string(i), std::round(uniform(650000, 660000) * 1e4) / 1e4,
+                                               std::round(uniform(6860000, 6870000) * 1e4) / 1e4, z,
+                                               codes[static_cast<std::size_t>(i) % std::size(codes)]),
+                   kKindPoint);
+    }
+    return carnet;
+}
+
 JobContents Contents(const CCarnet& carnet) {
     JobContents contents;
     std::unordered_map<std::string, int> setUps;

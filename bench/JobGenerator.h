@@ -46,6 +46,10 @@ private:
 CCarnet MakeJob(int stationCount);
 // A job of exactly `elementCount` elements (the last station may be cut short).
 CCarnet MakeJobOfSize(int elementCount);
+// A survey of `count` points, as the exports write them: identifiers "1" to "count", Lambert-93
+// coordinates to the 0.1 mm, altitudes to the millimetre (one point in fifty without), a code among a
+// surveyor's usual ones.
+CCarnet MakePointSurvey(int count);
 
 // What a job holds, gathered once so that look-ups can be timed alone.
 struct JobContents {

@@ -3,6 +3,7 @@
 #include "Strings.h"
 #include "Undefined.h"
 
+#include <algorithm>
 #include <charconv>
 #include <climits>
 #include <cmath>
@@ -50,6 +51,21 @@ std::string FormatFixedShown(double value, int decimals) {
     std::string text = FormatFixed(value, decimals);
     if (text[0] == '-' && text.find_first_not_of("-0.") == std::string::npos) text.erase(0, 1);
     return text;
+}
+
+void AppendFixedShown(std::string& out, double value, int decimals) {
+    if (decimals < 0) decimals = 6;
+    if (decimals > kStackPrecision) {
+        out += FormatFixedShown(value, decimals);
+        return;
+    }
+    char buffer[kStackBuffer];
+    const auto result = std::to_chars(buffer, buffer + sizeof buffer, value, std::chars_format::fixed, decimals);
+    const char* first = buffer;
+    const char* last = result.ptr;
+    if (*first == '-' && std::all_of(first + 1, last, [](char c) { return c == '0' || c == '.'; }))
+        ++first;
+    out.append(first, last);
 }
 
 std::string FormatGeneral(double value) {

@@ -12,6 +12,8 @@ std::string FormatFixed(double value, int decimals);
 // The same for a person to read (a listing, a dialog's field): a value that rounds to zero is written
 // without its minus sign ("0.000", not "-0.000"), a residual of -0.00001 gr being no residual at all.
 std::string FormatFixedShown(double value, int decimals);
+// FormatFixedShown appended to `out`: the form of the numbers that exports write by the million.
+void AppendFixedShown(std::string& out, double value, int decimals);
 
 // The value as printf "%g" gives it in the C locale (six significant digits, trailing zeros dropped).
 std::string FormatGeneral(double value);

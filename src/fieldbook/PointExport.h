@@ -1,0 +1,100 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+// What the export of a GéoBase hands the writer of a file format, and what every writer shares: which
+// points go out, how the file is written, and how a point that the format cannot hold is told.
+namespace pyr {
+
+class CCarnet;
+class CPyrTxtWnd;
+namespace ui {
+class FrontEnd;
+}
+
+// A reference of the editor's selection: a point is referred to by its element index, any other element
+// (station, sighting, reading, command ...) by its index plus kObservationReference.
+inline constexpr int kObservationReference = 10000000;
+
+// The identifier range of an export ("du matricule ... au matricule ..."): the identifiers that have
+// exactly the text prefix of both bounds and a number between theirs, bounds included ("A007" is in "A1"
+// to "A9"). Bounds without a number, or of two prefixes, make no range.
+class IdentifierRange {
+public:
+    // Nothing when the range cannot be made; `why` then receives the French reason.
+    static std::optional<IdentifierRange> Make(std::string_view from, std::string_view to,
+                                               std::string* why = nullptr);
+    bool Contains(std::string_view mat) const;
+
+    const std::string& Prefix() const { return m_prefix; }
+    long long First() const { return m_first; }
+    long long Last() const { return m_last; }
+
+private:
+    std::string m_prefix;
+    long long m_first = 0;
+    long long m_last = 0;
+};
+
+// One export to a file, as the export dialog hands it to the writer of its format.
+struct PointExportJob {
+    const CCarnet* carnet = nullptr;
+    std::string paramFile;                       // the format's settings file; "" for a format without
+    const std::vector<int>* selection = nullptr; // scope "selected": its references; null otherwise
+    std::optional<IdentifierRange> range;        // scope "range"; nothing otherwise
+    std::string path;                            // the file to write
+    bool append = false;                         // mode "a": the file's present contents stay first
+    ui::FrontEnd* parent = nullptr;              // message boxes; null: the application's front end
+    CPyrTxtWnd* txt = nullptr;                   // lines about points left out; may be null
+};
+
+// The points (kind 1006) that the job writes, as element indexes in the GéoBase's order: all of them,
+// those of the selection, or those of the range; none merged, sorted or dropped.
+std::vector<int> ExportedPoints(const PointExportJob& job);
+// For each element of the GéoBase (any kind), whether it is in the job's scope: referred to by the
+// selection (as a point when it is one, else as an observation element) and its identifier in the range.
+std::vector<bool> ElementsInScope(const PointExportJob& job);
+
+// Writes the text of an export to the job's file, whole or not at all: it replaces the file, or with
+// `append` follows its present contents. False when it cannot: the message, naming the file and the
+// reason, is shown on the job's front end, and the file is left as it was.
+bool WriteExportFile(const PointExportJob& job, std::string_view text);
+
+// The front end on which the job's messages are shown.
+ui::FrontEnd& ExportFrontEnd(const PointExportJob& job);
+
+// The settings file of a format, checked before anything is written: false, with the message naming it
+// shown, when it does not exist or cannot be read.
+bool CheckExportSettingsFile(const PointExportJob& job);
+// A value of the settings file that cannot be used: "Fichier de paramètres d'export <%s> :\nvaleur « %s »
+// incorrecte pour %s (valeurs possibles : %s) !" shown on the job's front end.
+void ReportBadExportSetting(const PointExportJob& job, std::string_view key, std::string_view value,
+                            std::string_view allowed);
+
+// The points that a format cannot hold (an identifier longer than its field, a coordinate too large for
+// it): each one said in the text window, "Point <P12> non exporté : <reason>.", and at the end one message
+// box counts them. They are left out, never cut or rounded into something else.
+class ExportRefusals {
+public:
+    explicit ExportRefusals(const PointExportJob& job) : m_job(job) {}
+    void Refuse(std::string_view mat, std::string_view why);
+    int Count() const { return m_count; }
+    // The message box, when points were left out.
+    void Summarise() const;
+
+private:
+    const PointExportJob& m_job;
+    int m_count = 0;
+};
+
+namespace fb {
+// The reasons of ExportRefusals.
+inline constexpr const char* kWhyIdentifierTooLong = "matricule de plus de %d caractères";
+inline constexpr const char* kWhyCoordinateTooLarge = "%s trop grand pour le format (%s)";
+inline constexpr const char* kWhyNoIdentifier = "point sans matricule";
+} // namespace fb
+
+} // namespace pyr
