@@ -18,6 +18,8 @@ public:
     std::string Caption() const override { return m_model.Caption(); }
     ui::DialogModel& Model() override { return m_model; }
     CChange_Rep& FrameChange() { return m_model; }
+    // The selection the command line gave, when it gave one.
+    const std::optional<std::string>& SelectionText() const { return m_selection; }
     const CChange_Rep& FrameChange() const { return m_model; }
 
     void DeclareOptions(ui::DialogOptions& options) override;

@@ -4,6 +4,7 @@
 #include "core/Files.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
+#include "fieldbook/ExportTexts.h"
 #include "fieldbook/FieldBookConverter.h"
 #include "fieldbook/FieldBookTexts.h"
 #include "fieldbook/TableCode.h"
@@ -29,6 +30,7 @@ constexpr const char* kChangeFrameOption = "changement-repere";
 constexpr const char* kGeoBaseHelp = "la GéoBase à éditer (au lieu de la dernière utilisée)";
 constexpr const char* kReadingOption = "lecture";
 constexpr const char* kReadingHelp = "lit un carnet de ce format, l'ajoute à la GéoBase et l'enregistre";
+constexpr const char* kExportOption = "exportation";
 constexpr const char* kReadingDone = "GéoBase <%s> : %d élément(s), dont %d lu(s) dans le carnet.";
 
 // The code table the editor holds for a GéoBase: the one it goes with, else the job's table of the
@@ -94,6 +96,34 @@ void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
             return std::string();
         });
     DeclareReadingOptions(options, m_readingRequests, true, false);
+    options.Switch(kExportOption, exp::kHelpExport, [this] {
+        m_export = true;
+        return std::string();
+    });
+    DeclareExportOptions(options, m_exportRequests, false, true);
+}
+
+ui::DialogResult CGeoEditor::ExportPoints(ui::FrontEnd& frontEnd, bool asWindow) {
+    m_exporter.SetInputs({m_carnet.PathName(), Inputs().paramPath, Inputs().configFolder, exp::kCaption});
+    m_exporter.SetCarnet(&m_carnet);
+    ui::DialogResult result = ui::DialogResult::Failed;
+    if (asWindow) {
+        result = frontEnd.DoModal(m_exporter);
+    } else {
+        // The editor's selection is the one its other actions take.
+        ExportRequests requests = m_exportRequests;
+        if (const std::optional<std::string>& selection = m_frameChange.SelectionText()) {
+            requests.selection = *selection;
+            if (!requests.from) requests.scope = CDlgExportPoints::kSelected;
+        }
+        result = RunExport(m_exporter.Export(), requests, frontEnd, &m_carnet);
+    }
+    m_exporter.SetCarnet(nullptr);
+    return result;
+}
+
+ui::DialogResult CGeoEditor::ExportPoints(ui::FrontEnd& frontEnd) {
+    return ExportPoints(frontEnd, true);
 }
 
 ui::DialogResult CGeoEditor::ReadFieldBook(const Reading& reading, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd,
@@ -258,7 +288,11 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
     if (m_reduce && !ReduceStations(txt, frontEnd, false)) return ui::DialogResult::Failed;
     if (m_changeFrame && ChangeFrame(txt, frontEnd, false) == ui::DialogResult::Failed)
         return ui::DialogResult::Failed;
-    if (m_reading) return ReadFieldBook(*m_reading, txt, frontEnd, false);
+    if (m_reading) {
+        const ui::DialogResult read = ReadFieldBook(*m_reading, txt, frontEnd, false);
+        if (read != ui::DialogResult::Ok || !m_export) return read;
+    }
+    if (m_export) return ExportPoints(frontEnd, false);
     txt.Print(kOpened, path->c_str(), m_carnet.GetSize());
     for (int i = 0; i < m_carnet.GetSize(); ++i)
         txt.PrintText(EditorLine(m_carnet, i));

@@ -2,6 +2,7 @@
 
 #include "calc/ChangeRepDriver.h"
 #include "calc/StationReductionDriver.h"
+#include "fieldbook/ExportCommand.h"
 #include "fieldbook/FieldBookFormats.h"
 #include "fieldbook/LectCarnet.h"
 #include "geobase/Carnet.h"
@@ -22,7 +23,9 @@ class CPyrTxtWnd;
 // it. Its button "Changement de &repère..." (here "--changement-repere" with "--repere1" and "--repere2")
 // moves the points into another frame, and the GéoBase is saved when that changed it. Its menu "&Lecture"
 // (here "--lecture FORMAT CARNET") reads a field book into the open GéoBase, which is then saved; a GéoBase
-// named that does not exist yet is created by the reading. As a window (GeoEditorForm.h), the same actions
+// named that does not exist yet is created by the reading. Its entry "&Exportation de points..." (here
+// "--exportation" with the options of the exports, the selection being the editor's "--selection") writes
+// the open GéoBase, or the elements selected, to a file. As a window (GeoEditorForm.h), the same actions
 // are buttons on the GéoBase open, whose elements are listed.
 class CGeoEditor : public ui::Dialog {
 public:
@@ -51,6 +54,8 @@ public:
     // by the front end (or, when the person wants a new GéoBase, into one named after the field book),
     // then saved.
     ui::DialogResult ReadFieldBook(ui::FrontEnd& frontEnd, FieldBookFormat format);
+    // "&Exportation de points...": the export dialog, run by the front end on the open GéoBase.
+    ui::DialogResult ExportPoints(ui::FrontEnd& frontEnd);
 
 private:
     struct Reading {
@@ -73,6 +78,8 @@ private:
     // the reading dialog its options; a window shows it.
     ui::DialogResult ReadFieldBook(const Reading& reading, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd,
                                    bool asWindow);
+    // The export of the open GéoBase: a command line runs it as its options say; a window shows it.
+    ui::DialogResult ExportPoints(ui::FrontEnd& frontEnd, bool asWindow);
 
     CCarnet m_carnet; // the GéoBase open
     bool m_reduce = false;
@@ -82,6 +89,9 @@ private:
     ElementChanges m_tracked{LargeBlocks()}; // on the GéoBase open: forgotten when another one is opened
     std::optional<Reading> m_reading;
     ReadingRequests m_readingRequests;
+    bool m_export = false;
+    ExportRequests m_exportRequests;
+    CExportCommand m_exporter{std::nullopt};
 };
 
 // The line of the element at `index`: "000001  Station       S1  1.562  -999999".

@@ -41,6 +41,8 @@ std::vector<ui::Control> CGeoEditorForm::Controls() const {
         ui::Ctl(kReduce, ControlKind::Button, "reduction", "Ré&duction des reprises").At(3, 0));
     controls.push_back(
         ui::Ctl(kChangeFrame, ControlKind::Button, "repere", "Changement de &repère...").At(4, 0));
+    controls.push_back(
+        ui::Ctl(kExport, ControlKind::Button, "exportation", "&Exportation de points...").At(4, 1));
     label = ui::Ctl(kFormatLabel, ControlKind::Label, "formatLabel", "F&ormat du carnet :").At(3, 1);
     label.buddy = kFormat;
     controls.push_back(label);
@@ -111,6 +113,9 @@ void CGeoEditorForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event)
     case kChangeFrame:
         m_editor.ChangeFrame(frontEnd);
         Refresh(true); // the points are rewritten in place
+        break;
+    case kExport:
+        m_editor.ExportPoints(frontEnd); // the GéoBase stays as it is
         break;
     case kRead:
         m_editor.ReadFieldBook(frontEnd, FieldBookFormats()[static_cast<std::size_t>(m_format)].format);

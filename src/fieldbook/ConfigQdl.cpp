@@ -10,6 +10,7 @@
 
 #include <cerrno>
 #include <cstdio>
+#include <filesystem>
 
 namespace pyr {
 
@@ -138,43 +139,33 @@ std::string CDlgConfigQdl::Text(const CCarnet& records, QdlExportChoices choices
     return out;
 }
 
+bool CDlgConfigQdl::Export(const PointExportJob& job, QdlExportChoices choices, int* written) {
+    const CCarnet& records = *job.carnet;
+    std::error_code error;
+    const bool fresh = !job.append || std::filesystem::file_size(job.path, error) == 0 || error;
+    const std::vector<bool> inScope = ElementsInScope(job);
+    std::string out;
+    out.reserve(static_cast<std::size_t>(records.GetSize()) * 48);
+    if (fresh) AppendHeader(out);
+    int count = 0;
+    for (int i = 0; i < records.GetSize(); ++i) {
+        const int kind = records.GetType(i);
+        if (!inScope[static_cast<std::size_t>(i)] || !Chosen(kind, choices)) continue;
+        AppendRecord(out, *records.GetAt(i), kind);
+        ++count;
+    }
+    if (written) *written = count;
+    return WriteExportFile(job, out);
+}
+
 bool CDlgConfigQdl::Export(const CCarnet& records, const std::string& path, const char* mode,
                            QdlExportChoices choices, ui::FrontEnd* parent) {
-    std::FILE* file = std::fopen(path.c_str(), mode);
-    bool written = file != nullptr;
-    int error = written ? 0 : errno;
-    if (file) {
-        // The header heads a new file only: a completed one has it already.
-        std::fseek(file, 0, SEEK_END);
-        const bool fresh = std::ftell(file) <= 0;
-        constexpr std::size_t kChunk = 1 << 20;
-        std::string out;
-        if (fresh) AppendHeader(out);
-        for (int i = 0; i < records.GetSize() && written; ++i) {
-            if (Chosen(records.GetType(i), choices)) AppendRecord(out, *records.GetAt(i), records.GetType(i));
-            if (out.size() >= kChunk) {
-                written = std::fwrite(out.data(), 1, out.size(), file) == out.size();
-                if (!written) error = errno;
-                out.clear();
-            }
-        }
-        if (written && std::fwrite(out.data(), 1, out.size(), file) != out.size()) {
-            written = false;
-            error = errno;
-        }
-        if (std::fclose(file) != 0 && written) {
-            written = false;
-            error = errno;
-        }
-    }
-    if (!written) {
-        ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
-        frontEnd.MessageBox(Sprintf(fb::kInParentheses,
-                                    Sprintf(fb::kMsgCannotWriteFile, path.c_str()).c_str(),
-                                    SystemErrorText(error != 0 ? error : EIO).c_str()),
-                            ui::kCaption, ui::kIconWarning);
-    }
-    return written;
+    PointExportJob job;
+    job.carnet = &records;
+    job.path = path;
+    job.append = mode && mode[0] == 'a';
+    job.parent = parent;
+    return Export(job, choices);
 }
 
 } // namespace pyr

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "fieldbook/PointExport.h"
+
 #include <string>
 
 namespace pyr {
@@ -27,6 +29,11 @@ public:
     // is shown on `parent` (else the application's front end).
     static bool Export(const CCarnet& records, const std::string& path, const char* mode = "w",
                        QdlExportChoices choices = {}, ui::FrontEnd* parent = nullptr);
+    // Writes the elements of the job's scope in its GéoBase to the job's file, replaced or
+    // completed (the header line heads a new or empty file only), whole or not at all. `written`, when
+    // given, receives the number of elements written. False when the file cannot be written (the
+    // message said why).
+    static bool Export(const PointExportJob& job, QdlExportChoices choices, int* written = nullptr);
     // The text of the field book, header line first when asked.
     static std::string Text(const CCarnet& records, QdlExportChoices choices = {}, bool header = true);
 };

@@ -7,6 +7,7 @@
 #include "calc/ResectionDriver.h"
 #include "core/Strings.h"
 #include "editor/GeoEditor.h"
+#include "fieldbook/ExportCommand.h"
 #include "fieldbook/ReadingCommand.h"
 #include "host/CommandFlow.h"
 #include "host/HostTexts.h"
@@ -92,7 +93,8 @@ void OnReadFieldBook(const CommandEntry& command) {
 }
 
 void OnExport(const CommandEntry& command) {
-    RunPending(command);
+    const std::optional<int> format = ExportCommandFormat(command.localName);
+    RunCommandDialog(command.title, [format] { return std::make_unique<CExportCommand>(format); });
 }
 
 void OnTabCode(const CommandEntry& command) {
@@ -105,7 +107,7 @@ void OnPending(const CommandEntry& command) {
 }
 
 bool CommandAvailable(const CommandEntry& command) {
-    if (command.handler == OnPending || command.handler == OnExport || command.handler == OnTabCode)
+    if (command.handler == OnPending || command.handler == OnTabCode)
         return false;
     if (command.handler == OnReadFieldBook) return FindFieldBookFormat(command.localName).has_value();
     return true;

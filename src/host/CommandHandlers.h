@@ -27,7 +27,7 @@ void OnCalRayon(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);
-// The eight exports of a GéoBase, told apart by their title.
+// The eight exports of a GéoBase, told apart by their local name.
 void OnExport(const CommandEntry& command);
 // "CalTabCode": the table of codes, which needs the scale services too.
 void OnTabCode(const CommandEntry& command);
