@@ -1,6 +1,7 @@
 #pragma once
 
 #include "fieldbook/ConfigSepRecords.h"
+#include "fieldbook/PointExport.h"
 
 #include <string>
 #include <string_view>
@@ -28,7 +29,14 @@ private:
 };
 
 // The configuration of columnar field books ("Colonné", "*.col"), whose layout the section "Parametrage"
-// of the parameter file describes (docs/format-separateur-colonne.md).
-class CDlgConfigCol : public CLayoutImport<CColumnarFields> {};
+// of the parameter file describes (docs/format-separateur-colonne.md); the same file lays out an export
+// of points.
+class CDlgConfigCol : public CLayoutImport<CColumnarFields> {
+public:
+    // Writes the points of the job as a columnar field book laid out by the settings file job.paramFile,
+    // which reads them back (ExportLayout.h). False, nothing written, when the settings file cannot serve or
+    // the file cannot be written, the message shown on the job's front end.
+    static bool Export(const PointExportJob& job);
+};
 
 } // namespace pyr

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "fieldbook/ConfigSepRecords.h"
+#include "fieldbook/PointExport.h"
 
 #include <string>
 #include <string_view>
@@ -42,7 +43,14 @@ private:
 };
 
 // The configuration of delimited field books ("Séparateur", "*.sep"), whose layout the section
-// "Parametrage" of the parameter file describes (docs/format-separateur-colonne.md).
-class CDlgConfigSep : public CLayoutImport<CDelimitedFields> {};
+// "Parametrage" of the parameter file describes (docs/format-separateur-colonne.md); the same file lays
+// out an export of points.
+class CDlgConfigSep : public CLayoutImport<CDelimitedFields> {
+public:
+    // Writes the points of the job as a delimited field book laid out by the settings file job.paramFile,
+    // which reads them back (ExportLayout.h). False, nothing written, when the settings file cannot serve or
+    // the file cannot be written, the message shown on the job's front end.
+    static bool Export(const PointExportJob& job);
+};
 
 } // namespace pyr
