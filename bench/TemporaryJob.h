@@ -27,6 +27,7 @@ public:
 
     std::string GeoBase() const { return (m_folder / "job.geo").string(); }
     std::string Params() const { return (m_folder / "Pyralis.ini").string(); }
+    std::string Folder() const { return m_folder.string(); }
 
 private:
     std::filesystem::path m_folder;
