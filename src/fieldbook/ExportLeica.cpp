@@ -5,8 +5,8 @@
 #include "geobase/Carnet.h"
 #include "settings/ParamStore.h"
 
-#include <charconv>
 #include <cmath>
+#include <cstring>
 
 namespace pyr {
 
@@ -19,7 +19,7 @@ constexpr int kBlockNumbers = 9999; // positions 3 to 6 of word 11
 // The widest block written: word 11, three coordinates and a code, each word of 7 header characters, its
 // data and a blank, the '*' of GSI-16 and a line end.
 constexpr std::size_t kWordHeader = 7;
-std::size_t LargestBlock(std::size_t width) {
+constexpr std::size_t LargestBlock(std::size_t width) {
     return 1 + 5 * (kWordHeader + width + 1) + 2;
 }
 
@@ -47,13 +47,8 @@ const char* UnitName(char unit) {
     }
 }
 
-// Appends the data right-justified in `width` characters, padded with zeros in front as the
-// instruments write it.
-void AppendPadded(std::string& out, std::string_view data, std::size_t width) {
-    out.append(width - data.size(), '0');
-    out += data;
-}
-
+// The block of a point is made in a buffer of the largest block's size, then appended at once: a million
+// points are a million appends, not ten million.
 class GsiWriter {
 public:
     GsiWriter(const CDlgConfigLeica::Settings& settings, std::string& out)
@@ -73,33 +68,30 @@ public:
         if (withCode && code.size() > m_width)
             return Refuse(why, Sprintf(gsi::kWhyCodeTooLong, int(m_width)));
 
-        const std::size_t start = m_out.size();
-        if (m_settings.gsi16) m_out += '*';
-        m_out += "11";
-        AppendBlockNumber();
-        m_out += '+';
-        AppendPadded(m_out, mat, m_width);
-        m_out += ' ';
+        char* p = m_block;
+        if (m_settings.gsi16) *p++ = '*';
+        p = Put(p, "11");
+        p = PutDigits(p, static_cast<unsigned long long>(m_number), 4);
+        *p++ = '+';
+        p = PutPadded(p, mat);
         const char* large = nullptr;
         if (point.hasXY()) {
-            if (!AppendLength("81", point.x()))
+            if (!(p = PutLength(p, "81", point.x())))
                 large = "X";
-            else if (!AppendLength("82", point.y()))
+            else if (!(p = PutLength(p, "82", point.y())))
                 large = "Y";
         }
-        if (!large && point.hasZ() && !AppendLength("83", point.z())) large = "Z";
-        if (large) {
-            m_out.resize(start);
+        if (!large && point.hasZ() && !(p = PutLength(p, "83", point.z()))) large = "Z";
+        if (large)
             return Refuse(why, Sprintf(fb::kWhyCoordinateTooLarge, large,
                                        Sprintf("GSI-%zu en %s", m_width, UnitName(m_settings.unit)).c_str()));
-        }
         if (withCode) {
-            m_out += "71....+";
-            AppendPadded(m_out, code, m_width);
-            m_out += ' ';
+            p = Put(p, "71....+");
+            p = PutPadded(p, code);
         }
-        m_out += m_settings.crlf ? "\r\n" : "\n";
-        m_block = m_block % kBlockNumbers + 1;
+        p = Put(p, m_settings.crlf ? "\r\n" : "\n");
+        m_out.append(m_block, static_cast<std::size_t>(p - m_block));
+        m_number = m_number % kBlockNumbers + 1;
         return true;
     }
 
@@ -109,32 +101,44 @@ private:
         return false;
     }
 
-    void AppendBlockNumber() {
-        char digits[4] = {'0', '0', '0', '0'};
-        for (int n = m_block, i = 3; n > 0 && i >= 0; n /= 10, --i)
-            digits[i] = static_cast<char>('0' + n % 10);
-        m_out.append(digits, 4);
+    static char* Put(char* p, std::string_view text) {
+        std::memcpy(p, text.data(), text.size());
+        return p + text.size();
+    }
+
+    // The number on `width` digits, zeros in front.
+    static char* PutDigits(char* p, unsigned long long n, std::size_t width) {
+        for (std::size_t i = width; i-- > 0; n /= 10)
+            p[i] = static_cast<char>('0' + n % 10);
+        return p + width;
+    }
+
+    // The data right-justified in the word, padded with zeros in front as the instruments write it, and
+    // the blank that ends the word.
+    char* PutPadded(char* p, std::string_view data) const {
+        const std::size_t pad = m_width - data.size();
+        std::memset(p, '0', pad);
+        p = Put(p + pad, data);
+        *p++ = ' ';
+        return p;
     }
 
     // A length word: index, "..0" and the unit digit, the sign, the digits of the value in that unit
-    // without a decimal point. False when they do not fit in the word.
-    bool AppendLength(const char* index, double metres) {
+    // without a decimal point. Null when they do not fit in the word.
+    char* PutLength(char* p, const char* index, double metres) const {
         const double value = m_feet ? metres / kMetresPerFoot : metres;
         const double scaled = std::fabs(value) * kPowersOfTen[m_decimals];
-        if (!(scaled < kPowersOfTen[m_width] - 0.5)) return false;
+        if (!(scaled < kPowersOfTen[m_width] - 0.5)) return nullptr;
         const long long digits = std::llround(scaled);
-        char text[24];
-        const auto end = std::to_chars(text, text + sizeof text, digits).ptr;
-        const auto count = static_cast<std::size_t>(end - text);
-        if (count > m_width) return false;
-        m_out += index;
-        m_out += "..0";
-        m_out += m_settings.unit;
+        if (digits >= static_cast<long long>(kPowersOfTen[m_width])) return nullptr;
+        p = Put(p, index);
+        p = Put(p, "..0");
+        *p++ = m_settings.unit;
         // A value that rounds to zero has no sign to keep.
-        m_out += value < 0 && digits != 0 ? '-' : '+';
-        AppendPadded(m_out, std::string_view(text, count), m_width);
-        m_out += ' ';
-        return true;
+        *p++ = value < 0 && digits != 0 ? '-' : '+';
+        p = PutDigits(p, static_cast<unsigned long long>(digits), m_width);
+        *p++ = ' ';
+        return p;
     }
 
     const CDlgConfigLeica::Settings& m_settings;
@@ -142,7 +146,8 @@ private:
     std::size_t m_width;
     int m_decimals;
     bool m_feet;
-    int m_block = 1;
+    int m_number = 1; // of the block, positions 3 to 6 of word 11
+    char m_block[LargestBlock(16)];
 };
 
 // The value of a key, trimmed; its default when the key is absent or empty.
