@@ -116,6 +116,7 @@ ui::DialogResult CGeoEditor::ExportPoints(ui::FrontEnd& frontEnd, bool asWindow)
             requests.selection = *selection;
             if (!requests.from) requests.scope = CDlgExportPoints::kSelected;
         }
+        m_exporter.Export().SetInputs(m_exporter.Inputs());
         result = RunExport(m_exporter.Export(), requests, frontEnd, &m_carnet);
     }
     m_exporter.SetCarnet(nullptr);

@@ -34,8 +34,11 @@ TEST_F(ExportCommand, EachCommandWritesItsFormatOverTheScopeAsked) {
     EXPECT_EQ(ReadBytes(dir / "sel.txt"), "QUENDAL-PC;1\nMESURE;A7;1.3;112.3456;100.5;24.142\n");
 
     // The points export takes the format named, else the last one used, and names the file after the
-    // GéoBase.
+    // GéoBase. The box of the points stays as the last export left it.
     outcome = Run("EPoints --geobase chantier.geo --format 0 --selection B5");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.err, "Il n'y a rien à exporter !")) << outcome.err;
+    outcome = Run("EPoints --geobase chantier.geo --format 0 --selection B5 --points 1");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
     EXPECT_EQ(SavedGeoBase(dir / "chantier_2.geo").GetSize(), 1);
     EXPECT_TRUE(Has(ReadBytes(dir / "Pyralis.ini"), "DernierFormat=0")) << ReadBytes(dir / "Pyralis.ini");
@@ -75,7 +78,7 @@ TEST_F(ExportCommand, TheEditorExportsItsGeoBaseOrItsSelection) {
     ASSERT_EQ(outcome.status, 0) << outcome.err;
     EXPECT_EQ(ReadBytes(dir / "sel.txt"), "QUENDAL-PC;1\nPOINT;A7;1020;1990;99.5\n");
 
-    outcome = Run("GeoEdit chantier.geo --exportation --format 0 --sortie copie.geo");
+    outcome = Run("GeoEdit chantier.geo --exportation --format 0 --sortie copie.geo --carnet 1");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
     EXPECT_EQ(SavedGeoBase(dir / "copie.geo").GetSize(), 5);
 }
