@@ -115,6 +115,6 @@ TEST(Quendal, ExportReplacesOrCompletesAFileWithOneHeader) {
 
     ui::ScriptedFrontEnd frontEnd;
     EXPECT_FALSE(CDlgConfigQdl::Export(c, dir / "absent/points.txt", "w", {}, &frontEnd));
-    EXPECT_EQ(MessageTexts(frontEnd), "Impossible d'écrire le fichier <" + dir / "absent/points.txt" +
-                                          "> !\n(fichier ou dossier inexistant)");
+    EXPECT_EQ(MessageTexts(frontEnd), "Impossible d'écrire le fichier\n<" + dir / "absent/points.txt" +
+                                          ">\n(fichier ou dossier inexistant).");
 }
