@@ -22,9 +22,10 @@ namespace pyr {
 namespace {
 
 constexpr char kQuote = '"';
-// What the line of a point rarely exceeds: the text of an export is reserved at this much a point, so
-// that a million points are laid out without the text being moved.
-constexpr std::size_t kBytesPerPoint = 64;
+// What a field of a delimited line, or a text running to the end of a columnar line, rarely exceeds. The
+// text of an export is reserved for lines that long, so that a million points are laid out without it
+// being moved; the pages reserved and not written are never touched.
+constexpr std::size_t kBytesPerField = 24;
 
 const char* FieldWord(RecordField field) {
     switch (field) {
@@ -169,6 +170,8 @@ public:
         out += '\n';
     }
 
+    std::size_t LineEstimate() const { return (m_layout.point.size() + 1) * kBytesPerField; }
+
     bool AppendPoint(std::string& out, const CPointGen& point, std::string&) const {
         const std::size_t start = out.size();
         std::size_t filled = start; // after the last field that holds something
@@ -283,6 +286,13 @@ public:
         out += '\n';
     }
 
+    std::size_t LineEstimate() const {
+        std::size_t end = 0;
+        for (const FieldPlace& place : m_fields)
+            end = std::max(end, static_cast<std::size_t>(place.last > 0 ? place.last : place.first));
+        return end + kBytesPerField;
+    }
+
     bool AppendPoint(std::string& out, const CPointGen& point, std::string& why) {
         const std::size_t start = out.size();
         std::size_t column = 1; // the column of the next character of the line
@@ -387,7 +397,7 @@ bool WritePoints(const PointExportJob& job, const RecordLayout& layout, Distance
     const std::vector<int> points = ExportedPoints(job);
     const FileEnd end = job.append ? LookAtEnd(job.path) : FileEnd{};
     std::string text;
-    text.reserve(points.size() * kBytesPerPoint + 1024);
+    text.reserve(points.size() * writer.LineEstimate() + 1024);
     if (!end.lineEnded) text += '\n'; // the file's last line is not ours to lengthen
     // The header lines head the file only; a completed file has them already.
     if (end.empty) writer.AppendHeader(text, layout.headerLines);

@@ -7,7 +7,6 @@
 #include "fieldbook/ConfigSep.h"
 #include "fieldbook/ExportLayout.h"
 
-#include <cmath>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <limits>
@@ -43,36 +42,19 @@ CCarnet Survey(const std::vector<Point>& points) {
     return carnet;
 }
 
-std::string Shipped(FieldBookFormat format) {
-    return std::string(PYR_SOURCE_DIR) + "/data/Config/Param_Export." +
-           (format == FieldBookFormat::Separateur ? "sep" : "col");
-}
-
-// The delivered settings file of the format with some keys given other values, the rest of it (comments
-// included) as delivered.
-std::string SettingsText(FieldBookFormat format, const std::map<std::string, std::string>& changes) {
-    std::string text;
-    std::string shipped = ReadBytes(Shipped(format));
-    std::size_t start = 0;
-    while (start < shipped.size()) {
-        std::size_t end = shipped.find('\n', start);
-        if (end == std::string::npos) end = shipped.size();
-        std::string line = shipped.substr(start, end - start);
-        const std::size_t equal = line.find('=');
-        if (equal != std::string::npos && line[0] != ';')
-            if (auto change = changes.find(line.substr(0, equal)); change != changes.end())
-                line = change->first + "=" + change->second;
-        text += line + "\n";
-        start = end + 1;
-    }
-    return text;
-}
-
 class ExportLayoutTest : public ::testing::Test {
 protected:
+    // A copy of the delivered settings file of the format, some keys given other values.
     std::string Settings(FieldBookFormat format, const std::map<std::string, std::string>& changes = {}) {
-        const std::string path = dir / (format == FieldBookFormat::Separateur ? "export.sep" : "export.col");
-        WriteBytes(path, SettingsText(format, changes));
+        const char* extension = format == FieldBookFormat::Separateur ? "sep" : "col";
+        const std::string path = dir / (std::string("export.") + extension);
+        fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/Config/Param_Export." + extension, path,
+                      fs::copy_options::overwrite_existing);
+        CParamDriver settings("", path, format);
+        EXPECT_TRUE(settings.Load(nullptr));
+        for (const auto& [key, value] : changes)
+            settings.SetText(key, value);
+        EXPECT_TRUE(settings.Save());
         return path;
     }
 
@@ -214,14 +196,6 @@ TEST_F(ExportLayoutTest, TheLinesAreThoseTheLayoutDescribes) {
                                   "PT;0012;652110.2141;6861845.6372;61.2085;BORNE\n"
                                   "PT;B3;651200;6862300;;\"Lampadaire ; double\"\n"
                                   "PT;S10;652215.48;6861830.215;61.734;\"Poteau \"\"bois\"\"\"\n");
-    // Blanks between the fields: an empty field inside the line is quoted, none is written at its end.
-    survey = Survey({{"B3", 651200.0, 6862300.0, kUndefined, "ARB 6"}, {"B4", 1.0, 2.0, kUndefined, ""}});
-    ASSERT_TRUE(CDlgConfigSep::Export(
-        Job(Settings(FieldBookFormat::Separateur, {{"Separateur", "ESPACE"}, {"SeparateurDecimal", ","}}),
-            sepFile)));
-    EXPECT_EQ(ReadBytes(sepFile), "PT B3 651200 6862300 \"\" \"ARB 6\"\n"
-                                  "PT B4 1 2\n");
-
     // TYPE:1-2,MATRICULE:4-19,X:21-34,Y:36-49,Z:51-60,CODE:62-, numbers right-aligned.
     survey = Survey({kSurvey[0], kSurvey[1], kSurvey[2]});
     const std::string colFile = dir / "points.txt";
@@ -322,7 +296,8 @@ TEST_F(ExportLayoutTest, PointsTheColumnsCannotHoldAreLeftOut) {
 }
 
 // A settings file that is missing, that its reader refuses, or whose points could not be read back: the
-// message names it, the command fails, and the file to write is left as it was.
+// message names it, the command fails, and the file to write is left as it was. So with no folder to write
+// in.
 TEST_F(ExportLayoutTest, SettingsThatCannotServeWriteNothing) {
     using Changes = std::map<std::string, std::string>;
     struct Case {
@@ -370,17 +345,11 @@ TEST_F(ExportLayoutTest, SettingsThatCannotServeWriteNothing) {
     EXPECT_EQ(MessageTexts(frontEnd), "Le fichier de paramètres d'export <" + missing + "> n'existe pas !");
     EXPECT_EQ(ReadBytes(output), "à garder\n");
     EXPECT_FALSE(fs::exists(missing));
-}
 
-// A folder that does not exist: the write fails with its message, and nothing is made.
-TEST_F(ExportLayoutTest, AnOutputFolderThatDoesNotExistIsTold) {
-    for (FieldBookFormat format : {FieldBookFormat::Separateur, FieldBookFormat::Colonne}) {
-        frontEnd.messages.clear();
-        const std::string output = dir / "absent/points.txt";
-        EXPECT_FALSE(Export(format, Job(Settings(format), output)));
-        ASSERT_EQ(frontEnd.messages.size(), 1u);
-        EXPECT_EQ(frontEnd.messages[0].text.rfind("Impossible d'écrire le fichier\n<" + output + ">", 0), 0u)
-            << frontEnd.messages[0].text;
-        EXPECT_FALSE(fs::exists(dir / "absent"));
-    }
+    // A folder that does not exist: the writing fails with its message, and nothing is made.
+    frontEnd.messages.clear();
+    const std::string nowhere = dir / "absent/points.txt";
+    EXPECT_FALSE(CDlgConfigCol::Export(Job(Settings(FieldBookFormat::Colonne), nowhere)));
+    EXPECT_EQ(MessageTexts(frontEnd).rfind("Impossible d'écrire le fichier\n<" + nowhere + ">", 0), 0u);
+    EXPECT_FALSE(fs::exists(dir / "absent"));
 }
