@@ -1,6 +1,7 @@
 #include "fieldbook/DxfWriter.h"
 
 #include "core/Angles.h"
+#include "core/LargeBlocks.h"
 #include "core/TextEncoding.h"
 
 #include <algorithm>
@@ -9,10 +10,13 @@
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
+#include <cstring>
 
 namespace pyr::dxf {
 
 namespace {
+
+using Buffer = std::pmr::string;
 
 inline constexpr std::string_view kEnd = "\r\n";
 // A text of the drawing is drawn some 0.8 of its height wide per character: what the extents count for
@@ -25,20 +29,32 @@ constexpr std::array<double, 10> kPowersOfTen = {1e0, 1e1, 1e2, 1e3, 1e4, 1e5, 1
 // Below 2^52 a double holds every integer and every half-integer exactly.
 inline constexpr double kTwoTo52 = 4503599627370496.0;
 
-void Code(std::string& out, int code) {
+// The lines of the group codes 0 to 99, each with its line end, made once.
+const std::array<std::string, 100> kCodeLines = [] {
+    std::array<std::string, 100> lines;
+    for (std::size_t code = 0; code < lines.size(); ++code)
+        lines[code] = std::to_string(code) + std::string(kEnd);
+    return lines;
+}();
+
+void Code(Buffer& out, int code) {
+    if (code >= 0 && code < static_cast<int>(kCodeLines.size())) {
+        out += kCodeLines[static_cast<std::size_t>(code)];
+        return;
+    }
     char buffer[8];
     const auto result = std::to_chars(buffer, buffer + sizeof buffer, code);
     out.append(buffer, result.ptr);
     out += kEnd;
 }
 
-void Group(std::string& out, int code, std::string_view value) {
+void Group(Buffer& out, int code, std::string_view value) {
     Code(out, code);
     out += value;
     out += kEnd;
 }
 
-void Group(std::string& out, int code, int value) {
+void Group(Buffer& out, int code, int value) {
     Code(out, code);
     char buffer[16];
     const auto result = std::to_chars(buffer, buffer + sizeof buffer, value);
@@ -47,7 +63,7 @@ void Group(std::string& out, int code, int value) {
 }
 
 // Drops the trailing zeros of a fraction and its point: "12.500" -> "12.5", "3.000" -> "3"; "-0" -> "0".
-void TrimFraction(std::string& out, std::size_t start) {
+void TrimFraction(Buffer& out, std::size_t start) {
     if (out.find('.', start) != std::string::npos) {
         while (out.back() == '0')
             out.pop_back();
@@ -56,11 +72,22 @@ void TrimFraction(std::string& out, std::size_t start) {
     if (out.size() == start + 2 && out[start] == '-' && out[start + 1] == '0') out.erase(start, 1);
 }
 
+// Writes the two digits of a number below 100 just before `p`; returns where they start.
+char* TwoDigits(char* p, std::uint64_t number) {
+    static constexpr char kPairs[] =
+        "00010203040506070809101112131415161718192021222324252627282930313233343536373839"
+        "4041424344454647484950515253545556575859606162636465666768697071727374757677787980"
+        "81828384858687888990919293949596979899";
+    p -= 2;
+    std::memcpy(p, kPairs + 2 * number, 2);
+    return p;
+}
+
 // The value rounded to `decimals` places, trailing zeros dropped, as the decimal text of the double
 // gives it. The scaled value rounded to an integer is the text's digits whenever it is below 2^52 and
 // not exactly a half (RoundToDecimals in core/Numbers.cpp says why); a half or a huge value goes
 // through to_chars.
-void AppendRounded(std::string& out, double value, int decimals) {
+void AppendRounded(Buffer& out, double value, int decimals) {
     const double scaled = std::fabs(value * kPowersOfTen[static_cast<std::size_t>(decimals)]);
     const double whole = (scaled + kTwoTo52) - kTwoTo52;
     if (scaled >= kTwoTo52 || std::fabs(scaled - whole) == 0.5) {
@@ -72,24 +99,30 @@ void AppendRounded(std::string& out, double value, int decimals) {
         TrimFraction(out, start);
         return;
     }
-    auto digits = static_cast<std::uint64_t>(whole);
+    const auto scale = static_cast<std::uint64_t>(kPowersOfTen[static_cast<std::size_t>(decimals)]);
+    const auto digits = static_cast<std::uint64_t>(whole);
+    std::uint64_t integer = digits / scale;
+    std::uint64_t fraction = digits % scale;
     char buffer[32];
     char* end = buffer + sizeof buffer;
     char* p = end;
-    bool fraction = false;
-    for (int i = 0; i < decimals; ++i) {
-        const auto digit = static_cast<char>('0' + digits % 10);
-        digits /= 10;
-        if (fraction || digit != '0') {
-            *--p = digit;
-            fraction = true;
+    if (fraction != 0) {
+        int places = decimals;
+        while (fraction % 10 == 0) {
+            fraction /= 10;
+            --places;
         }
+        for (; places >= 2; places -= 2, fraction /= 100)
+            p = TwoDigits(p, fraction % 100);
+        if (places == 1) *--p = static_cast<char>('0' + fraction);
+        *--p = '.';
     }
-    if (fraction) *--p = '.';
-    do {
-        *--p = static_cast<char>('0' + digits % 10);
-        digits /= 10;
-    } while (digits != 0);
+    for (; integer >= 100; integer /= 100)
+        p = TwoDigits(p, integer % 100);
+    if (integer >= 10)
+        p = TwoDigits(p, integer);
+    else
+        *--p = static_cast<char>('0' + integer);
     if (value < 0.0 && whole != 0.0) *--p = '-';
     out.append(p, end);
 }
@@ -144,7 +177,7 @@ unsigned char Windows1252Byte(char32_t cp) {
     return 0;
 }
 
-void AppendText(std::string& out, std::string_view text) {
+void AppendText(Buffer& out, std::string_view text) {
     const bool plain = std::all_of(text.begin(), text.end(), [](char c) {
         const auto byte = static_cast<unsigned char>(c);
         return byte >= 0x20 && byte < 0x7F;
@@ -255,7 +288,7 @@ bool Finite(const Point3& p) {
 
 } // namespace
 
-DxfWriter::DxfWriter(int decimals) : m_decimals(std::clamp(decimals, 0, 9)) {
+DxfWriter::DxfWriter(int decimals) : m_decimals(std::clamp(decimals, 0, 9)), m_entities(LargeBlocks()) {
     Layer("0");
 }
 
@@ -273,7 +306,7 @@ void DxfWriter::SetPointDisplay(int mode, double size) {
     m_pointSize = std::isfinite(size) ? size : 0.0;
 }
 
-void DxfWriter::Start(std::string& out, std::string_view kind, int layer) const {
+void DxfWriter::Start(Buffer& out, std::string_view kind, int layer) const {
     out += "0\r\n";
     out += kind;
     out += "\r\n8\r\n";
@@ -283,13 +316,13 @@ void DxfWriter::Start(std::string& out, std::string_view kind, int layer) const 
     out += kEnd;
 }
 
-void DxfWriter::Number(std::string& out, int code, double value) const {
+void DxfWriter::Number(Buffer& out, int code, double value) const {
     Code(out, code);
     AppendRounded(out, value, m_decimals);
     out += kEnd;
 }
 
-void DxfWriter::Coordinates(std::string& out, int code, const Point3& p) const {
+void DxfWriter::Coordinates(Buffer& out, int code, const Point3& p) const {
     Number(out, code, p.x);
     Number(out, code + 10, p.y);
     Number(out, code + 20, p.z);
@@ -297,7 +330,7 @@ void DxfWriter::Coordinates(std::string& out, int code, const Point3& p) const {
 
 bool DxfWriter::Point(int layer, Point3 at) {
     if (!Finite(at)) return false;
-    std::string& out = Body();
+    Buffer& out = Body();
     Start(out, "POINT", layer);
     Coordinates(out, 10, at);
     Extents().Add(at);
@@ -307,11 +340,19 @@ bool DxfWriter::Point(int layer, Point3 at) {
 bool DxfWriter::Text(int layer, Point3 at, std::string_view text, const TextStyle& style) {
     if (!Finite(at) || !std::isfinite(style.height) || !std::isfinite(style.rotationGrads)) return false;
     if (text.empty()) return true;
-    std::string& out = Body();
+    Buffer& out = Body();
     Start(out, "TEXT", layer);
     const bool aligned = style.horizontal != HAlign::Left || style.vertical != VAlign::Baseline;
     Coordinates(out, 10, at);
-    Number(out, 40, style.height);
+    if (style.height != m_height) {
+        m_height = style.height;
+        Buffer text;
+        AppendRounded(text, m_height, m_decimals);
+        m_heightText = std::move(text);
+    }
+    Code(out, 40);
+    out += m_heightText;
+    out += kEnd;
     Code(out, 1);
     AppendText(out, text);
     out += kEnd;
@@ -343,7 +384,7 @@ bool DxfWriter::Text(int layer, Point3 at, std::string_view text, const TextStyl
 
 bool DxfWriter::Line(int layer, Point3 from, Point3 to) {
     if (!Finite(from) || !Finite(to)) return false;
-    std::string& out = Body();
+    Buffer& out = Body();
     Start(out, "LINE", layer);
     Coordinates(out, 10, from);
     Coordinates(out, 11, to);
@@ -355,7 +396,7 @@ bool DxfWriter::Line(int layer, Point3 from, Point3 to) {
 bool DxfWriter::Polyline(int layer, std::span<const Point3> vertices, bool closed, bool is3D) {
     if (!std::all_of(vertices.begin(), vertices.end(), Finite)) return false;
     if (vertices.size() < 2) return true;
-    std::string& out = Body();
+    Buffer& out = Body();
     Box& extents = Extents();
     const double elevation = vertices.front().z;
     Start(out, "POLYLINE", layer);
@@ -393,7 +434,7 @@ bool DxfWriter::Insert(int layer, std::string_view block, Point3 at, double scal
     const auto found =
         std::find_if(m_blocks.begin(), m_blocks.end(), [&](const Block& b) { return b.name == valid; });
     if (found == m_blocks.end()) return false;
-    std::string& out = m_entities;
+    Buffer& out = m_entities;
     Start(out, "INSERT", layer);
     Group(out, 2, valid);
     Coordinates(out, 10, at);
@@ -425,7 +466,7 @@ bool DxfWriter::Insert(int layer, std::string_view block, Point3 at, double scal
     return true;
 }
 
-void DxfWriter::AppendHeader(std::string& out) const {
+void DxfWriter::AppendHeader(Buffer& out) const {
     const Box& box = m_extents;
     const Point3 min = box.any ? box.min : Point3{};
     const Point3 max = box.any ? box.max : Point3{};
@@ -459,7 +500,7 @@ void DxfWriter::AppendHeader(std::string& out) const {
 }
 
 // The active viewport, showing the extents: the drawing opens on everything drawn.
-void DxfWriter::AppendViewport(std::string& out) const {
+void DxfWriter::AppendViewport(Buffer& out) const {
     const Box& box = m_extents;
     const double width = box.any ? box.max.x - box.min.x : 0.0;
     const double height = box.any ? box.max.y - box.min.y : 0.0;
@@ -506,7 +547,7 @@ void DxfWriter::AppendViewport(std::string& out) const {
     Group(out, 0, "ENDTAB");
 }
 
-void DxfWriter::AppendTables(std::string& out) const {
+void DxfWriter::AppendTables(Buffer& out) const {
     Group(out, 0, "SECTION");
     Group(out, 2, "TABLES");
     AppendViewport(out);
@@ -552,7 +593,7 @@ void DxfWriter::AppendTables(std::string& out) const {
     Group(out, 0, "ENDSEC");
 }
 
-void DxfWriter::AppendBlocks(std::string& out) const {
+void DxfWriter::AppendBlocks(Buffer& out) const {
     Group(out, 0, "SECTION");
     Group(out, 2, "BLOCKS");
     for (const Block& block : m_blocks) {
@@ -569,9 +610,9 @@ void DxfWriter::AppendBlocks(std::string& out) const {
     Group(out, 0, "ENDSEC");
 }
 
-std::string DxfWriter::Finish() {
+std::string_view DxfWriter::Finish() {
     EndBlock();
-    std::string head;
+    Buffer head;
     std::size_t blocks = 0;
     for (const Block& block : m_blocks)
         blocks += block.body.size() + 128;
@@ -581,14 +622,10 @@ std::string DxfWriter::Finish() {
     AppendBlocks(head);
     Group(head, 0, "SECTION");
     Group(head, 2, "ENTITIES");
-    // The head goes before the entities in their own buffer: a million entities are not copied into a
-    // second one.
-    std::string out = std::move(m_entities);
-    m_entities.clear();
-    out.insert(0, head);
-    Group(out, 0, "ENDSEC");
-    Group(out, 0, "EOF");
-    return out;
+    m_entities.insert(0, head);
+    Group(m_entities, 0, "ENDSEC");
+    Group(m_entities, 0, "EOF");
+    return m_entities;
 }
 
 } // namespace pyr::dxf

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <memory_resource>
 #include <span>
 #include <string>
 #include <string_view>
@@ -105,9 +106,10 @@ public:
     bool IsEmpty() const { return !m_extents.any; }
     // Room for that many bytes of entities, when their number is known: no copy while they grow.
     void Reserve(std::size_t bytes) { m_entities.reserve(bytes); }
-    // The whole file: HEADER, TABLES, BLOCKS, ENTITIES, EOF. An open block is ended first. Called once,
-    // at the end: the entities are handed over to the file's text.
-    std::string Finish();
+    // The whole file: HEADER, TABLES, BLOCKS, ENTITIES, EOF, in the writer's own memory, valid as long as
+    // the writer. An open block is ended first. Called once, at the end: the file is assembled in the
+    // entities' buffer, a million entities not copied into a second one.
+    std::string_view Finish();
 
 private:
     struct Box {
@@ -121,34 +123,41 @@ private:
         std::string name;
         int colour;
     };
+    // The text of the file, in memory taken in huge pages when it grows big: a drawing of a million
+    // points fills some 200 MB, which in pages of 4 KB would cost fifty thousand page faults.
+    using Buffer = std::pmr::string;
+
     struct Block {
         std::string name;
         Point3 base;
-        std::string body;
+        Buffer body;
         Box extents;
     };
 
-    std::string& Body() { return m_inBlock ? m_blocks.back().body : m_entities; }
+    Buffer& Body() { return m_inBlock ? m_blocks.back().body : m_entities; }
     Box& Extents() { return m_inBlock ? m_blocks.back().extents : m_extents; }
-    void Start(std::string& out, std::string_view kind, int layer) const;
-    void Coordinates(std::string& out, int code, const Point3& p) const;
-    void Number(std::string& out, int code, double value) const;
-    void AppendHeader(std::string& out) const;
-    void AppendTables(std::string& out) const;
-    void AppendViewport(std::string& out) const;
-    void AppendBlocks(std::string& out) const;
+    void Start(Buffer& out, std::string_view kind, int layer) const;
+    void Coordinates(Buffer& out, int code, const Point3& p) const;
+    void Number(Buffer& out, int code, double value) const;
+    void AppendHeader(Buffer& out) const;
+    void AppendTables(Buffer& out) const;
+    void AppendViewport(Buffer& out) const;
+    void AppendBlocks(Buffer& out) const;
 
     int m_decimals;
     std::vector<LayerEntry> m_layers;
     std::unordered_map<std::string, int> m_layerNumbers;
     std::vector<Block> m_blocks;
     bool m_inBlock = false;
-    std::string m_entities;
+    Buffer m_entities;
     Box m_extents;
     // The sine and cosine of the last text's rotation, kept: a million texts share one rotation.
     double m_rotationGrads = 0.0;
     double m_sin = 0.0;
     double m_cos = 1.0;
+    // The text of the last height written: a million texts share one height.
+    double m_height = 0.0;
+    Buffer m_heightText{"0"};
     int m_pointMode = 0;
     double m_pointSize = 0.0;
 };

@@ -50,9 +50,15 @@ def main():
     auditor = doc.audit()
     for entry in auditor.errors:
         print(f"audit, erreur : {entry.message}")
+    # ezdxf 0.18 takes the SEQEND that ends a polyline inside a block for an entity without owner, in the
+    # release-12 files that it writes itself as well: that fix is shown, not held against the file.
+    fixes = 0
     for entry in auditor.fixes:
-        print(f"audit, correction : {entry.message}")
-    if auditor.has_errors or auditor.has_fixes:
+        seqend_in_block = entry.message.startswith("Deleted SEQEND(") and entry.message.endswith(
+            "with invalid owner handle #None.")
+        print(f"audit, correction{' (ezdxf 0.18, SEQEND dans un bloc)' if seqend_in_block else ''} : {entry.message}")
+        fixes += 0 if seqend_in_block else 1
+    if auditor.has_errors or fixes:
         status = 1
 
     if doc.dxfversion != "AC1009":
