@@ -30,7 +30,9 @@ release: deps
 
 # The commands of the module, then the GéoBase editor on a copy of the bundled job, then the orientation
 # of every station with its listing, and point 101 computed by intersection from the three stations that
-# sight it, written back with its listing, and every other point sighted radiated from the stations; then the bundled Quendal-Pc field book converted into a new GéoBase
+# sight it, written back with its listing, and every other point sighted radiated from the stations; the
+# points of the job exported as a delimited text file and as a DXF drawing; then the bundled Quendal-Pc
+# field book converted into a new GéoBase
 # (its codes interpreted by the default table), whose stations are oriented in turn. The demo has a
 # parameter file and a registry of its own (the user's settings are left alone).
 demo: release
@@ -47,6 +49,11 @@ demo: release
 	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui CalRayon \
 		--geobase $(DEMO_DIR)/chantier-demo.geo --type toutes --enregistrer --listing $(DEMO_DIR)/chantier-demo.cpr
 	@cat $(DEMO_DIR)/chantier-demo.cpr
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini ESeparat --geobase $(DEMO_DIR)/chantier-demo.geo \
+		--sortie $(DEMO_DIR)/chantier-demo-points.txt --tous-les-points --remplacer
+	@cat $(DEMO_DIR)/chantier-demo-points.txt
+	$(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini EPoints --format 7 \
+		--geobase $(DEMO_DIR)/chantier-demo.geo --tous-les-points --remplacer
 	@cp data/carnet-tilleuls.qdl $(DEMO_DIR)/
 	PYRALIS_REGISTRE=$(DEMO_DIR)/registre $(RELEASE_DIR)/bin/pyralis --params $(DEMO_DIR)/Pyralis.ini --oui \
 		LQuenda $(DEMO_DIR)/carnet-tilleuls.qdl --interpretation 1 </dev/null

@@ -10,7 +10,8 @@ namespace pyr {
 
 // The window of the GéoBase editor's first face: the GéoBase open, its elements one a line in a table, and
 // the editor's actions as buttons: the reduction of the stations, the change of frame, the export of points,
-// the reading of a field book of the format chosen, and "Fermer". Opening it opens the GéoBase (the one named, else the one chosen).
+// the reading of a field book of the format chosen, and "Fermer". Opening it opens the GéoBase (the one
+// named, else the one chosen).
 class CGeoEditorForm : public ui::Form {
 public:
     enum Id : int {

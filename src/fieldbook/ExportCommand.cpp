@@ -121,7 +121,8 @@ ui::DialogResult RunExport(CDlgExportPoints& dialog, const ExportRequests& reque
     if (requests.to) dialog.SetTo(*requests.to);
     if (requests.scope) dialog.SetScope(*requests.scope);
     // A selection that names no element: there is nothing to export.
-    if (requests.scope == CDlgExportPoints::kSelected && dialog.ScopeChoice() != CDlgExportPoints::kSelected) {
+    if (requests.scope == CDlgExportPoints::kSelected &&
+        dialog.ScopeChoice() != CDlgExportPoints::kSelected) {
         frontEnd.MessageBox(exp::kMsgNothingToExport, ui::kCaption, ui::kIconWarning);
         return ui::DialogResult::Failed;
     }

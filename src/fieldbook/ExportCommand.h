@@ -49,8 +49,8 @@ std::optional<std::vector<int>> SelectionReferences(const CCarnet& carnet, std::
 // dialog with the command's format imposed, "EPoints" with the last format used.
 class CExportCommand : public ui::Dialog {
 public:
-    explicit CExportCommand(std::optional<int> imposedFormat) : m_dialog(nullptr, nullptr, imposedFormat),
-                                                                m_imposed(imposedFormat.has_value()) {}
+    explicit CExportCommand(std::optional<int> imposedFormat)
+        : m_dialog(nullptr, nullptr, imposedFormat), m_imposed(imposedFormat.has_value()) {}
 
     ui::DialogModel& Model() override { return m_dialog; }
     std::string Caption() const override { return m_dialog.Caption(); }

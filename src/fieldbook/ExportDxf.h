@@ -38,7 +38,7 @@ struct DxfExportSettings {
 // The DXF settings dialog: its settings, read from and saved to the settings file, and the export.
 class CDlgConfigDxf {
 public:
-    static constexpr const char* kSection = "Exportation";
+    static constexpr const char* kSection = fb::kExportSection;
 
     DxfExportSettings& Settings() { return m_settings; }
     const DxfExportSettings& Settings() const { return m_settings; }

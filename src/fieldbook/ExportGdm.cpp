@@ -10,14 +10,6 @@ namespace pyr {
 
 namespace {
 
-// The value of a key, trimmed; its default when the key is absent or empty.
-std::string Setting(const CParamFile& file, const char* key, const char* defaultValue) {
-    std::string value;
-    file.ReadString(gdm::kExportSection, key, defaultValue, value);
-    const std::string_view trimmed = Trimmed(value);
-    return trimmed.empty() ? std::string(defaultValue) : std::string(trimmed);
-}
-
 // A label line: the label, '=', then the value appended by the caller.
 void Label(std::string& out, std::string_view label) {
     out += label;
@@ -30,14 +22,14 @@ std::optional<gdm::ExportSettings> gdm::ReadExportSettings(const PointExportJob&
     const CParamFile file(job.paramFile);
     ExportSettings settings;
 
-    const std::string unit = Setting(file, kKeyUniteDistances, "metres");
+    const std::string unit = ExportSetting(file, kKeyUniteDistances, "metres");
     if (!EqualIgnoringCase(unit, "metres") && !EqualIgnoringCase(unit, "pieds")) {
         ReportBadExportSetting(job, kKeyUniteDistances, unit, "metres, pieds");
         return std::nullopt;
     }
     settings.feet = EqualIgnoringCase(unit, "pieds");
 
-    const std::string decimals = Setting(file, kKeyDecimales, "3");
+    const std::string decimals = ExportSetting(file, kKeyDecimales, "3");
     if (decimals.size() != 1 || decimals[0] < '0' || decimals[0] > '0' + kMaxExportDecimals) {
         ReportBadExportSetting(job, kKeyDecimales, decimals, "0 à 8");
         return std::nullopt;
@@ -46,7 +38,7 @@ std::optional<gdm::ExportSettings> gdm::ReadExportSettings(const PointExportJob&
 
     for (auto [key, on] :
          {std::pair{kKeyLabelUnites, &settings.unitLabel}, std::pair{kKeyCode, &settings.code}}) {
-        const std::string value = Setting(file, key, "1");
+        const std::string value = ExportSetting(file, key, "1");
         if (value != "0" && value != "1") {
             ReportBadExportSetting(job, key, value, "0, 1");
             return std::nullopt;
@@ -54,9 +46,9 @@ std::optional<gdm::ExportSettings> gdm::ReadExportSettings(const PointExportJob&
         *on = value == "1";
     }
 
-    const std::string lineEnd = Setting(file, kKeyFinDeLigne, "CRLF");
+    const std::string lineEnd = ExportSetting(file, fb::kKeyFinDeLigne, "CRLF");
     if (!EqualIgnoringCase(lineEnd, "CRLF") && !EqualIgnoringCase(lineEnd, "LF")) {
-        ReportBadExportSetting(job, kKeyFinDeLigne, lineEnd, "CRLF, LF");
+        ReportBadExportSetting(job, fb::kKeyFinDeLigne, lineEnd, "CRLF, LF");
         return std::nullopt;
     }
     settings.crlf = EqualIgnoringCase(lineEnd, "CRLF");
@@ -98,7 +90,7 @@ bool dll_ExportSpectra(const PointExportJob& job) {
             continue;
         }
         if (!point.isOk()) {
-            refusals.Refuse(point.mat(), gdm::kWhyNoPosition);
+            refusals.Refuse(point.mat(), fb::kWhyNoPosition);
             continue;
         }
         Label(text, "5");

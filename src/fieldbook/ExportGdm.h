@@ -12,17 +12,14 @@ namespace pyr {
 namespace gdm {
 
 // The settings file's section and keys ("Export_Gdm.ini").
-inline constexpr const char* kExportSection = "Exportation";
 inline constexpr const char* kKeyUniteDistances = "UniteDistances"; // metres or pieds
 inline constexpr const char* kKeyDecimales = "Decimales";           // 0 to 8
 inline constexpr const char* kKeyLabelUnites = "LabelUnites";       // 1: label 23 written, 0: not
 inline constexpr const char* kKeyCode = "Code";                     // 1: label 4 written, 0: not
-inline constexpr const char* kKeyFinDeLigne = "FinDeLigne";         // CRLF or LF
 
 inline constexpr int kMaxExportDecimals = 8;
 
 // The reason of a point left out that has neither planimetry nor altitude.
-inline constexpr const char* kWhyNoPosition = "point sans coordonnées";
 
 struct ExportSettings {
     bool feet = false;     // coordinates in international feet (else metres)

@@ -26,7 +26,6 @@ inline constexpr const char* kWhyExportTypeTaken = "le mot « %s » est aussi ce
 inline constexpr const char* kWhyExportTypeTooLong =
     "le mot « %s » ne tient pas dans les colonnes %d à %d du champ TYPE";
 // Why a point is left out, besides those of PointExport.h.
-inline constexpr const char* kWhyCodeTooLong = "code de plus de %d caractères";
 inline constexpr const char* kWhyLineEndInText = "matricule ou code sur plusieurs lignes";
 } // namespace fb
 

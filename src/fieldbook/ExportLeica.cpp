@@ -63,10 +63,9 @@ public:
         const std::string& code = point.sym();
         if (mat.empty()) return Refuse(why, fb::kWhyNoIdentifier);
         if (mat.size() > m_width) return Refuse(why, Sprintf(fb::kWhyIdentifierTooLong, int(m_width)));
-        if (!point.hasXY() && !point.hasZ()) return Refuse(why, gsi::kWhyNoPosition);
+        if (!point.hasXY() && !point.hasZ()) return Refuse(why, fb::kWhyNoPosition);
         const bool withCode = m_settings.code && !code.empty();
-        if (withCode && code.size() > m_width)
-            return Refuse(why, Sprintf(gsi::kWhyCodeTooLong, int(m_width)));
+        if (withCode && code.size() > m_width) return Refuse(why, Sprintf(fb::kWhyCodeTooLong, int(m_width)));
 
         char* p = m_block;
         if (m_settings.gsi16) *p++ = '*';
@@ -150,28 +149,20 @@ private:
     char m_block[LargestBlock(16)];
 };
 
-// The value of a key, trimmed; its default when the key is absent or empty.
-std::string Setting(const CParamFile& file, const char* key, const char* defaultValue) {
-    std::string value;
-    file.ReadString(gsi::kExportSection, key, defaultValue, value);
-    const std::string_view trimmed = Trimmed(value);
-    return trimmed.empty() ? std::string(defaultValue) : std::string(trimmed);
-}
-
 } // namespace
 
 std::optional<CDlgConfigLeica::Settings> CDlgConfigLeica::ReadSettings(const PointExportJob& job) {
     const CParamFile file(job.paramFile);
     Settings settings;
 
-    const std::string format = Setting(file, gsi::kKeyFormatGsi, "16");
+    const std::string format = ExportSetting(file, gsi::kKeyFormatGsi, "16");
     if (format != "8" && format != "16") {
         ReportBadExportSetting(job, gsi::kKeyFormatGsi, format, "8, 16");
         return std::nullopt;
     }
     settings.gsi16 = format == "16";
 
-    const std::string unit = Setting(file, gsi::kKeyUniteLongueurs, "0");
+    const std::string unit = ExportSetting(file, gsi::kKeyUniteLongueurs, "0");
     if (unit.size() != 1 || std::string_view("01678").find(unit[0]) == std::string_view::npos) {
         ReportBadExportSetting(job, gsi::kKeyUniteLongueurs, unit,
                                "0 mm, 6 0,1 mm, 8 0,01 mm, 1 pied, 7 pied au dix-millième");
@@ -179,16 +170,16 @@ std::optional<CDlgConfigLeica::Settings> CDlgConfigLeica::ReadSettings(const Poi
     }
     settings.unit = unit[0];
 
-    const std::string code = Setting(file, gsi::kKeyCode, "1");
+    const std::string code = ExportSetting(file, gsi::kKeyCode, "1");
     if (code != "0" && code != "1") {
         ReportBadExportSetting(job, gsi::kKeyCode, code, "0, 1");
         return std::nullopt;
     }
     settings.code = code == "1";
 
-    const std::string lineEnd = Setting(file, gsi::kKeyFinDeLigne, "CRLF");
+    const std::string lineEnd = ExportSetting(file, fb::kKeyFinDeLigne, "CRLF");
     if (!EqualIgnoringCase(lineEnd, "CRLF") && !EqualIgnoringCase(lineEnd, "LF")) {
-        ReportBadExportSetting(job, gsi::kKeyFinDeLigne, lineEnd, "CRLF, LF");
+        ReportBadExportSetting(job, fb::kKeyFinDeLigne, lineEnd, "CRLF, LF");
         return std::nullopt;
     }
     settings.crlf = EqualIgnoringCase(lineEnd, "CRLF");

@@ -13,15 +13,11 @@ namespace pyr {
 namespace gsi {
 
 // The settings file's section and keys ("Export_Leica.ini").
-inline constexpr const char* kExportSection = "Exportation";
 inline constexpr const char* kKeyFormatGsi = "FormatGsi";           // 8 or 16
 inline constexpr const char* kKeyUniteLongueurs = "UniteLongueurs"; // the unit digit: 0, 1, 6, 7, 8
 inline constexpr const char* kKeyCode = "Code";                     // 1: word 71 written, 0: not
-inline constexpr const char* kKeyFinDeLigne = "FinDeLigne";         // CRLF or LF
 
 // The reasons of a point left out that only this format has.
-inline constexpr const char* kWhyCodeTooLong = "code de plus de %d caractères";
-inline constexpr const char* kWhyNoPosition = "point sans coordonnées";
 
 } // namespace gsi
 

@@ -36,8 +36,8 @@ constexpr ExportFormatInfo kFormats[kExportFormatCount] = {
     {ExportFormat::Sokkia, "Fichier carnet Sokkia", "sdr", true, exp::kFilterSokkia, "sdr",
      exp::kKeyParametresSokkia, exp::kDefaultSokkia},
     // A drawing's save dialog proposes "txt" as its default extension, as the other text formats do.
-    {ExportFormat::Dxf, "Fichier DXF Version 12", "dxf", false, exp::kFilterDxf, "txt", exp::kKeyParametresDxf,
-     exp::kDefaultDxf},
+    {ExportFormat::Dxf, "Fichier DXF Version 12", "dxf", false, exp::kFilterDxf, "txt",
+     exp::kKeyParametresDxf, exp::kDefaultDxf},
 };
 
 constexpr int kFormatDxf = static_cast<int>(ExportFormat::Dxf);
@@ -139,7 +139,8 @@ bool CDlgExportPoints::WriteSettings(ui::FrontEnd&) const {
         const char* key = kFormats[i].settingsKey;
         // The Leica settings file is read but never written back: the one chosen serves this export only.
         if (!key || key == exp::kKeyParametresLeica) continue;
-        written = params.WriteString(exp::kSection, key, m_paramFiles[static_cast<std::size_t>(i)]) && written;
+        written =
+            params.WriteString(exp::kSection, key, m_paramFiles[static_cast<std::size_t>(i)]) && written;
     }
     written = params.WriteBool(exp::kSection, exp::kKeyVisualiserFichier, m_view) && written;
     written = params.WriteBool(exp::kSection, exp::kKeyEcrirePoints, m_writePoints) && written;
@@ -149,8 +150,10 @@ bool CDlgExportPoints::WriteSettings(ui::FrontEnd&) const {
 
 void CDlgExportPoints::OnInitDialog() {
     ReadSettings();
-    if (m_carnet) m_source = m_carnet->PathName();
-    else if (m_source.empty()) m_source = GeoBase();
+    if (m_carnet)
+        m_source = m_carnet->PathName();
+    else if (m_source.empty())
+        m_source = GeoBase();
     if (!SelectedEnabled() && m_scope == kSelected) m_scope = kAll;
     if (SelectedEnabled()) m_scope = kSelected;
     DeriveOutput();
@@ -315,7 +318,7 @@ ui::DialogResult CDlgExportPoints::OnOK(ui::FrontEnd& frontEnd) {
         const OverwriteChoice choice =
             askOverwrite ? askOverwrite(frontEnd, question)
                          : (frontEnd.DoModal(question) == ui::DialogResult::Ok ? question.Choice()
-                                                                              : OverwriteChoice::Cancel);
+                                                                               : OverwriteChoice::Cancel);
         if (choice == OverwriteChoice::Cancel) return ui::DialogResult::Cancel;
         append = choice == OverwriteChoice::Complete && question.CompleteAllowed();
     }
@@ -328,7 +331,8 @@ ui::DialogResult CDlgExportPoints::OnOK(ui::FrontEnd& frontEnd) {
     if (!carnet) {
         if (!loaded.Load(&txt, m_source, {}, 0, &frontEnd)) return ui::DialogResult::Failed;
         if (loaded.LoadedFileIsForeign()) {
-            frontEnd.MessageBox(Sprintf(exp::kMsgNotAGeoBase, m_source.c_str()), ui::kCaption, ui::kIconWarning);
+            frontEnd.MessageBox(Sprintf(exp::kMsgNotAGeoBase, m_source.c_str()), ui::kCaption,
+                                ui::kIconWarning);
             return ui::DialogResult::Failed;
         }
         carnet = &loaded;
@@ -380,7 +384,8 @@ bool CDlgExportPoints::ExportGeoBase(const CCarnet& carnet, const PointExportJob
         CCarnet target;
         if (!target.Load(&txt, job.path, {}, 0, &frontEnd)) return false;
         if (target.LoadedFileIsForeign()) {
-            frontEnd.MessageBox(Sprintf(exp::kMsgNotAGeoBase, job.path.c_str()), ui::kCaption, ui::kIconWarning);
+            frontEnd.MessageBox(Sprintf(exp::kMsgNotAGeoBase, job.path.c_str()), ui::kCaption,
+                                ui::kIconWarning);
             return false;
         }
         target.Append(std::move(copy));

@@ -22,12 +22,12 @@ inline constexpr int kExportFormatCount = 8;
 
 struct ExportFormatInfo {
     ExportFormat format;
-    const char* listText;      // "Fichier texte avec séparateur"
-    const char* extension;     // "txt"
-    bool suffix;               // the derived name takes "_2" (it would otherwise be the GéoBase itself)
-    const char* filter;        // the browse filter
+    const char* listText;  // "Fichier texte avec séparateur"
+    const char* extension; // "txt"
+    bool suffix;           // the derived name takes "_2" (it would otherwise be the GéoBase itself)
+    const char* filter;    // the browse filter
     const char* browseExtension;
-    const char* settingsKey;   // the key of its settings file; null for a format without, or without a key
+    const char* settingsKey;     // the key of its settings file; null for a format without, or without a key
     const char* defaultSettings; // the delivered settings file; null for a format without one
 };
 const ExportFormatInfo& ExportFormatOf(int number);
@@ -66,8 +66,8 @@ class CDlgExportPoints : public ui::DialogModel {
 public:
     enum Scope { kSelected = 0, kAll = 1, kRange = 2 };
     // The parts of a change notice.
-    static constexpr int kPartFields = 1;  // a text field
-    static constexpr int kPartLayout = 2;  // the format, and what shows or hides with it
+    static constexpr int kPartFields = 1; // a text field
+    static constexpr int kPartLayout = 2; // the format, and what shows or hides with it
 
     // `carnet`: the caller's GéoBase, or null (the source field is then shown and loaded at OK).
     // `selection`: the editor's references (kObservationReference), or null. `imposedFormat`: the

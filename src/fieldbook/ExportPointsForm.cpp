@@ -15,9 +15,11 @@ constexpr int kPathWidth = 50;
 
 // A file: its label, its edit and its browse button, on a row of the grid.
 void AddFile(std::vector<ui::Control>& controls, int label, const char* name, const char* text, int row) {
-    controls.push_back(Ctl(label, ControlKind::Label, std::string(name) + "Label", text).At(row, 0).Buddy(label + 1));
+    controls.push_back(
+        Ctl(label, ControlKind::Label, std::string(name) + "Label", text).At(row, 0).Buddy(label + 1));
     controls.push_back(Ctl(label + 1, ControlKind::Edit, name).At(row, 1).Width(kPathWidth));
-    controls.push_back(Ctl(label + 2, ControlKind::Button, std::string(name) + "Parcourir", "...").At(row, 2));
+    controls.push_back(
+        Ctl(label + 2, ControlKind::Button, std::string(name) + "Parcourir", "...").At(row, 2));
 }
 
 } // namespace
@@ -25,17 +27,22 @@ void AddFile(std::vector<ui::Control>& controls, int label, const char* name, co
 std::vector<ui::Control> CDlgExportPointsForm::Controls() const {
     std::vector<ui::Control> controls;
     AddFile(controls, kSourceLabel, "geobase", exp::kLabelSource, 0);
-    controls.push_back(Ctl(kFormatLabel, ControlKind::Label, "formatLabel", exp::kLabelFormat).At(1, 0).Buddy(kFormat));
+    controls.push_back(
+        Ctl(kFormatLabel, ControlKind::Label, "formatLabel", exp::kLabelFormat).At(1, 0).Buddy(kFormat));
     controls.push_back(Ctl(kFormat, ControlKind::Combo, "format").At(1, 1));
     AddFile(controls, kParamLabel, "parametres", exp::kLabelParamFile, 2);
     AddFile(controls, kOutputLabel, "sortie", exp::kLabelOutput, 3);
 
     controls.push_back(Ctl(kScopeGroup, ControlKind::Group, "etendue", exp::kGroupPoints).At(4, 0, 1, 3));
-    controls.push_back(Ctl(kSelected, ControlKind::Radio, "selectionnes", exp::kOnlySelectedPoints).In(kScopeGroup).At(0, 0, 1, 4));
+    controls.push_back(Ctl(kSelected, ControlKind::Radio, "selectionnes", exp::kOnlySelectedPoints)
+                           .In(kScopeGroup)
+                           .At(0, 0, 1, 4));
     controls.push_back(Ctl(kAll, ControlKind::Radio, "tous", exp::kAllPoints).In(kScopeGroup).At(1, 0, 1, 4));
-    controls.push_back(Ctl(kRange, ControlKind::Radio, "plage", exp::kRange).In(kScopeGroup).At(2, 0).Buddy(kFrom));
+    controls.push_back(
+        Ctl(kRange, ControlKind::Radio, "plage", exp::kRange).In(kScopeGroup).At(2, 0).Buddy(kFrom));
     controls.push_back(Ctl(kFrom, ControlKind::Edit, "de").In(kScopeGroup).At(2, 1).Width(14));
-    controls.push_back(Ctl(kToLabel, ControlKind::Label, "aLabel", exp::kRangeTo).In(kScopeGroup).At(2, 2).Buddy(kTo));
+    controls.push_back(
+        Ctl(kToLabel, ControlKind::Label, "aLabel", exp::kRangeTo).In(kScopeGroup).At(2, 2).Buddy(kTo));
     controls.push_back(Ctl(kTo, ControlKind::Edit, "a").In(kScopeGroup).At(2, 3).Width(14));
 
     controls.push_back(Ctl(kWritePoints, ControlKind::Check, "ecrirePoints", exp::kWritePoints).At(5, 1));
@@ -43,7 +50,8 @@ std::vector<ui::Control> CDlgExportPointsForm::Controls() const {
     controls.push_back(Ctl(kViewFile, ControlKind::Check, "visualiser", exp::kViewFile).At(7, 1));
 
     controls.push_back(Ctl(ui::kIdOk, ControlKind::Button, "ok", "OK").In(ui::kButtonRow).Default());
-    controls.push_back(Ctl(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler").In(ui::kButtonRow).At(0, 1));
+    controls.push_back(
+        Ctl(ui::kIdCancel, ControlKind::Button, "annuler", "Annuler").In(ui::kButtonRow).At(0, 1));
     return controls;
 }
 
@@ -183,10 +191,15 @@ std::vector<ui::Control> CDlgOverWriteForm::Controls() const {
     const std::array<std::string, 3> lines = m_dialog.Lines();
     std::vector<ui::Control> controls;
     for (int i = 0; i < 3; ++i)
-        controls.push_back(Ctl(kLine1 + i, ControlKind::Label, "ligne" + std::to_string(i + 1), lines[static_cast<std::size_t>(i)]).At(i, 0));
-    controls.push_back(Ctl(kReplace, ControlKind::Button, "remplacer", exp::kReplace).In(ui::kButtonRow).Default());
-    controls.push_back(Ctl(kComplete, ControlKind::Button, "completer", exp::kComplete).In(ui::kButtonRow).At(0, 1));
-    controls.push_back(Ctl(ui::kIdCancel, ControlKind::Button, "annuler", exp::kCancel).In(ui::kButtonRow).At(0, 2));
+        controls.push_back(Ctl(kLine1 + i, ControlKind::Label, "ligne" + std::to_string(i + 1),
+                               lines[static_cast<std::size_t>(i)])
+                               .At(i, 0));
+    controls.push_back(
+        Ctl(kReplace, ControlKind::Button, "remplacer", exp::kReplace).In(ui::kButtonRow).Default());
+    controls.push_back(
+        Ctl(kComplete, ControlKind::Button, "completer", exp::kComplete).In(ui::kButtonRow).At(0, 1));
+    controls.push_back(
+        Ctl(ui::kIdCancel, ControlKind::Button, "annuler", exp::kCancel).In(ui::kButtonRow).At(0, 2));
     return controls;
 }
 

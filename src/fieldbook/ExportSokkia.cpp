@@ -23,14 +23,6 @@ constexpr std::string_view kVersionSdr2x = "SDR20";
 // Columns 25 to 40: the date, written blank as a transfer does when it does not give it.
 constexpr std::string_view kNoDate = "00-000-00 00:00 ";
 
-// The value of a key, trimmed; its default when the key is absent or empty.
-std::string Setting(const CParamFile& file, const char* key, const char* defaultValue) {
-    std::string value;
-    file.ReadString(sdr::kExportSection, key, defaultValue, value);
-    const std::string_view trimmed = Trimmed(value);
-    return trimmed.empty() ? std::string(defaultValue) : std::string(trimmed);
-}
-
 bool IsDigits(std::string_view text) {
     for (char c : text)
         if (c < '0' || c > '9') return false;
@@ -73,11 +65,11 @@ public:
         if (idChars > static_cast<std::size_t>(idLength))
             return Refuse(why, Sprintf(fb::kWhyIdentifierTooLong, idLength));
         if (!m_settings.sdr33 && !IsDigits(mat)) return Refuse(why, sdr::kWhyIdNotNumeric);
-        if (!point.isOk()) return Refuse(why, sdr::kWhyNoPosition);
+        if (!point.isOk()) return Refuse(why, fb::kWhyNoPosition);
         const bool withCode = m_settings.code && !code.empty();
         const std::size_t codeChars = withCode ? Utf8Length(code) : 0;
         if (codeChars > static_cast<std::size_t>(sdr::kDescriptionWidth))
-            return Refuse(why, Sprintf(sdr::kWhyCodeTooLong, sdr::kDescriptionWidth));
+            return Refuse(why, Sprintf(fb::kWhyCodeTooLong, sdr::kDescriptionWidth));
 
         const std::size_t start = m_out.size();
         m_out += "08KI";
@@ -155,7 +147,7 @@ std::optional<sdr::ExportSettings> sdr::ReadExportSettings(const PointExportJob&
     ExportSettings settings;
     const auto choose = [&](const char* key, const char* defaultValue, std::string_view yes,
                             std::string_view no, const char* allowed, bool& on) {
-        const std::string value = Setting(file, key, defaultValue);
+        const std::string value = ExportSetting(file, key, defaultValue);
         if (!EqualIgnoringCase(value, yes) && !EqualIgnoringCase(value, no)) {
             ReportBadExportSetting(job, key, value, allowed);
             return false;
@@ -168,7 +160,7 @@ std::optional<sdr::ExportSettings> sdr::ReadExportSettings(const PointExportJob&
         !choose(kKeyOrdreCoordonnees, "YX", "YX", "XY", "YX (N-E-Z), XY (E-N-Z)", settings.northFirst))
         return std::nullopt;
 
-    const std::string decimals = Setting(file, kKeyDecimales, "4");
+    const std::string decimals = ExportSetting(file, kKeyDecimales, "4");
     if (decimals.size() != 1 || decimals[0] < '0' || decimals[0] > '0' + kMaxExportDecimals) {
         ReportBadExportSetting(job, kKeyDecimales, decimals, "0 à 8");
         return std::nullopt;
@@ -177,7 +169,7 @@ std::optional<sdr::ExportSettings> sdr::ReadExportSettings(const PointExportJob&
 
     if (!choose(kKeyCode, "1", "1", "0", "0, 1", settings.code) ||
         !choose(kKeyEncadrement, "0", "1", "0", "0, 1", settings.framed) ||
-        !choose(kKeyFinDeLigne, "CRLF", "CRLF", "LF", "CRLF, LF", settings.crlf))
+        !choose(fb::kKeyFinDeLigne, "CRLF", "CRLF", "LF", "CRLF, LF", settings.crlf))
         return std::nullopt;
     return settings;
 }

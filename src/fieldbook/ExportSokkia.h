@@ -14,14 +14,12 @@ namespace pyr {
 namespace sdr {
 
 // The settings file's section and keys ("Export_Sokkia.ini").
-inline constexpr const char* kExportSection = "Exportation";
 inline constexpr const char* kKeyFormat = "Format";                     // SDR33 or SDR2x
 inline constexpr const char* kKeyUniteDistances = "UniteDistances";     // metres or pieds
 inline constexpr const char* kKeyOrdreCoordonnees = "OrdreCoordonnees"; // YX (N-E-Z) or XY (E-N-Z)
 inline constexpr const char* kKeyDecimales = "Decimales";               // 0 to 8
 inline constexpr const char* kKeyCode = "Code";                         // 1: description written, 0: not
 inline constexpr const char* kKeyEncadrement = "Encadrement";           // 1: STX ... ETX and checksum
-inline constexpr const char* kKeyFinDeLigne = "FinDeLigne";             // CRLF or LF
 
 inline constexpr int kMaxExportDecimals = 8;
 // The identifier characters that an SDR33 collector keeps of its 16-character field.
@@ -32,8 +30,6 @@ inline constexpr int kDescriptionWidth = 16;
 // The reasons of a point left out that only this format has.
 inline constexpr const char* kWhyIdNotNumeric =
     "matricule non numérique (le SDR2x ne connaît que des numéros)";
-inline constexpr const char* kWhyCodeTooLong = "code de plus de %d caractères";
-inline constexpr const char* kWhyNoPosition = "point sans coordonnées";
 
 struct ExportSettings {
     bool sdr33 = true;

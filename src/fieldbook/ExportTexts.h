@@ -50,7 +50,8 @@ inline constexpr const char* kMsgBadRange = "Plage de matricules incorrecte : %s
 inline constexpr const char* kMsgNotAGeoBase =
     "Le fichier <%s> n'est pas une GéoBase : il ne peut pas être complété.";
 inline constexpr const char* kMsgExported = "Exportation des points terminée : <%s>.";
-inline constexpr const char* kMsgElementsExported = "Exportation terminée : %d élément(s) écrit(s) dans <%s>.";
+inline constexpr const char* kMsgElementsExported =
+    "Exportation terminée : %d élément(s) écrit(s) dans <%s>.";
 
 // ---- The overwrite dialog
 inline constexpr const char* kOverwriteCaption = "Fichier existant";
@@ -63,7 +64,8 @@ inline constexpr const char* kReplace = "Remplacer";
 inline constexpr const char* kComplete = "Compléter";
 inline constexpr const char* kCancel = "Annuler";
 // At a terminal, the three buttons become the answers of a question.
-inline constexpr const char* kOverwriteAnswers = "Oui : remplacer, Non : compléter, Annuler : ne rien exporter.";
+inline constexpr const char* kOverwriteAnswers =
+    "Oui : remplacer, Non : compléter, Annuler : ne rien exporter.";
 inline constexpr const char* kOverwriteDxfAnswers = "Oui : remplacer, Non : ne rien exporter.";
 
 // ---- File choices
@@ -75,19 +77,22 @@ inline constexpr const char* kFilterPoints =
     "Fichiers de points (*.xyz)|*.xyz|Fichiers textes (*.txt)|*.txt|Tous les fichiers (*.*)|*.*||";
 inline constexpr const char* kChooseSource = "Sélectionnez la GéoBase à traiter";
 inline constexpr const char* kChooseParamFile = "Sélectionnez le fichier de paramètres du format";
-inline constexpr const char* kFilterParamFile = "Fichiers de paramètres (*.ini;*.sep;*.col)|*.ini;*.sep;*.col|Tous les fichiers (*.*)|*.*||";
+inline constexpr const char* kFilterParamFile =
+    "Fichiers de paramètres (*.ini;*.sep;*.col)|*.ini;*.sep;*.col|Tous les fichiers (*.*)|*.*||";
 
 // ---- Command line
 inline constexpr const char* kHelpOutput = "le fichier à créer (par défaut tiré du nom de la GéoBase)";
 inline constexpr const char* kHelpFormat =
     "le format (0 GéoBase, 1 séparateur, 2 colonné, 3 Quendal-Pc, 4 Leica, 5 Trimble GDM, 6 Sokkia, 7 DXF)";
 inline constexpr const char* kHelpAll = "tous les points (ou éléments) de la GéoBase";
-inline constexpr const char* kHelpSelection = "uniquement les points (ou éléments) des matricules SEL (« 100-150, A1 »)";
+inline constexpr const char* kHelpSelection =
+    "uniquement les points (ou éléments) des matricules SEL (« 100-150, A1 »)";
 inline constexpr const char* kHelpFrom = "du matricule A (plage de matricules)";
 inline constexpr const char* kHelpTo = "au matricule B (plage de matricules)";
 inline constexpr const char* kHelpParamFile = "le fichier de paramètres du format";
 inline constexpr const char* kHelpPoints = "écrire les points (formats GéoBase et Quendal-Pc)";
-inline constexpr const char* kHelpCarnet = "écrire les observations du carnet (formats GéoBase et Quendal-Pc)";
+inline constexpr const char* kHelpCarnet =
+    "écrire les observations du carnet (formats GéoBase et Quendal-Pc)";
 inline constexpr const char* kHelpReplace = "remplacer le fichier s'il existe";
 inline constexpr const char* kHelpComplete = "compléter le fichier s'il existe";
 inline constexpr const char* kHelpView = "visualiser le fichier après l'exportation";

@@ -5,6 +5,7 @@
 #include "core/Strings.h"
 #include "geobase/Carnet.h"
 #include "geobase/Matricule.h"
+#include "settings/ParamStore.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
@@ -18,13 +19,15 @@ namespace {
 inline constexpr const char* kWhyRangeWithoutNumber =
     "le matricule « %s » n'a pas de numéro : une plage va d'un matricule numéroté à un autre";
 inline constexpr const char* kWhyRangePrefixes = "les deux bornes de la plage n'ont pas le même préfixe";
-inline constexpr const char* kWhyRangeReversed = "plage à l'envers, le premier numéro est plus grand que le dernier";
+inline constexpr const char* kWhyRangeReversed =
+    "plage à l'envers, le premier numéro est plus grand que le dernier";
 inline constexpr const char* kMsgPointNotExported = "Point <%s> non exporté : %s.";
 inline constexpr const char* kMsgPointsLeftOut =
     "%d point(s) non exporté(s) : le format du fichier ne peut pas les écrire.\n"
     "Voir la fenêtre de texte.";
 inline constexpr const char* kMsgSettingsMissing = "Le fichier de paramètres d'export <%s> n'existe pas !";
-inline constexpr const char* kMsgSettingsUnreadable = "Impossible de lire le fichier de paramètres d'export <%s> !\n(%s)";
+inline constexpr const char* kMsgSettingsUnreadable =
+    "Impossible de lire le fichier de paramètres d'export <%s> !\n(%s)";
 inline constexpr const char* kMsgSettingsNotNamed = "Aucun fichier de paramètres d'export n'est indiqué !";
 inline constexpr const char* kMsgBadSetting =
     "Fichier de paramètres d'export <%s> :\nvaleur « %s » incorrecte pour %s (valeurs possibles : %s) !";
@@ -68,7 +71,8 @@ std::vector<bool> ElementsInScope(const PointExportJob& job) {
     }
     if (job.range)
         for (std::size_t i = 0; i < size; ++i)
-            if (chosen[i] && !job.range->Contains(carnet.GetAt(static_cast<int>(i))->mat())) chosen[i] = false;
+            if (chosen[i] && !job.range->Contains(carnet.GetAt(static_cast<int>(i))->mat()))
+                chosen[i] = false;
     return chosen;
 }
 
@@ -86,7 +90,8 @@ ui::FrontEnd& ExportFrontEnd(const PointExportJob& job) {
 }
 
 bool WriteExportFile(const PointExportJob& job, std::string_view text) {
-    SafeFileWriter writer(job.path, job.append ? SafeFileWriter::Start::CopyOfFile : SafeFileWriter::Start::Empty);
+    SafeFileWriter writer(job.path,
+                          job.append ? SafeFileWriter::Start::CopyOfFile : SafeFileWriter::Start::Empty);
     if (writer.Error() == 0 && writer.Write(text) && writer.Commit()) return true;
     ExportFrontEnd(job).ReportFailure(writer.FailureText());
     return false;
@@ -112,20 +117,28 @@ bool CheckExportSettingsFile(const PointExportJob& job) {
     return true;
 }
 
+std::string ExportSetting(const CParamFile& file, const char* key, const char* defaultValue) {
+    std::string value;
+    file.ReadString(fb::kExportSection, key, defaultValue, value);
+    const std::string_view trimmed = Trimmed(value);
+    return trimmed.empty() ? std::string(defaultValue) : std::string(trimmed);
+}
+
 void ReportBadExportSetting(const PointExportJob& job, std::string_view key, std::string_view value,
                             std::string_view allowed) {
-    ExportFrontEnd(job).ReportFailure(Sprintf(kMsgBadSetting, job.paramFile.c_str(), std::string(value).c_str(),
-                                              std::string(key).c_str(), std::string(allowed).c_str()));
+    ExportFrontEnd(job).ReportFailure(Sprintf(kMsgBadSetting, job.paramFile.c_str(),
+                                              std::string(value).c_str(), std::string(key).c_str(),
+                                              std::string(allowed).c_str()));
 }
 
 void ExportRefusals::Refuse(std::string_view mat, std::string_view why) {
     ++m_count;
-    if (m_job.txt)
-        m_job.txt->Print(kMsgPointNotExported, std::string(mat).c_str(), std::string(why).c_str());
+    if (m_job.txt) m_job.txt->Print(kMsgPointNotExported, std::string(mat).c_str(), std::string(why).c_str());
 }
 
 void ExportRefusals::Summarise() const {
-    if (m_count > 0) ExportFrontEnd(m_job).MessageBox(Sprintf(kMsgPointsLeftOut, m_count), ui::kCaption, ui::kIconWarning);
+    if (m_count > 0)
+        ExportFrontEnd(m_job).MessageBox(Sprintf(kMsgPointsLeftOut, m_count), ui::kCaption, ui::kIconWarning);
 }
 
 } // namespace pyr

@@ -10,6 +10,7 @@
 namespace pyr {
 
 class CCarnet;
+class CParamFile;
 class CPyrTxtWnd;
 namespace ui {
 class FrontEnd;
@@ -69,6 +70,9 @@ ui::FrontEnd& ExportFrontEnd(const PointExportJob& job);
 // The settings file of a format, checked before anything is written: false, with the message naming it
 // shown, when it does not exist or cannot be read.
 bool CheckExportSettingsFile(const PointExportJob& job);
+// The value of a key of section "Exportation" of a settings file, trimmed; its default when the key is
+// absent or empty.
+std::string ExportSetting(const CParamFile& file, const char* key, const char* defaultValue);
 // A value of the settings file that cannot be used: "Fichier de paramètres d'export <%s> :\nvaleur « %s »
 // incorrecte pour %s (valeurs possibles : %s) !" shown on the job's front end.
 void ReportBadExportSetting(const PointExportJob& job, std::string_view key, std::string_view value,
@@ -91,10 +95,16 @@ private:
 };
 
 namespace fb {
+// The section of the settings files of the point formats, and the line end they all choose.
+inline constexpr const char* kExportSection = "Exportation";
+inline constexpr const char* kKeyFinDeLigne = "FinDeLigne"; // CRLF or LF
+
 // The reasons of ExportRefusals.
 inline constexpr const char* kWhyIdentifierTooLong = "matricule de plus de %d caractères";
 inline constexpr const char* kWhyCoordinateTooLarge = "%s trop grand pour le format (%s)";
 inline constexpr const char* kWhyNoIdentifier = "point sans matricule";
+inline constexpr const char* kWhyCodeTooLong = "code de plus de %d caractères";
+inline constexpr const char* kWhyNoPosition = "point sans coordonnées";
 } // namespace fb
 
 } // namespace pyr

@@ -150,3 +150,19 @@ inline void ExpectValues(const pyr::CCarnet& carnet, int i, const std::vector<do
             EXPECT_NEAR(actual[k], expected[k], 1e-4) << "value " << k << " of element " << i;
     }
 }
+
+// A point written by hand for the tests of the exports: its identifier, X, Y, Z (kUndefined where it has
+// none) and code.
+struct SurveyPoint {
+    std::string mat;
+    double x, y, z;
+    std::string code;
+};
+
+// A GéoBase of those points, in their order.
+inline pyr::CCarnet Survey(const std::vector<SurveyPoint>& points) {
+    pyr::CCarnet carnet;
+    for (const SurveyPoint& p : points)
+        carnet.Add(std::make_unique<pyr::CPointGen>(p.mat, p.x, p.y, p.z, p.code), pyr::kKindPoint);
+    return carnet;
+}

@@ -1,5 +1,6 @@
 // The DXF writer: the file's structure, its numbers and texts, the extents it computes, and an
 // independent reading of its files by ezdxf (tests/fieldbook/dxf_check.py).
+#include "DxfTestSupport.h"
 #include "TestSupport.h"
 #include "fieldbook/DxfWriter.h"
 

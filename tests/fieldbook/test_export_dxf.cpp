@@ -1,6 +1,7 @@
 // Points of a GéoBase exported as a DXF drawing through the delivered settings file and variants of it,
 // read back by ezdxf (dxf_check.py): where each point and each text stands, on which layer; the points
 // that cannot be drawn; the settings that cannot serve, and the files that cannot be written.
+#include "DxfTestSupport.h"
 #include "FieldBookTestSupport.h"
 #include "core/Undefined.h"
 #include "fieldbook/ExportDxf.h"
@@ -9,20 +10,11 @@
 #include <gtest/gtest.h>
 #include <map>
 
-namespace dxftest {
-// In test_dxf_writer.cpp: dxf_check.py run on the file; 0 when ezdxf agrees with everything expected.
-int CheckWithEzdxf(const std::string& file, const std::string& arguments, std::string& report);
-} // namespace dxftest
-
 using namespace pyr;
 
 namespace {
 
-struct Point {
-    std::string mat;
-    double x, y, z;
-    std::string code;
-};
+using Point = SurveyPoint;
 
 // Lambert-93 points, and what a GéoBase may hold besides: two codes that make one layer name, a point
 // without altitude, one in altitude only, a zero altitude that is a value, accents, a point without code.
@@ -33,13 +25,6 @@ const std::vector<Point> kSurvey = {
     {"Éa4", 651220.5, 6862290.25, 0.0, "Bordure béton"},
     {"5", -12.5, 3.25, -1.5, ""},
 };
-
-CCarnet Survey(const std::vector<Point>& points) {
-    CCarnet carnet;
-    for (const Point& p : points)
-        carnet.Add(std::make_unique<CPointGen>(p.mat, p.x, p.y, p.z, p.code), kKindPoint);
-    return carnet;
-}
 
 std::string Shipped() {
     return std::string(PYR_SOURCE_DIR) + "/data/Config/Export_Dxf.ini";

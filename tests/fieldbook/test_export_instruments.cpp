@@ -20,11 +20,7 @@ namespace {
 
 constexpr double U = kUndefined;
 
-struct Pt {
-    std::string mat;
-    double x, y, z;
-    std::string code;
-};
+using Pt = SurveyPoint;
 
 // Lambert-93 points to the 0.1 mm; "007" is written with its zeros, which identifiers drop.
 const std::vector<Pt> kLambert = {
@@ -40,13 +36,6 @@ const std::vector<Pt> kLocal = {
     {"007", 512.3, 498.7, U, "ARBRE"},
     {"9999", U, U, 99.999, ""},
 };
-
-CCarnet Survey(const std::vector<Pt>& points) {
-    CCarnet carnet;
-    for (const Pt& p : points)
-        carnet.Add(std::make_unique<CPointGen>(p.mat, p.x, p.y, p.z, p.code), kKindPoint);
-    return carnet;
-}
 
 // What a reader gave back: each point with the code written in front of it.
 std::vector<Pt> PointsOf(const CCarnet& carnet) {

@@ -17,11 +17,7 @@ namespace fs = std::filesystem;
 
 namespace {
 
-struct Point {
-    std::string mat;
-    double x, y, z;
-    std::string code;
-};
+using Point = SurveyPoint;
 
 // Lambert-93 points to the 0.1 mm, and what a GéoBase may hold besides: negative values, a point without
 // altitude, one in altitude only, a zero that is a value, identifiers with leading zeros or accents, codes
@@ -34,13 +30,6 @@ const std::vector<Point> kSurvey = {
     {"NGF12", kUndefined, kUndefined, 58.412, "REPERE"},
     {"Éé1", 1.5, 2.5, 0.0, ""},
 };
-
-CCarnet Survey(const std::vector<Point>& points) {
-    CCarnet carnet;
-    for (const Point& p : points)
-        carnet.Add(std::make_unique<CPointGen>(p.mat, p.x, p.y, p.z, p.code), kKindPoint);
-    return carnet;
-}
 
 class ExportLayoutTest : public ::testing::Test {
 protected:

@@ -248,8 +248,9 @@ TEST_F(ExportDialog, WrongFieldsAreSaidAndNothingIsWritten) {
     d.SetTo("A9");
     d.SetOutput("");
     EXPECT_EQ(d.OnOK(frontEnd), ui::DialogResult::Failed);
-    EXPECT_EQ(MessageTexts(frontEnd), "Plage de matricules incorrecte : les deux bornes de la plage n'ont pas le "
-                                      "même préfixe !|Indiquez le nom du fichier à créer !");
+    EXPECT_EQ(MessageTexts(frontEnd),
+              "Plage de matricules incorrecte : les deux bornes de la plage n'ont pas le "
+              "même préfixe !|Indiquez le nom du fichier à créer !");
     // A source that is not there: the loading says so.
     CDlgExportPoints& absent = Open(3, false);
     absent.SetSource(dir / "absent.geo");

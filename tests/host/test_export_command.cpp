@@ -27,7 +27,8 @@ TEST_F(ExportCommand, EachCommandWritesItsFormatOverTheScopeAsked) {
 
     outcome = Run("EQuendal --geobase chantier.geo --sortie plage.txt --de A1 --a A9 --carnet 1");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
-    EXPECT_EQ(ReadBytes(dir / "plage.txt"), "QUENDAL-PC;1\nPOINT;A1;1000;2000;100;BORNE\nPOINT;A7;1020;1990;99.5\n");
+    EXPECT_EQ(ReadBytes(dir / "plage.txt"),
+              "QUENDAL-PC;1\nPOINT;A1;1000;2000;100;BORNE\nPOINT;A7;1020;1990;99.5\n");
 
     outcome = Run("EQuendal --geobase chantier.geo --sortie sel.txt --selection A7 --points 0");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
@@ -74,7 +75,8 @@ TEST_F(ExportCommand, AFormatWithoutItsSettingsFileWritesNothing) {
 }
 
 TEST_F(ExportCommand, TheEditorExportsItsGeoBaseOrItsSelection) {
-    Outcome outcome = Run("GeoEdit chantier.geo --exportation --format 3 --sortie sel.txt --selection A7 --carnet 0");
+    Outcome outcome =
+        Run("GeoEdit chantier.geo --exportation --format 3 --sortie sel.txt --selection A7 --carnet 0");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
     EXPECT_EQ(ReadBytes(dir / "sel.txt"), "QUENDAL-PC;1\nPOINT;A7;1020;1990;99.5\n");
 
