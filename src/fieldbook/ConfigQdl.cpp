@@ -144,8 +144,8 @@ bool CDlgConfigQdl::Export(const PointExportJob& job, QdlExportChoices choices, 
     std::error_code error;
     const bool fresh = !job.append || std::filesystem::file_size(job.path, error) == 0 || error;
     const std::vector<bool> inScope = ElementsInScope(job);
-    std::string out;
-    out.reserve(static_cast<std::size_t>(records.GetSize()) * 48);
+    ExportFile file(job);
+    std::string& out = file.Text();
     if (fresh) AppendHeader(out);
     int count = 0;
     for (int i = 0; i < records.GetSize(); ++i) {
@@ -153,9 +153,10 @@ bool CDlgConfigQdl::Export(const PointExportJob& job, QdlExportChoices choices, 
         if (!inScope[static_cast<std::size_t>(i)] || !Chosen(kind, choices)) continue;
         AppendRecord(out, *records.GetAt(i), kind);
         ++count;
+        file.Flush();
     }
     if (written) *written = count;
-    return WriteExportFile(job, out);
+    return file.Commit();
 }
 
 bool CDlgConfigQdl::Export(const CCarnet& records, const std::string& path, const char* mode,

@@ -330,6 +330,10 @@ void DxfWriter::Coordinates(Buffer& out, int code, const Point3& p) const {
 
 bool DxfWriter::Point(int layer, Point3 at) {
     if (!Finite(at)) return false;
+    if (Measuring()) {
+        m_extents.Add(at);
+        return true;
+    }
     Buffer& out = Body();
     Start(out, "POINT", layer);
     Coordinates(out, 10, at);
@@ -340,6 +344,8 @@ bool DxfWriter::Point(int layer, Point3 at) {
 bool DxfWriter::Text(int layer, Point3 at, std::string_view text, const TextStyle& style) {
     if (!Finite(at) || !std::isfinite(style.height) || !std::isfinite(style.rotationGrads)) return false;
     if (text.empty()) return true;
+    AddTextExtents(at, text, style);
+    if (Measuring()) return true;
     Buffer& out = Body();
     Start(out, "TEXT", layer);
     const bool aligned = style.horizontal != HAlign::Left || style.vertical != VAlign::Baseline;
@@ -363,6 +369,10 @@ bool DxfWriter::Text(int layer, Point3 at, std::string_view text, const TextStyl
         if (style.vertical != VAlign::Baseline) Group(out, 73, static_cast<int>(style.vertical));
     }
 
+    return true;
+}
+
+void DxfWriter::AddTextExtents(const Point3& at, std::string_view text, const TextStyle& style) {
     // The extents take the text's box, estimated, turned about its insertion point.
     const double width = kCharacterWidth * style.height * static_cast<double>(Utf8Length(text));
     const double left = style.horizontal == HAlign::Left     ? 0.0
@@ -379,26 +389,31 @@ bool DxfWriter::Text(int layer, Point3 at, std::string_view text, const TextStyl
     for (const double u : {left, left + width})
         for (const double v : {bottom, bottom + style.height})
             extents.Add(Point3{at.x + u * m_cos - v * m_sin, at.y + u * m_sin + v * m_cos, at.z});
-    return true;
 }
 
 bool DxfWriter::Line(int layer, Point3 from, Point3 to) {
     if (!Finite(from) || !Finite(to)) return false;
+    Extents().Add(from);
+    Extents().Add(to);
+    if (Measuring()) return true;
     Buffer& out = Body();
     Start(out, "LINE", layer);
     Coordinates(out, 10, from);
     Coordinates(out, 11, to);
-    Extents().Add(from);
-    Extents().Add(to);
     return true;
 }
 
 bool DxfWriter::Polyline(int layer, std::span<const Point3> vertices, bool closed, bool is3D) {
     if (!std::all_of(vertices.begin(), vertices.end(), Finite)) return false;
     if (vertices.size() < 2) return true;
-    Buffer& out = Body();
     Box& extents = Extents();
     const double elevation = vertices.front().z;
+    if (Measuring()) {
+        for (const Point3& vertex : vertices)
+            extents.Add(Point3{vertex.x, vertex.y, is3D ? vertex.z : elevation});
+        return true;
+    }
+    Buffer& out = Body();
     Start(out, "POLYLINE", layer);
     Group(out, 66, 1);
     Coordinates(out, 10, {0.0, 0.0, is3D ? 0.0 : elevation});
@@ -415,7 +430,7 @@ bool DxfWriter::Polyline(int layer, std::span<const Point3> vertices, bool close
 }
 
 bool DxfWriter::BeginBlock(std::string_view name, Point3 base) {
-    if (m_inBlock || !Finite(base)) return false;
+    if (m_inBlock || m_sink || !Finite(base)) return false;
     std::string valid = ValidName(name);
     if (std::any_of(m_blocks.begin(), m_blocks.end(), [&](const Block& b) { return b.name == valid; }))
         return false;
@@ -434,16 +449,18 @@ bool DxfWriter::Insert(int layer, std::string_view block, Point3 at, double scal
     const auto found =
         std::find_if(m_blocks.begin(), m_blocks.end(), [&](const Block& b) { return b.name == valid; });
     if (found == m_blocks.end()) return false;
-    Buffer& out = m_entities;
-    Start(out, "INSERT", layer);
-    Group(out, 2, valid);
-    Coordinates(out, 10, at);
-    if (scale != 1.0) {
-        Number(out, 41, scale);
-        Number(out, 42, scale);
-        Number(out, 43, scale);
+    if (!m_measuring) {
+        Buffer& out = m_entities;
+        Start(out, "INSERT", layer);
+        Group(out, 2, valid);
+        Coordinates(out, 10, at);
+        if (scale != 1.0) {
+            Number(out, 41, scale);
+            Number(out, 42, scale);
+            Number(out, 43, scale);
+        }
+        if (rotationGrads != 0.0) Number(out, 50, rotationGrads * kDegreesPerGrad);
     }
-    if (rotationGrads != 0.0) Number(out, 50, rotationGrads * kDegreesPerGrad);
 
     // The block's box, moved from its base point to the insertion point, scaled and turned.
     if (!found->extents.any) {
@@ -610,9 +627,29 @@ void DxfWriter::AppendBlocks(Buffer& out) const {
     Group(out, 0, "ENDSEC");
 }
 
-std::string_view DxfWriter::Finish() {
+void DxfWriter::Measure() {
+    m_measuring = true;
+}
+
+void DxfWriter::Stream(std::function<void(std::string_view)> sink) {
     EndBlock();
     Buffer head;
+    AppendHead(head);
+    sink(head);
+    m_sink = std::move(sink);
+    m_measuring = false;
+    m_entities.clear();
+    m_entities.reserve(kStreamChunk + (kStreamChunk >> 4));
+}
+
+void DxfWriter::Flush() {
+    if (m_sink && m_entities.size() >= kStreamChunk) {
+        m_sink(m_entities);
+        m_entities.clear();
+    }
+}
+
+void DxfWriter::AppendHead(Buffer& head) const {
     std::size_t blocks = 0;
     for (const Block& block : m_blocks)
         blocks += block.body.size() + 128;
@@ -622,10 +659,21 @@ std::string_view DxfWriter::Finish() {
     AppendBlocks(head);
     Group(head, 0, "SECTION");
     Group(head, 2, "ENTITIES");
-    m_entities.insert(0, head);
+}
+
+std::string_view DxfWriter::Finish() {
+    EndBlock();
+    if (!m_sink) {
+        Buffer head;
+        AppendHead(head);
+        m_entities.insert(0, head);
+    }
     Group(m_entities, 0, "ENDSEC");
     Group(m_entities, 0, "EOF");
-    return m_entities;
+    if (!m_sink) return m_entities;
+    m_sink(m_entities);
+    m_entities.clear();
+    return {};
 }
 
 } // namespace pyr::dxf

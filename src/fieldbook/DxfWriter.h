@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <memory_resource>
 #include <span>
 #include <string>
@@ -15,7 +16,9 @@
 // The file is text with CRLF line ends; its numbers always have a '.' as decimal point, whatever the
 // user's locale. Coordinates are in metres, X east, Y north, Z up. The header gives the extents of
 // everything drawn, and the header and the tables come before the entities: entities are gathered in
-// memory and the whole file is assembled by Finish().
+// memory and the whole file is assembled by Finish(). A drawing too big to stand whole in memory is drawn
+// twice instead: once measured (Measure: the extents and the layers found, nothing written), then
+// streamed (Stream: the header and the tables handed out at once, then the entities as they are drawn).
 //
 // Texts are written in Windows-1252, the code page that the header announces ($DWGCODEPAGE ANSI_1252);
 // a character outside it goes as \U+XXXX, the escape that CAD programs read back, and control
@@ -111,6 +114,17 @@ public:
     // entities' buffer, a million entities not copied into a second one.
     std::string_view Finish();
 
+    // ---- A drawing drawn twice, measured and then streamed.
+
+    // From now on the entities of the model space only count for the extents and the layers.
+    void Measure();
+    // Hands `sink` the header, the tables and the blocks of what was measured (blocks must be defined
+    // by then), then the entities drawn again after it: by Flush once they reach a chunk, the rest and
+    // the end of the file by Finish, which then returns nothing.
+    void Stream(std::function<void(std::string_view)> sink);
+    // Called after each entity, or group of them, while streaming.
+    void Flush();
+
 private:
     struct Box {
         bool any = false;
@@ -134,7 +148,14 @@ private:
         Box extents;
     };
 
+    static constexpr std::size_t kStreamChunk = std::size_t{1} << 20;
+
     Buffer& Body() { return m_inBlock ? m_blocks.back().body : m_entities; }
+    // Whether the entity being drawn only counts for the extents: measured, outside a block.
+    bool Measuring() const { return m_measuring && !m_inBlock; }
+    void AddTextExtents(const Point3& at, std::string_view text, const TextStyle& style);
+    // HEADER, TABLES, BLOCKS and the start of ENTITIES.
+    void AppendHead(Buffer& head) const;
     Box& Extents() { return m_inBlock ? m_blocks.back().extents : m_extents; }
     void Start(Buffer& out, std::string_view kind, int layer) const;
     void Coordinates(Buffer& out, int code, const Point3& p) const;
@@ -160,6 +181,8 @@ private:
     Buffer m_heightText{"0"};
     int m_pointMode = 0;
     double m_pointSize = 0.0;
+    bool m_measuring = false;
+    std::function<void(std::string_view)> m_sink;
 };
 
 } // namespace pyr::dxf

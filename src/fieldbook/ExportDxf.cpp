@@ -259,9 +259,6 @@ bool CDlgConfigDxf::Write(const PointExportJob& job) const {
 
     dxf::DxfWriter writer;
     writer.SetPointDisplay(s.pointMode, s.pointSize);
-    // About 70 bytes for a POINT and 90 for each text, with a margin: the entities' buffer is made once.
-    const int texts = int{s.writeIdentifier} + int{s.writeAltitude} + int{s.writeCode};
-    writer.Reserve(points.size() * static_cast<std::size_t>(80 + 110 * texts));
     LayerChoice layers(s, writer);
     ExportRefusals refusals(job);
 
@@ -272,44 +269,57 @@ bool CDlgConfigDxf::Write(const PointExportJob& job) const {
     const dxf::TextStyle style{.height = s.textHeight, .rotationGrads = s.textRotationGrads};
     const double lineStep = kLineSpacing * s.textHeight;
     std::string altitude;
-    int drawn = 0;
 
+    // Every point drawn, the points left out told when `tell`; the number drawn.
     const CCarnet& carnet = *job.carnet;
-    for (const int index : points) {
-        const auto& point = static_cast<const CPointGen&>(*carnet.GetAt(index));
-        const dxf::Point3 at{point.x(), point.y(), point.hasZ() ? point.z() : 0.0};
-        if (!point.hasXY() || !std::isfinite(at.x) || !std::isfinite(at.y) || !std::isfinite(at.z)) {
-            refusals.Refuse(point.mat(), fb::kWhyNoPlanimetry);
-            continue;
+    const auto drawPoints = [&](bool tell) {
+        int drawn = 0;
+        for (const int index : points) {
+            const auto& point = static_cast<const CPointGen&>(*carnet.GetAt(index));
+            const dxf::Point3 at{point.x(), point.y(), point.hasZ() ? point.z() : 0.0};
+            if (!point.hasXY() || !std::isfinite(at.x) || !std::isfinite(at.y) || !std::isfinite(at.z)) {
+                if (tell) refusals.Refuse(point.mat(), fb::kWhyNoPlanimetry);
+                continue;
+            }
+            // The layer is made for a point drawn: a code whose points are all left out makes none.
+            const PointLayers& layer = layers.For(point.sym());
+            writer.Point(layer.point, at);
+            ++drawn;
+            double across = s.textOffsetY;
+            const auto text = [&](int textLayer, std::string_view words) {
+                const dxf::Point3 place{at.x + s.textOffsetX * cosine - across * sine,
+                                        at.y + s.textOffsetX * sine + across * cosine, at.z};
+                writer.Text(textLayer, place, words, style);
+                across -= lineStep;
+            };
+            if (s.writeIdentifier && !point.mat().empty()) text(layer.identifier, point.mat());
+            if (s.writeAltitude && point.hasZ()) {
+                altitude.clear();
+                AppendFixedShown(altitude, point.z(), s.altitudeDecimals);
+                text(layer.altitude, altitude);
+            }
+            if (s.writeCode && !point.sym().empty()) text(layer.code, point.sym());
+            writer.Flush();
         }
-        // The layer is made for a point drawn: a code whose points are all left out makes none.
-        const PointLayers& layer = layers.For(point.sym());
-        writer.Point(layer.point, at);
-        ++drawn;
-        double across = s.textOffsetY;
-        const auto text = [&](int textLayer, std::string_view words) {
-            const dxf::Point3 place{at.x + s.textOffsetX * cosine - across * sine,
-                                    at.y + s.textOffsetX * sine + across * cosine, at.z};
-            writer.Text(textLayer, place, words, style);
-            across -= lineStep;
-        };
-        if (s.writeIdentifier && !point.mat().empty()) text(layer.identifier, point.mat());
-        if (s.writeAltitude && point.hasZ()) {
-            altitude.clear();
-            AppendFixedShown(altitude, point.z(), s.altitudeDecimals);
-            text(layer.altitude, altitude);
-        }
-        if (s.writeCode && !point.sym().empty()) text(layer.code, point.sym());
-    }
+        return drawn;
+    };
 
-    bool written = false;
-    if (drawn == 0) {
+    // Measured first, so that the header and the tables that come first give the extents and the layers
+    // of everything drawn; then drawn again into the file, a megabyte at a time.
+    writer.Measure();
+    if (drawPoints(false) == 0) {
+        drawPoints(true);
         ExportFrontEnd(job).ReportFailure(Sprintf(fb::kMsgNoPointToDraw, job.path.c_str()));
-    } else {
-        PointExportJob whole = job;
-        whole.append = false;
-        written = WriteExportFile(whole, writer.Finish());
+        refusals.Summarise();
+        return false;
     }
+    PointExportJob whole = job; // a drawing is never completed
+    whole.append = false;
+    ExportFile file(whole);
+    writer.Stream([&file](std::string_view bytes) { file.Write(bytes); });
+    drawPoints(true);
+    writer.Finish();
+    const bool written = file.Commit();
     refusals.Summarise();
     return written;
 }

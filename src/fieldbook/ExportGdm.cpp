@@ -65,10 +65,8 @@ bool dll_ExportSpectra(const PointExportJob& job) {
 
     const CCarnet& carnet = *job.carnet;
     const std::vector<int> points = ExportedPoints(job);
-    std::string text;
-    // Five lines of a label, a coordinate of Lambert-93 size and its line end, plus the identifier and
-    // the code.
-    text.reserve(points.size() * (5 * (4 + 9 + decimals + 2) + 32));
+    ExportFile file(job);
+    std::string& text = file.Text();
     // The units of the values that follow, angles in grads (none written), distances in metres or feet,
     // temperature and pressure in their first units. It heads each export, a completed file included: it
     // holds for what follows it, whatever unit the file stated before.
@@ -107,8 +105,9 @@ bool dll_ExportSpectra(const PointExportJob& job) {
             coordinate("37", point.y());
         }
         if (point.hasZ()) coordinate("39", point.z());
+        file.Flush();
     }
-    if (!WriteExportFile(job, text)) return false;
+    if (!file.Commit()) return false;
     refusals.Summarise();
     return true;
 }

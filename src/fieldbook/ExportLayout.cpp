@@ -396,8 +396,8 @@ bool WritePoints(const PointExportJob& job, const RecordLayout& layout, Distance
     Writer writer(layout, unit);
     const std::vector<int> points = ExportedPoints(job);
     const FileEnd end = job.append ? LookAtEnd(job.path) : FileEnd{};
-    std::string text;
-    text.reserve(points.size() * writer.LineEstimate() + 1024);
+    ExportFile file(job);
+    std::string& text = file.Text();
     if (!end.lineEnded) text += '\n'; // the file's last line is not ours to lengthen
     // The header lines head the file only; a completed file has them already.
     if (end.empty) writer.AppendHeader(text, layout.headerLines);
@@ -406,8 +406,9 @@ bool WritePoints(const PointExportJob& job, const RecordLayout& layout, Distance
     for (int index : points) {
         const auto& point = static_cast<const CPointGen&>(*job.carnet->GetAt(index));
         if (!Writable(point, why) || !writer.AppendPoint(text, point, why)) refusals.Refuse(point.mat(), why);
+        file.Flush();
     }
-    if (!WriteExportFile(job, text)) return false;
+    if (!file.Commit()) return false;
     refusals.Summarise();
     return true;
 }

@@ -193,17 +193,17 @@ bool CDlgConfigLeica::Export(const PointExportJob& job) {
 
     const CCarnet& carnet = *job.carnet;
     const std::vector<int> points = ExportedPoints(job);
-    std::string text;
-    GsiWriter writer(*settings, text);
-    text.reserve(points.size() * LargestBlock(writer.Width()));
+    ExportFile file(job);
+    GsiWriter writer(*settings, file.Text());
     ExportRefusals refusals(job);
     std::string why;
     for (int index : points) {
         const auto& point = static_cast<const CPointGen&>(*carnet.GetAt(index));
         if (!writer.Append(point, why)) refusals.Refuse(point.mat(), why);
+        file.Flush();
     }
     // A GSI file has no header: a completed file simply goes on with the new blocks.
-    if (!WriteExportFile(job, text)) return false;
+    if (!file.Commit()) return false;
     refusals.Summarise();
     return true;
 }

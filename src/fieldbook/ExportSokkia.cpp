@@ -181,14 +181,17 @@ bool DlgCfgSok::Export(const PointExportJob& job) {
 
     const CCarnet& carnet = *job.carnet;
     const std::vector<int> points = ExportedPoints(job);
-    std::string text;
+    ExportFile file(job);
+    std::string& text = file.Text();
     SdrWriter writer(*settings, text);
-    text.reserve((points.size() + 3) * (writer.RecordLength() + 2) + 64);
+    unsigned sum = 0;
     if (settings->framed) {
         text += kSTX;
         text += writer.Eol();
+        // The checksum counts the records, between the two framing lines.
+        file.Drain();
+        file.watch = [&sum](std::string_view records) { sum = (sum + Checksum(records)) % kChecksumModulo; };
     }
-    const std::size_t records = text.size();
     // The header heads a new or empty file only: the records of a completed file follow its own.
     if (!job.append || !FileHoldsData(job.path)) writer.AppendHeader();
     ExportRefusals refusals(job);
@@ -196,14 +199,16 @@ bool DlgCfgSok::Export(const PointExportJob& job) {
     for (int index : points) {
         const auto& point = static_cast<const CPointGen&>(*carnet.GetAt(index));
         if (!writer.AppendPoint(point, why)) refusals.Refuse(point.mat(), why);
+        file.Flush();
     }
     if (settings->framed) {
-        const unsigned sum = Checksum(std::string_view(text).substr(records));
+        file.Drain();
+        file.watch = nullptr;
         text += kETX;
         text += Sprintf("%05u", sum);
         text += writer.Eol();
     }
-    if (!WriteExportFile(job, text)) return false;
+    if (!file.Commit()) return false;
     refusals.Summarise();
     return true;
 }

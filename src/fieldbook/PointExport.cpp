@@ -89,6 +89,32 @@ ui::FrontEnd& ExportFrontEnd(const PointExportJob& job) {
     return job.parent ? *job.parent : ui::ApplicationFrontEnd();
 }
 
+ExportFile::ExportFile(const PointExportJob& job)
+    : m_job(job),
+      m_writer(job.path, job.append ? SafeFileWriter::Start::CopyOfFile : SafeFileWriter::Start::Empty) {
+    m_text.reserve(kChunk + (kChunk >> 4));
+}
+
+void ExportFile::Drain() {
+    if (m_text.empty()) return;
+    if (watch) watch(m_text);
+    m_writer.Write(m_text);
+    m_text.clear();
+}
+
+void ExportFile::Write(std::string_view bytes) {
+    Drain();
+    if (watch) watch(bytes);
+    m_writer.Write(bytes);
+}
+
+bool ExportFile::Commit() {
+    Drain();
+    if (m_writer.Error() == 0 && m_writer.Commit()) return true;
+    ExportFrontEnd(m_job).ReportFailure(m_writer.FailureText());
+    return false;
+}
+
 bool WriteExportFile(const PointExportJob& job, std::string_view text) {
     SafeFileWriter writer(job.path,
                           job.append ? SafeFileWriter::Start::CopyOfFile : SafeFileWriter::Start::Empty);

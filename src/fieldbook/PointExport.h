@@ -1,5 +1,8 @@
 #pragma once
 
+#include "core/SafeFile.h"
+
+#include <functional>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -63,6 +66,34 @@ std::vector<bool> ElementsInScope(const PointExportJob& job);
 // `append` follows its present contents. False when it cannot: the message, naming the file and the
 // reason, is shown on the job's front end, and the file is left as it was.
 bool WriteExportFile(const PointExportJob& job, std::string_view text);
+
+// The file of an export written as it is made, a megabyte at a time, so that a million points never
+// stand whole in memory: the writer appends its records to Text() and calls Flush() after each. The file
+// is replaced, or with `append` completed, whole or not at all, at Commit.
+class ExportFile {
+public:
+    explicit ExportFile(const PointExportJob& job);
+    std::string& Text() { return m_text; }
+    // Writes what was made once it reaches a chunk.
+    void Flush() {
+        if (m_text.size() >= kChunk) Drain();
+    }
+    // Writes what was made now.
+    void Drain();
+    // Writes bytes made elsewhere, after what was made here.
+    void Write(std::string_view bytes);
+    // Sees every piece written, in order (a checksum of the records).
+    std::function<void(std::string_view)> watch;
+    // Writes the rest and puts the file in place. False when it cannot: the message, naming the file and
+    // the reason, is shown on the job's front end, and the file is left as it was.
+    bool Commit();
+
+private:
+    static constexpr std::size_t kChunk = std::size_t{1} << 20;
+    const PointExportJob& m_job;
+    SafeFileWriter m_writer;
+    std::string m_text;
+};
 
 // The front end on which the job's messages are shown.
 ui::FrontEnd& ExportFrontEnd(const PointExportJob& job);

@@ -315,6 +315,50 @@ TEST(DxfWriter, EntitiesCarryTheirGroups) {
     EXPECT_EQ(blocks[2].kind, "ENDBLK");
 }
 
+TEST(DxfWriter, ADrawingMeasuredThenStreamedIsTheSameFile) {
+    // Layers, every kind of entity, a block and its insertion, enough texts to fill several chunks.
+    const auto draw = [](DxfWriter& writer) {
+        const int road = writer.Layer("route", kBlue);
+        const std::array<Point3, 3> vertices = {{{0, 0, 1}, {10, 0, 2}, {10, 10, 3}}};
+        writer.Polyline(road, vertices, true, true);
+        writer.Line(0, {-3, 7, -1}, {30, -4, 0});
+        writer.Insert(writer.Layer("bornes", kRed), "BORNE", {200, 0, 0}, 2.0, 100.0);
+        for (int i = 0; i < 40000; ++i) {
+            const int layer = writer.Layer(i % 3 == 0 ? "mur" : "arbre");
+            writer.Point(layer, {651000.0 + i * 0.25, 6862000.0 - i * 0.5, 40.0 + i % 7});
+            writer.Text(layer, {651000.0 + i * 0.25, 6862000.5 - i * 0.5, 40.0}, "P" + std::to_string(i),
+                        {.height = 0.5, .rotationGrads = 12.5});
+            writer.Flush();
+        }
+    };
+    const auto defineBlock = [](DxfWriter& writer) {
+        ASSERT_TRUE(writer.BeginBlock("borne", {1, 1, 0}));
+        writer.Line(0, {0, 0, 0}, {2, 0, 0});
+        writer.EndBlock();
+    };
+    DxfWriter whole;
+    defineBlock(whole);
+    draw(whole);
+    const std::string expected(whole.Finish());
+
+    DxfWriter streamed;
+    defineBlock(streamed);
+    streamed.Measure();
+    draw(streamed);
+    std::string written;
+    int pieces = 0;
+    streamed.Stream([&](std::string_view bytes) {
+        written += bytes;
+        ++pieces;
+    });
+    EXPECT_FALSE(streamed.BeginBlock("autre")) << "blocks come before the stream";
+    draw(streamed);
+    EXPECT_TRUE(streamed.Finish().empty());
+    EXPECT_GT(pieces, 2);
+    EXPECT_EQ(written.size(), expected.size());
+    EXPECT_TRUE(written == expected);
+}
+
 TEST(DxfWriter, RefusesWhatItCannotDraw) {
     DxfWriter writer;
     const double nan = std::nan("");
