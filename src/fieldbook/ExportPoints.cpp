@@ -345,6 +345,11 @@ ui::DialogResult CDlgExportPoints::OnOK(ui::FrontEnd& frontEnd) {
     job.append = append;
     job.parent = &frontEnd;
     job.txt = &txt;
+    // An empty GéoBase, a range or a selection that holds nothing of what is written: no file is made.
+    if (!ScopeHoldsSomething(job)) {
+        frontEnd.MessageBox(exp::kMsgNothingToExport, ui::kCaption, ui::kIconWarning);
+        return ui::DialogResult::Failed;
+    }
 
     bool done = false;
     switch (kFormats[m_format].format) {
@@ -365,6 +370,17 @@ ui::DialogResult CDlgExportPoints::OnOK(ui::FrontEnd& frontEnd) {
         txt.Print(exp::kMsgExported, m_output.c_str());
     if (m_view && FileExists(m_output)) frontEnd.ShowFile(m_output);
     return ui::DialogResult::Ok;
+}
+
+bool CDlgExportPoints::ScopeHoldsSomething(const PointExportJob& job) const {
+    const CCarnet& carnet = *job.carnet;
+    const bool points = !ElementFormat() || m_writePoints;
+    const bool observations = ElementFormat() && m_writeCarnet && WriteCarnetEnabled();
+    const std::vector<bool> inScope = ElementsInScope(job);
+    for (int i = 0; i < carnet.GetSize(); ++i)
+        if (inScope[static_cast<std::size_t>(i)] && (carnet.GetType(i) == kKindPoint ? points : observations))
+            return true;
+    return false;
 }
 
 bool CDlgExportPoints::ExportGeoBase(const CCarnet& carnet, const PointExportJob& job, ui::FrontEnd& frontEnd,

@@ -87,6 +87,8 @@ public:
     // ---- What the dialog shows
     static std::vector<std::string> FormatList();
     int Format() const { return m_format; }
+    // The command imposes its format: the list shows it and cannot change it.
+    bool FormatImposed() const { return m_imposedFormat.has_value(); }
     bool ElementFormat() const { return IsElementFormat(m_format); }
     bool SourceVisible() const { return m_carnet == nullptr; }
     bool SelectedEnabled() const { return m_selection != nullptr && !m_selection->empty(); }
@@ -151,6 +153,8 @@ private:
     bool WriteSettings(ui::FrontEnd& frontEnd) const;
     void DeriveOutput();
     const std::string& SourcePath() const;
+    // Whether the job's scope holds an element of the kinds written.
+    bool ScopeHoldsSomething(const PointExportJob& job) const;
     // The export proper, once the file mode is settled.
     bool ExportGeoBase(const CCarnet& carnet, const PointExportJob& job, ui::FrontEnd& frontEnd,
                        CPyrTxtWnd& txt);

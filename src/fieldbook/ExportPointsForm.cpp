@@ -73,6 +73,7 @@ ui::ControlState CDlgExportPointsForm::State(int id) const {
     case kFormat:
         state.items = CDlgExportPoints::FormatList();
         state.current = m_dialog.Format();
+        state.enabled = !m_dialog.FormatImposed();
         break;
     case kParamFile:
         state.text = m_dialog.ParamFile();

@@ -27,9 +27,9 @@ inline constexpr const char* kDefaultDxf = "Export_Dxf.ini";
 // ---- The dialog
 inline constexpr const char* kCaption = "Exportation de points";
 inline constexpr const char* kLabelOutput = "&Fichier à créer :";
-inline constexpr const char* kLabelSource = "&GéoBase à exporter :";
+inline constexpr const char* kLabelSource = "GéoBase à e&xporter :";
 inline constexpr const char* kLabelFormat = "F&ormat :";
-inline constexpr const char* kLabelParamFile = "&Paramètres du format :";
+inline constexpr const char* kLabelParamFile = "Paramètres du for&mat :";
 inline constexpr const char* kWritePoints = "Écrire les &points";
 inline constexpr const char* kWriteCarnet = "Écrire les observations du &carnet";
 inline constexpr const char* kGroupElements = "Eléments à exporter";

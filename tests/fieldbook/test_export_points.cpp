@@ -5,6 +5,7 @@
 #include "fieldbook/ExportCommand.h"
 #include "fieldbook/ExportPoints.h"
 #include "fieldbook/ExportPointsForm.h"
+#include "fieldbook/QuendalReader.h"
 #include "geobase/GeoFile.h"
 #include "settings/ParamStore.h"
 
@@ -256,6 +257,45 @@ TEST_F(ExportDialog, WrongFieldsAreSaidAndNothingIsWritten) {
     absent.SetSource(dir / "absent.geo");
     EXPECT_EQ(absent.OnOK(frontEnd), ui::DialogResult::Failed);
     EXPECT_FALSE(fs::exists(dir / "absent.txt"));
+}
+
+TEST_F(ExportDialog, AGeoBaseWithoutAnythingToWriteMakesNoFile) {
+    carnet = CCarnet();
+    carnet.SetPathName(geo);
+    for (int format : {0, 1, 3, 7}) {
+        EXPECT_EQ(Open(format).OnOK(frontEnd), ui::DialogResult::Failed) << format;
+        EXPECT_EQ(frontEnd.messages.back().text, "Il n'y a rien à exporter !");
+    }
+    // Observations only: nothing for a point format, nor for an element format without them.
+    carnet.Add(std::make_unique<CStation>("S1", 1.5), kKindStation);
+    EXPECT_EQ(Open(1).OnOK(frontEnd), ui::DialogResult::Failed);
+    CDlgExportPoints& elements = Open(3);
+    elements.SetWriteCarnet(false);
+    EXPECT_EQ(elements.OnOK(frontEnd), ui::DialogResult::Failed);
+    for (const std::string& name : FileNames(dir.Root()))
+        EXPECT_TRUE(name == "inst" || name == "Pyralis.ini") << name;
+}
+
+TEST_F(ExportDialog, EveryPointGoesOutInOrderTwinsIncludedAndQuendalGivesBackTheObservations) {
+    // A point measured twice keeps both of its elements.
+    carnet.Add(std::make_unique<CPointGen>("A1", 1000.002, 1999.998, 100.001), kKindPoint);
+    CDlgExportPoints& delimited = Open(1);
+    delimited.SetParamFile(std::string(PYR_SOURCE_DIR) + "/data/Config/Param_Export.sep");
+    ASSERT_EQ(delimited.OnOK(frontEnd), ui::DialogResult::Ok) << MessageTexts(frontEnd);
+    EXPECT_EQ(ReadBytes(dir / "job.txt"),
+              "PT;A1;1000;2000;100;BORNE\nPT;A007;1010;2010;101;\nPT;A10;1020;1990;;\n"
+              "PT;B5;990;2005;99;\nPT;A1;1000.002;1999.998;100.001;\n");
+
+    frontEnd.answers = {ui::Answer::Yes};
+    ASSERT_EQ(Open(3).OnOK(frontEnd), ui::DialogResult::Ok);
+    ReaderRun<CQuendalReader> run;
+    const CCarnet& read = run.Read(ReadBytes(dir / "job.txt"));
+    std::string original, back;
+    for (int i = 0; i < carnet.GetSize(); ++i)
+        original += ElementLine(*carnet.GetAt(i), carnet.GetType(i)) + "\n";
+    for (int i = 0; i < read.GetSize(); ++i)
+        back += ElementLine(*read.GetAt(i), read.GetType(i)) + "\n";
+    EXPECT_EQ(back, original);
 }
 
 TEST_F(ExportDialog, ACommandLineSelectionNamesThePointsAndTheObservationsOfItsIdentifiers) {
