@@ -85,5 +85,24 @@ TEST_F(ExportCommand, TheEditorExportsItsGeoBaseOrItsSelection) {
     EXPECT_EQ(SavedGeoBase(dir / "copie.geo").GetSize(), 5);
 }
 
+class ExportCommandAsUser : public ExportCommand {};
+
+TEST_F(ExportCommandAsUser, AFileOrAFolderThatMayNotBeWrittenIsNamedAndLeftAsItWas) {
+    SKIP_WHEN_ROOT();
+    std::filesystem::create_directory(dir / "ferme");
+    ASSERT_EQ(chmod((dir / "ferme").c_str(), 0555), 0);
+    Outcome outcome = Run("ESokkia --geobase chantier.geo --sortie ferme/pts.sdr");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.err, "ferme/pts.sdr")) << outcome.err;
+    EXPECT_FALSE(std::filesystem::exists(dir / "ferme/pts.sdr"));
+
+    WriteBytes(dir / "pts.txt", "QUENDAL-PC;1\n");
+    ASSERT_EQ(chmod((dir / "pts.txt").c_str(), 0444), 0);
+    outcome = Run("EQuendal --geobase chantier.geo --sortie pts.txt --completer");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.err, "pts.txt")) << outcome.err;
+    EXPECT_EQ(ReadBytes(dir / "pts.txt"), "QUENDAL-PC;1\n");
+}
+
 } // namespace
 } // namespace pyr::test
