@@ -5,6 +5,7 @@
 #include "TestSupport.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/ParamDriver.h"
+#include "fieldbook/PointExport.h"
 #include "geobase/Carnet.h"
 #include "ui/PyrTxtWnd.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -165,4 +166,17 @@ inline pyr::CCarnet Survey(const std::vector<SurveyPoint>& points) {
     for (const SurveyPoint& p : points)
         carnet.Add(std::make_unique<pyr::CPointGen>(p.mat, p.x, p.y, p.z, p.code), pyr::kKindPoint);
     return carnet;
+}
+
+// The export of the points of `carnet` through the settings file to the output, its messages on
+// `frontEnd` and its lines in `txt`.
+inline pyr::PointExportJob ExportJob(const pyr::CCarnet& carnet, std::string settings, std::string output,
+                                     pyr::ui::FrontEnd& frontEnd, pyr::CPyrTxtWnd& txt) {
+    pyr::PointExportJob job;
+    job.carnet = &carnet;
+    job.paramFile = std::move(settings);
+    job.path = std::move(output);
+    job.parent = &frontEnd;
+    job.txt = &txt;
+    return job;
 }

@@ -58,13 +58,7 @@ protected:
     }
 
     PointExportJob Job(const std::string& settings, const std::string& output) {
-        PointExportJob job;
-        job.carnet = &survey;
-        job.paramFile = settings;
-        job.path = output;
-        job.parent = &frontEnd;
-        job.txt = &txt;
-        return job;
+        return ExportJob(survey, settings, output, frontEnd, txt);
     }
 
     // ezdxf's reading of the file agrees with the lists: points "x y z LAYER", texts "LAYER\ttext\tx y",

@@ -79,12 +79,7 @@ struct ExportRun {
     PointExportJob job;
 
     ExportRun(const std::vector<Pt>& points, std::string settings, const char* file = "points.out")
-        : carnet(Survey(points)) {
-        job.carnet = &carnet;
-        job.paramFile = dir / "export.ini";
-        job.path = dir / file;
-        job.parent = &frontEnd;
-        job.txt = &txt;
+        : carnet(Survey(points)), job(ExportJob(carnet, dir / "export.ini", dir / file, frontEnd, txt)) {
         WriteBytes(job.paramFile, "[Exportation]\n" + settings);
     }
     std::string Written() const { return ReadBytes(job.path); }

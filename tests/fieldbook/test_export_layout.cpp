@@ -48,13 +48,7 @@ protected:
     }
 
     PointExportJob Job(const std::string& settings, const std::string& output) {
-        PointExportJob job;
-        job.carnet = &survey;
-        job.paramFile = settings;
-        job.path = output;
-        job.parent = &frontEnd;
-        job.txt = &txt;
-        return job;
+        return ExportJob(survey, settings, output, frontEnd, txt);
     }
 
     static bool Export(FieldBookFormat format, const PointExportJob& job) {
