@@ -1,0 +1,108 @@
+// A traverse gathered from a GéoBase that a perfect instrument measured: the kind read from what is known,
+// the legs measured both ways, and the stations placed back where they were.
+#include "calc/TraverseGathering.h"
+#include "calc/test_v0_geometry.h"
+#include "core/Angles.h"
+
+#include <gtest/gtest.h>
+
+namespace pyr::test {
+namespace {
+
+constexpr double kTenthMm = 1e-4;
+
+const Place kA{651200.000, 6862300.000, 52.310}, kB{651688.731, 6862554.562, 49.870};
+const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 55.021};
+const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
+constexpr double kHi = 1.55, kHp = 1.3;
+
+// A, B and their references known; T1 and T2 set up in between, each instrument oriented its own way.
+CCarnet Job(bool endKnown = true) {
+    CCarnet carnet;
+    AddPoint(carnet, "A", kA);
+    AddPoint(carnet, "R1", kR1);
+    if (endKnown) AddPoint(carnet, "B", kB);
+    AddPoint(carnet, "R2", kR2);
+    AddStation(carnet, "A", kHi);
+    AddSighting(carnet, "R1", kA, kHi, kR1, kHp, 12.5);
+    AddSighting(carnet, "T1", kA, kHi, kT1, kHp, 12.5, kKindMesure);
+    AddStation(carnet, "T1", kHi);
+    AddSighting(carnet, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
+    AddSighting(carnet, "T2", kT1, kHi, kT2, kHp, 210.0, kKindMesure);
+    AddSighting(carnet, "T2", kT1, kHi, kT2, kHp, 210.0, kKindMesure); // measured twice
+    AddStation(carnet, "T2", kHi);
+    AddSighting(carnet, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
+    AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
+    AddStation(carnet, "B", kHi);
+    AddSighting(carnet, "T2", kB, kHi, kT2, kHp, 77.0, kKindMesure);
+    AddSighting(carnet, "R2", kB, kHi, kR2, kHp, 77.0);
+    return carnet;
+}
+
+CChemin Chain(std::initializer_list<const char*> names) {
+    CChemin chain("CH1");
+    for (const char* name : names)
+        chain.add(name);
+    return chain;
+}
+
+TEST(TraverseGathering, ALinkedTraverseGivesItsStationsBackWhereTheyStand) {
+    const CCarnet carnet = Job();
+    const GatheredTraverse gathered = GatherTraverse(carnet, Chain({"A", "T1", "T2", "B"}), {});
+    ASSERT_TRUE(gathered.ok) << gathered.why;
+    EXPECT_EQ(gathered.input.kind, TraverseKind::Linked);
+    EXPECT_TRUE(gathered.warnings.empty());
+    EXPECT_NEAR(gathered.input.v00, 12.5, 1e-4);
+    EXPECT_NEAR(gathered.input.v0n, 77.0, 1e-4);
+    const TraverseResult result = ComputeTraverse(gathered.input);
+    ASSERT_TRUE(result.ok) << result.why;
+    EXPECT_NEAR(result.angularMisclosure, 0.0, 1e-4);
+    EXPECT_NEAR(result.f, 0.0, kTenthMm);
+    EXPECT_NEAR(result.fz, 0.0, kTenthMm);
+    const Place expected[] = {kA, kT1, kT2, kB};
+    for (int i = 0; i < 4; ++i) {
+        SCOPED_TRACE(i);
+        EXPECT_NEAR(result.stations[static_cast<std::size_t>(i)].x, expected[i].x, kTenthMm);
+        EXPECT_NEAR(result.stations[static_cast<std::size_t>(i)].y, expected[i].y, kTenthMm);
+        EXPECT_NEAR(result.stations[static_cast<std::size_t>(i)].z, expected[i].z, kTenthMm);
+    }
+    EXPECT_NEAR(result.stations[1].v0, 210.0, 1e-4);
+    EXPECT_NEAR(CentredGrads(result.stations[2].v0 - 399.995), 0.0, 1e-4);
+}
+
+TEST(TraverseGathering, TheKindFollowsWhatIsKnownAndWhatIsMissingIsNamed) {
+    // The last station not known: an open traverse, computed without control.
+    const GatheredTraverse open = GatherTraverse(Job(false), Chain({"A", "T1", "T2", "B"}), {});
+    ASSERT_TRUE(open.ok);
+    EXPECT_EQ(open.input.kind, TraverseKind::Open);
+    const TraverseResult result = ComputeTraverse(open.input);
+    ASSERT_TRUE(result.ok) << result.why;
+    EXPECT_NEAR(result.stations[3].x, kB.x, kTenthMm);
+
+    EXPECT_EQ(GatherTraverse(Job(), Chain({"A", "T9", "B"}), {}).why,
+              "la station <T9> n'est pas dans la GéoBase");
+    EXPECT_EQ(GatherTraverse(Job(), Chain({"A", "T1(2)", "B"}), {}).why,
+              "la station <T1(2)> n'est pas dans la GéoBase");
+    // A station that does not sight its neighbour: the computation names it.
+    const GatheredTraverse skipping = GatherTraverse(Job(), Chain({"A", "T2", "B"}), {});
+    ASSERT_TRUE(skipping.ok);
+    EXPECT_EQ(ComputeTraverse(skipping.input).why, "la station <A> ne vise pas la station suivante <T2>");
+}
+
+TEST(TraverseGathering, ALegWhoseTwoMeasuresDisagreeIsSaidAndItsMeanUsed) {
+    CCarnet carnet = Job();
+    // T1's sighting back to A, 5 cm too long.
+    const int back = carnet.Find(kKindMesure, "A");
+    carnet.As<CVisee>(back)->setDI(carnet.diAt(back) + 0.05);
+    const GatheredTraverse gathered = GatherTraverse(carnet, Chain({"A", "T1", "T2", "B"}), {});
+    ASSERT_TRUE(gathered.ok);
+    ASSERT_EQ(gathered.warnings.size(), 1u);
+    EXPECT_EQ(gathered.warnings[0].from, "A");
+    EXPECT_EQ(gathered.warnings[0].to, "T1");
+    EXPECT_FALSE(gathered.warnings[0].height);
+    const double straight = std::hypot(kT1.x - kA.x, kT1.y - kA.y);
+    EXPECT_NEAR(gathered.input.stations[0].distance, straight + 0.025, 2e-3);
+}
+
+} // namespace
+} // namespace pyr::test
