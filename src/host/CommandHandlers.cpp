@@ -1,5 +1,6 @@
 #include "host/CommandHandlers.h"
 
+#include "calc/CalcChemDriver.h"
 #include "calc/CalcExcentDriver.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalcRayonDriver.h"
@@ -83,6 +84,10 @@ void OnCalRayon(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CCalcRayonDriver>(); });
 }
 
+void OnCalChem(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcChemDriver>(); });
+}
+
 void OnReadFieldBook(const CommandEntry& command) {
     const std::optional<FieldBookFormat> format = FindFieldBookFormat(command.localName);
     if (!format) {
@@ -107,8 +112,7 @@ void OnPending(const CommandEntry& command) {
 }
 
 bool CommandAvailable(const CommandEntry& command) {
-    if (command.handler == OnPending || command.handler == OnTabCode)
-        return false;
+    if (command.handler == OnPending || command.handler == OnTabCode) return false;
     if (command.handler == OnReadFieldBook) return FindFieldBookFormat(command.localName).has_value();
     return true;
 }

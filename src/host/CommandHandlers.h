@@ -24,6 +24,7 @@ void OnCalRecou(const CommandEntry& command);
 void OnCalExcen(const CommandEntry& command);
 // "CalRayon": the radiated points.
 void OnCalRayon(const CommandEntry& command);
+void OnCalChem(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);

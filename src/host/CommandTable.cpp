@@ -42,7 +42,7 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraCalExcen", "CalExcen", "calcul d'une station excentrée", OnCalExcen},
     {"PyraCalTrian", "CalTrian", "calcul d'un point par triangulation", OnPending},
     {"PyraCalculV0", "CalculV0", "calcul du V0 d'une station", OnCalculV0},
-    {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnPending},
+    {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnCalChem},
     {"PyraCalRayon", "CalRayon", "calcul des points rayonnés", OnCalRayon},
     {"PyraCalBloc", "CalBloc", "calcul de compensation en bloc", OnPending},
     {"PyraCalNivSm", "CalNivSm", "calcul d'un cheminement altimétrique simple", OnPending},

@@ -1,0 +1,207 @@
+#include "calc/CalcChem.h"
+
+#include "calc/SessionTexts.h"
+#include "calc/TraverseTexts.h"
+#include "core/Numbers.h"
+#include "core/Strings.h"
+#include "geobase/GeoBaseMessages.h"
+#include "settings/CalcOptions.h"
+#include "ui/FrontEnd.h"
+#include "ui/PyrTxtWnd.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace pyr {
+
+namespace {
+
+const char* Beyond(bool out) {
+    return out ? chem::kOutOfTolerance : "";
+}
+
+} // namespace
+
+CCalcChem::CCalcChem()
+    : m_session({chem::kJournal, session::kQuestionInvariantXY, session::kQuestionInvariantZ}) {}
+
+std::string CCalcChem::Caption() const {
+    return chem::kCaption;
+}
+
+void CCalcChem::ReadOptions() {
+    const std::string_view path = m_session.ParamPath();
+    m_settings.reduction = m_session.Reduction();
+    m_settings.reduction.instrumentConstants = true;
+    m_settings.reduction.targetHeights = true;
+    m_settings.tolerances = m_session.Tolerance();
+    m_settings.v0.tolerances = m_session.Tolerance();
+    m_settings.v0.reduction.correction = m_session.Reduction().correction;
+    m_tolerances.angular = ReadOptionReal(path, kSectionTolerances, chem::kKeyAngular);
+    m_tolerances.planimetric = ReadOptionReal(path, kSectionTolerances, chem::kKeyPlanimetric);
+    m_tolerances.height = ReadOptionReal(path, kSectionTolerances, chem::kKeyHeight);
+}
+
+bool CCalcChem::Open(ui::FrontEnd& frontEnd) {
+    m_frontEnd = &frontEnd;
+    m_results.clear();
+    m_names.clear();
+    m_elements.clear();
+    m_chosen.clear();
+    m_written = false;
+    if (!m_session.Open(frontEnd, *this)) {
+        m_cancelled = m_session.Cancelled();
+        return false;
+    }
+    ReadOptions();
+    const CCarnet& carnet = m_session.Carnet();
+    for (int i = carnet.Find(kKindChemin, ""); i >= 0; i = carnet.Find(kKindChemin, "", i + 1)) {
+        m_elements.push_back(i);
+        m_names.push_back(carnet.matAt(i));
+    }
+    if (m_names.empty()) {
+        frontEnd.MessageBox(Sprintf(chem::kMsgNoTraverse, m_session.Path().c_str()), ui::kCaption,
+                            ui::kIconWarning);
+        return false;
+    }
+    return true;
+}
+
+std::string CCalcChem::Close(bool, bool listingAsked, std::string listingPath) {
+    ListingRequest request;
+    request.kind = ListingKind::Traverse;
+    request.resultCount = m_results.size();
+    request.writeResult = [this](CDlgCfgListing& listing, std::size_t index) {
+        const ComputedTraverse& t = m_results[index];
+        WriteTraverse(listing, {t.name, t.gathered, t.result, m_tolerances});
+    };
+    request.writeTolerances = [this](CDlgCfgListing& listing) {
+        WriteTraverseTolerances(listing, m_tolerances);
+    };
+    request.ask = !listingAsked;
+    request.path = std::move(listingPath);
+    return m_session.Close(std::move(request));
+}
+
+bool CCalcChem::Choose(std::string_view name) {
+    const auto found = std::find(m_names.begin(), m_names.end(), name);
+    if (found == m_names.end()) {
+        if (m_frontEnd)
+            m_frontEnd->MessageBox(Sprintf(chem::kMsgTraverseUnknown, std::string(name).c_str()),
+                                   ui::kCaption, ui::kIconWarning);
+        return false;
+    }
+    const int rank = static_cast<int>(found - m_names.begin());
+    if (std::find(m_chosen.begin(), m_chosen.end(), rank) == m_chosen.end()) m_chosen.push_back(rank);
+    return true;
+}
+
+void CCalcChem::Show(const ComputedTraverse& t) {
+    CPyrTxtWnd txt(*m_frontEnd);
+    if (!t.result.ok) {
+        txt.Print(chem::kLineNotComputed, t.name.c_str(), t.result.why.c_str());
+        return;
+    }
+    const TraverseResult& r = t.result;
+    txt.Print(chem::kLineTraverse, t.name.c_str(), TraverseKindText(t.gathered.input.kind),
+              static_cast<int>(r.stations.size()), r.length);
+    for (const TraverseLegWarning& w : t.gathered.warnings)
+        txt.Print(chem::kLineLegWarning, w.from.c_str(), w.to.c_str(),
+                  w.height ? chem::kHeight : chem::kDistance, w.forward, w.height ? -w.backward : w.backward,
+                  w.tolerance);
+    if (IsKnown(r.angularMisclosure))
+        txt.Print(chem::kLineAngular, FormatFixedShown(r.angularMisclosure, 4).c_str(),
+                  FormatFixedShown(m_tolerances.angular, 4).c_str(), Beyond(t.angularOut));
+    if (IsKnown(r.f))
+        txt.Print(chem::kLinePlanimetric, FormatFixedShown(r.fx, 4).c_str(),
+                  FormatFixedShown(r.fy, 4).c_str(), FormatFixedShown(r.f, 4).c_str(),
+                  TraverseRatioText(r).c_str(), FormatFixedShown(m_tolerances.planimetric, 4).c_str(),
+                  Beyond(t.planimetricOut));
+    if (IsKnown(r.fz))
+        txt.Print(chem::kLineHeight, FormatFixedShown(r.fz, 4).c_str(),
+                  FormatFixedShown(m_tolerances.height, 4).c_str(), Beyond(t.heightOut));
+}
+
+bool CCalcChem::Calculate() {
+    if (!m_frontEnd || !m_session.IsOpen()) return false;
+    m_results.clear();
+    m_written = false;
+    std::vector<int> ranks = m_chosen;
+    if (ranks.empty())
+        for (int rank = 0; rank < static_cast<int>(m_names.size()); ++rank)
+            ranks.push_back(rank);
+    const CCarnet& carnet = m_session.Carnet();
+    int computed = 0;
+    for (int rank : ranks) {
+        ComputedTraverse t;
+        t.name = m_names[static_cast<std::size_t>(rank)];
+        t.element = m_elements[static_cast<std::size_t>(rank)];
+        t.gathered = GatherTraverse(carnet, *carnet.As<CChemin>(t.element), m_settings);
+        if (t.gathered.ok) {
+            t.result = ComputeTraverse(t.gathered.input);
+        } else {
+            t.result.why = t.gathered.why;
+        }
+        if (t.result.ok) {
+            ++computed;
+            const TraverseResult& r = t.result;
+            t.angularOut =
+                IsKnown(r.angularMisclosure) && std::fabs(r.angularMisclosure) > m_tolerances.angular;
+            t.planimetricOut = IsKnown(r.f) && r.f > m_tolerances.planimetric;
+            t.heightOut = IsKnown(r.fz) && std::fabs(r.fz) > m_tolerances.height;
+        }
+        Show(t);
+        m_results.push_back(std::move(t));
+    }
+    if (computed == 0) m_frontEnd->MessageBox(chem::kMsgNothingComputed, ui::kCaption, ui::kIconWarning);
+    Notify(kPartResults);
+    return computed > 0;
+}
+
+bool CCalcChem::Enregistrer() {
+    if (!m_frontEnd || !m_session.IsOpen()) return false;
+    CPyrTxtWnd txt(*m_frontEnd);
+    int stations = 0, orientations = 0;
+    if (!m_written) {
+        for (const ComputedTraverse& t : m_results) {
+            if (!t.result.ok) continue;
+            if (t.OutOfTolerance()) {
+                std::string what;
+                for (const auto& [out, word] : {std::pair{t.angularOut, "angulaire"},
+                                                {t.planimetricOut, "planimétrique"},
+                                                {t.heightOut, "altimétrique"}})
+                    if (out) what += (what.empty() ? "" : ", ") + std::string(word);
+                if (m_frontEnd->Ask(Sprintf(chem::kQuestionOutOfTolerance, t.name.c_str(), what.c_str()),
+                                    ui::kCaption, ui::Buttons::YesNo, ui::Answer::No) != ui::Answer::Yes) {
+                    txt.Print(chem::kLineNotWritten, t.name.c_str());
+                    continue;
+                }
+            }
+            const TraverseKind kind = t.gathered.input.kind;
+            const std::size_t count = t.result.stations.size();
+            for (std::size_t i = 0; i < count; ++i) {
+                const StationPlace& place = t.gathered.places[i];
+                const TraverseStationResult& station = t.result.stations[i];
+                // The known ends keep their coordinates; every station gets its orientation.
+                const bool known =
+                    i == 0 ||
+                    (i + 1 == count && (kind == TraverseKind::Linked || kind == TraverseKind::Position));
+                if (!known && m_session.WritePoint(place.name, station.x, station.y, station.z)) ++stations;
+                if (IsKnown(station.v0) &&
+                    m_session.WriteStationV0(place.index, place.Designation(), station.v0))
+                    ++orientations;
+            }
+        }
+    }
+    m_written = true;
+    if (!m_session.Modified()) {
+        txt.PrintText(msg::kNoChange);
+        return true;
+    }
+    if (!m_session.Save()) return false;
+    txt.Print(chem::kLineWritten, stations, orientations);
+    Notify(kPartResults);
+    return true;
+}
+
+} // namespace pyr
