@@ -1,6 +1,7 @@
 #include "calc/CalcChem.h"
 
 #include "calc/SessionTexts.h"
+#include "calc/TraverseSearch.h"
 #include "calc/TraverseTexts.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
@@ -42,7 +43,17 @@ void CCalcChem::ReadOptions() {
     m_tolerances.height = ReadOptionReal(path, kSectionTolerances, chem::kKeyHeight);
 }
 
-bool CCalcChem::Open(ui::FrontEnd& frontEnd) {
+void CCalcChem::ListTraverses() {
+    m_names.clear();
+    m_elements.clear();
+    const CCarnet& carnet = m_session.Carnet();
+    for (int i = carnet.Find(kKindChemin, ""); i >= 0; i = carnet.Find(kKindChemin, "", i + 1)) {
+        m_elements.push_back(i);
+        m_names.push_back(carnet.matAt(i));
+    }
+}
+
+bool CCalcChem::Open(ui::FrontEnd& frontEnd, bool searchFirst) {
     m_frontEnd = &frontEnd;
     m_results.clear();
     m_names.clear();
@@ -54,12 +65,8 @@ bool CCalcChem::Open(ui::FrontEnd& frontEnd) {
         return false;
     }
     ReadOptions();
-    const CCarnet& carnet = m_session.Carnet();
-    for (int i = carnet.Find(kKindChemin, ""); i >= 0; i = carnet.Find(kKindChemin, "", i + 1)) {
-        m_elements.push_back(i);
-        m_names.push_back(carnet.matAt(i));
-    }
-    if (m_names.empty()) {
+    ListTraverses();
+    if (m_names.empty() && !searchFirst) {
         frontEnd.MessageBox(Sprintf(chem::kMsgNoTraverse, m_session.Path().c_str()), ui::kCaption,
                             ui::kIconWarning);
         return false;
@@ -96,6 +103,28 @@ bool CCalcChem::Choose(std::string_view name) {
     return true;
 }
 
+int CCalcChem::Search() {
+    if (!m_frontEnd || !m_session.IsOpen()) return -1;
+    CPyrTxtWnd txt(*m_frontEnd);
+    CCarnet& carnet = m_session.Carnet();
+    const std::vector<FoundTraverse> found = FindTraverses(carnet);
+    const std::vector<std::string> added = AddFoundTraverses(carnet, found);
+    for (const std::string& name : added) {
+        const int element = carnet.Find(kKindChemin, name);
+        std::string stations;
+        for (const std::string& station : carnet.As<CChemin>(element)->stations())
+            stations += (stations.empty() ? "" : " - ") + station;
+        txt.Print(chem::kLineFound, name.c_str(), stations.c_str(),
+                  carnet.As<CChemin>(element)->isClosed() ? chem::kClosedMark : "");
+    }
+    txt.Print(chem::kLineSearch, static_cast<int>(found.size()), static_cast<int>(added.size()));
+    ListTraverses();
+    if (added.empty()) return 0;
+    m_session.MarkModified();
+    if (!m_session.Save()) return -1;
+    return static_cast<int>(added.size());
+}
+
 void CCalcChem::Show(const ComputedTraverse& t) {
     CPyrTxtWnd txt(*m_frontEnd);
     if (!t.result.ok) {
@@ -126,6 +155,11 @@ bool CCalcChem::Calculate() {
     if (!m_frontEnd || !m_session.IsOpen()) return false;
     m_results.clear();
     m_written = false;
+    if (m_names.empty()) {
+        m_frontEnd->MessageBox(Sprintf(chem::kMsgNoTraverse, m_session.Path().c_str()), ui::kCaption,
+                               ui::kIconWarning);
+        return false;
+    }
     std::vector<int> ranks = m_chosen;
     if (ranks.empty())
         for (int rank = 0; rank < static_cast<int>(m_names.size()); ++rank)

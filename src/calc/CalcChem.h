@@ -37,8 +37,8 @@ public:
 
     // ---- Opening and closing
     // Offers the GéoBase, loads it and reads the options. False, a message having said why, when it holds
-    // no traverse or when the person chose no GéoBase.
-    bool Open(ui::FrontEnd& frontEnd);
+    // no traverse (unless the search is to run first) or when the person chose no GéoBase.
+    bool Open(ui::FrontEnd& frontEnd, bool searchFirst = false);
     bool Cancelled() const { return m_cancelled; }
     std::string Close(bool saved, bool listingAsked = false, std::string listingPath = {});
 
@@ -51,6 +51,9 @@ public:
     TraverseTolerances& ClosureTolerances() { return m_tolerances; }
 
     // ---- Actions
+    // "Recherche automatique": the traverses found among the set-ups written into the GéoBase, which is
+    // saved. The number of traverses added; -1 when the GéoBase could not be saved.
+    int Search();
     // "&Calculer": true when at least one traverse could be computed.
     bool Calculate();
     // "&Enregistrer": false when the GéoBase could not be saved.
@@ -61,6 +64,7 @@ public:
 
 private:
     void ReadOptions();
+    void ListTraverses();
     void Show(const ComputedTraverse& traverse);
 
     ui::FrontEnd* m_frontEnd = nullptr;

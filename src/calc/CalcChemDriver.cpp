@@ -5,6 +5,8 @@ namespace pyr {
 namespace {
 
 constexpr const char* kHelpTraverse = "le cheminement à calculer, par son nom (l'option peut se répéter)";
+constexpr const char* kHelpSearch =
+    "cherche les cheminements parmi les stations et les écrit dans la GéoBase avant le calcul";
 constexpr const char* kHelpAll = "tous les cheminements de la GéoBase (par défaut)";
 constexpr const char* kHelpSave = "écrire les coordonnées et les V0 des stations dans la GéoBase et "
                                   "l'enregistrer ; un cheminement hors tolérance est proposé";
@@ -19,6 +21,10 @@ void CCalcChemDriver::DeclareOptions(ui::DialogOptions& options) {
             return std::string();
         },
         true);
+    options.Switch("recherche", kHelpSearch, [this] {
+        m_search = true;
+        return std::string();
+    });
     options.Switch("tous", kHelpAll, [this] {
         m_traverses.clear();
         return std::string();
@@ -30,7 +36,12 @@ ui::DialogResult CCalcChemDriver::Run(ui::FrontEnd& frontEnd) {
     CCalcChem& chem = m_model;
     chem.SetInputs(Inputs());
     if (GeoBaseNamed()) chem.SetGeoBase(GeoBase());
-    if (!chem.Open(frontEnd)) return chem.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
+    if (!chem.Open(frontEnd, m_search))
+        return chem.Cancelled() ? ui::DialogResult::Cancel : ui::DialogResult::Failed;
+    if (m_search && chem.Search() < 0) {
+        chem.Close(false, false);
+        return ui::DialogResult::Failed;
+    }
     for (const std::string& name : m_traverses)
         if (!chem.Choose(name)) {
             chem.Close(false, false);

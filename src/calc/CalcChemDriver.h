@@ -9,7 +9,8 @@
 
 namespace pyr {
 
-// The polygonal traverses run from a command line: "--cheminement NOM" (repeatable) or "--tous" (every
+// The polygonal traverses run from a command line: "--recherche" (the automatic search first, its traverses
+// written into the GéoBase), "--cheminement NOM" (repeatable) or "--tous" (every
 // traverse of the GéoBase, the default), "--enregistrer" and "--listing"; the run opens the GéoBase,
 // computes, writes and closes. With "--oui", a traverse out of tolerance is written, as a person answering
 // yes would. It fails when no traverse could be computed, or when the GéoBase could not be saved.
@@ -23,6 +24,7 @@ public:
 private:
     CCalcChem m_model;
     std::vector<std::string> m_traverses;
+    bool m_search = false;
     ComputationRequests m_computation;
 };
 

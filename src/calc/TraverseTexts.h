@@ -40,6 +40,9 @@ inline constexpr const char* kLineLegWarning =
     "    Tronçon %s - %s : %s aller %.4f, retour %.4f m, écart hors tolérance (%.4f m)";
 inline constexpr const char* kDistance = "distance";
 inline constexpr const char* kHeight = "dénivelée";
+inline constexpr const char* kLineFound = "Cheminement %s trouvé : %s%s";
+inline constexpr const char* kClosedMark = " (fermé)";
+inline constexpr const char* kLineSearch = "Recherche des cheminements : %d trouvé(s), %d ajouté(s) dans la GéoBase.";
 inline constexpr const char* kLineWritten = "%d station(s) et %d V0 écrit(s) dans la GéoBase.";
 inline constexpr const char* kLineNotWritten = "Cheminement <%s> hors tolérance : non enregistré.";
 

@@ -81,6 +81,22 @@ TEST_F(ChemCommand, OutOfToleranceItIsWrittenOnlyWhenTheSurveyorSaysSo) {
     EXPECT_GE(Saved().findMat("T1"), 0);
 }
 
+TEST_F(ChemCommand, TheSearchFindsTheTraverseWritesItAndTheComputationFollows) {
+    Write(false);
+    Outcome outcome = Run("--recherche --enregistrer");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    ExpectInOrder(outcome.out, {"Cheminement CH1 trouvé : A - T1 - T2 - B",
+                                "Recherche des cheminements : 1 trouvé(s), 1 ajouté(s) dans la GéoBase.",
+                                "Cheminement CH1 (encadré)"});
+    const CCarnet saved = Saved();
+    EXPECT_GE(saved.Find(kKindChemin, "CH1"), 0);
+    EXPECT_NEAR(saved.xAt(saved.findMat("T2")), kT2.x, kTenthMm);
+    // Searched again: its stations are known now, nothing lies between known stations to compute.
+    outcome = Run("--recherche");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(Has(outcome.out, "0 trouvé(s), 0 ajouté(s)")) << outcome.out;
+}
+
 TEST_F(ChemCommand, WhatCannotBeComputedIsNamedAndNothingWritten) {
     Write(false);
     const std::string before = ReadBytes(dir / "chantier.geo");
