@@ -1,5 +1,6 @@
 #include "calc/CalcChem.h"
 
+#include "calc/Radiation.h"
 #include "calc/SessionTexts.h"
 #include "calc/TraverseSearch.h"
 #include "calc/TraverseTexts.h"
@@ -38,6 +39,7 @@ void CCalcChem::ReadOptions() {
     m_settings.tolerances = m_session.Tolerance();
     m_settings.v0.tolerances = m_session.Tolerance();
     m_settings.v0.reduction.correction = m_session.Reduction().correction;
+    m_switches = ReadOptionInt(path, kSectionCalculations, chem::kKeySwitches);
     m_tolerances.angular = ReadOptionReal(path, kSectionTolerances, chem::kKeyAngular);
     m_tolerances.planimetric = ReadOptionReal(path, kSectionTolerances, chem::kKeyPlanimetric);
     m_tolerances.height = ReadOptionReal(path, kSectionTolerances, chem::kKeyHeight);
@@ -170,9 +172,15 @@ bool CCalcChem::Calculate() {
         ComputedTraverse t;
         t.name = m_names[static_cast<std::size_t>(rank)];
         t.element = m_elements[static_cast<std::size_t>(rank)];
+        m_settings.rule =
+            (m_switches & chem::kByCoordinates) ? TraverseRule::Component : TraverseRule::Compass;
         t.gathered = GatherTraverse(carnet, *carnet.As<CChemin>(t.element), m_settings);
         if (t.gathered.ok) {
-            t.result = ComputeTraverse(t.gathered.input);
+            TraverseInput& input = t.gathered.input;
+            input.distributeAngular = !(m_switches & chem::kKeepAngular);
+            input.distributePlanimetric = !(m_switches & chem::kKeepPlanimetric);
+            input.distributeHeight = !(m_switches & chem::kKeepHeight);
+            t.result = ComputeTraverse(input);
         } else {
             t.result.why = t.gathered.why;
         }
@@ -192,10 +200,34 @@ bool CCalcChem::Calculate() {
     return computed > 0;
 }
 
+int CCalcChem::RadiateFrom(const std::vector<int>& stations) {
+    CPyrTxtWnd txt(*m_frontEnd);
+    RadiationSettings settings;
+    settings.reduction = m_settings.reduction;
+    settings.tolerances = m_session.Tolerance();
+    const CCarnet& carnet = m_session.Carnet();
+    std::vector<RadiatedStation> results;
+    for (int index : stations)
+        results.push_back(RadiateStation(carnet, index, settings));
+    const RadiatedPoints points = MergeDeterminations(results, settings.tolerances);
+    int count = 0;
+    for (const RadiatedPoint& point : points) {
+        if (point.outOfTolerance) {
+            txt.Print(chem::kLineRadiatedOut, std::string(point.mat).c_str());
+            continue;
+        }
+        // The identifier copied: writing a point may add an element to the GéoBase.
+        const std::string mat(point.mat);
+        if (m_session.WritePoint(mat, point.x, point.y, point.z)) ++count;
+    }
+    return count;
+}
+
 bool CCalcChem::Enregistrer() {
     if (!m_frontEnd || !m_session.IsOpen()) return false;
     CPyrTxtWnd txt(*m_frontEnd);
-    int stations = 0, orientations = 0;
+    int stations = 0, orientations = 0, radiated = 0;
+    std::vector<int> written; // the station occurrences of the traverses written
     if (!m_written) {
         for (const ComputedTraverse& t : m_results) {
             if (!t.result.ok) continue;
@@ -221,11 +253,14 @@ bool CCalcChem::Enregistrer() {
                     i == 0 ||
                     (i + 1 == count && (kind == TraverseKind::Linked || kind == TraverseKind::Position));
                 if (!known && m_session.WritePoint(place.name, station.x, station.y, station.z)) ++stations;
-                if (IsKnown(station.v0) &&
+                if (!(m_switches & chem::kNoV0) && IsKnown(station.v0) &&
                     m_session.WriteStationV0(place.index, place.Designation(), station.v0))
                     ++orientations;
+                if (std::find(written.begin(), written.end(), place.index) == written.end())
+                    written.push_back(place.index);
             }
         }
+        if ((m_switches & chem::kRadiate) && !written.empty()) radiated = RadiateFrom(written);
     }
     m_written = true;
     if (!m_session.Modified()) {
@@ -234,6 +269,7 @@ bool CCalcChem::Enregistrer() {
     }
     if (!m_session.Save()) return false;
     txt.Print(chem::kLineWritten, stations, orientations);
+    if (m_switches & chem::kRadiate) txt.Print(chem::kLineRadiated, radiated);
     Notify(kPartResults);
     return true;
 }

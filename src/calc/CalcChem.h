@@ -49,6 +49,9 @@ public:
     const std::vector<int>& Chosen() const { return m_chosen; }
     TraverseGatherSettings& Settings() { return m_settings; }
     TraverseTolerances& ClosureTolerances() { return m_tolerances; }
+    // The switches of "Cheminements" (TraverseTexts.h), read at Open.
+    int Switches() const { return m_switches; }
+    void SetSwitches(int switches) { m_switches = switches; }
 
     // ---- Actions
     // "Recherche automatique": the traverses found among the set-ups written into the GéoBase, which is
@@ -65,6 +68,8 @@ public:
 private:
     void ReadOptions();
     void ListTraverses();
+    // The points sighted from the stations written, radiated and written: their number.
+    int RadiateFrom(const std::vector<int>& stations);
     void Show(const ComputedTraverse& traverse);
 
     ui::FrontEnd* m_frontEnd = nullptr;
@@ -72,6 +77,7 @@ private:
     CComputationSession m_session;
     TraverseGatherSettings m_settings;
     TraverseTolerances m_tolerances;
+    int m_switches = 32;
     std::vector<std::string> m_names; // the traverses of the GéoBase
     std::vector<int> m_elements;      // their elements
     std::vector<int> m_chosen;        // ranks in m_names

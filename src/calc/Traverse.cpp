@@ -94,7 +94,7 @@ TraverseResult ComputeTraverse(const TraverseInput& input) {
         const double known = closed ? input.v00 : input.v0n;
         result.angularMisclosure = CentredGrads(v0 - known);
         result.angles = static_cast<int>(legs) + 1;
-        correction = -result.angularMisclosure / result.angles;
+        if (input.distributeAngular) correction = -result.angularMisclosure / result.angles;
     }
     for (std::size_t k = 0; k < legs; ++k) {
         TraverseLegResult& leg = result.legs[k];
@@ -136,11 +136,12 @@ TraverseResult ComputeTraverse(const TraverseInput& input) {
         result.fy = sumY - (closed ? input.y0 : input.yn);
         result.f = std::hypot(result.fx, result.fy);
         const bool compass = input.rule == TraverseRule::Compass;
+        const double share = input.distributePlanimetric ? 1.0 : 0.0;
         const std::vector<double> cx = Shares(result.fx, compass ? lengths : eastings);
         const std::vector<double> cy = Shares(result.fy, compass ? lengths : northings);
         for (std::size_t k = 0; k < legs; ++k) {
-            result.legs[k].cx = cx[k];
-            result.legs[k].cy = cy[k];
+            result.legs[k].cx = share * cx[k];
+            result.legs[k].cy = share * cy[k];
         }
     }
     double x = input.x0;
@@ -166,7 +167,7 @@ TraverseResult ComputeTraverse(const TraverseInput& input) {
         if (input.kind != TraverseKind::Open && Known(zEnd)) {
             result.fz = sumZ - zEnd;
             const std::vector<double> cz = Shares(result.fz, lengths);
-            for (std::size_t k = 0; k < legs; ++k)
+            for (std::size_t k = 0; k < legs && input.distributeHeight; ++k)
                 result.legs[k].cz = cz[k];
         }
         double z = input.z0;

@@ -41,6 +41,10 @@ struct TraverseStation {
 struct TraverseInput {
     TraverseKind kind = TraverseKind::Linked;
     TraverseRule rule = TraverseRule::Compass;
+    // Which closures are distributed; one that is not is still measured and reported.
+    bool distributeAngular = true;
+    bool distributePlanimetric = true;
+    bool distributeHeight = true;
     std::vector<TraverseStation> stations; // in their order; a closed traverse does not repeat the first
     // The known ends: the first station's place and V0 (its orientation), the last station's place
     // and V0 (a linked traverse), its place only (Position). Z kUndefined: no height closure.

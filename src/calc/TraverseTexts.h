@@ -7,6 +7,15 @@ namespace pyr::chem {
 inline constexpr const char* kCaption = "PYRALIS - Calcul de cheminements polygonaux";
 inline constexpr const char* kJournal = "Calcul de cheminements polygonaux";
 
+// The switches of the traverses, "Cheminements" of "Options_Calculs", bit by bit.
+inline constexpr const char* kKeySwitches = "Cheminements";
+inline constexpr int kByCoordinates = 1;   // the planimetric closure shared by the coordinate differences
+inline constexpr int kKeepAngular = 2;     // the angular closure measured, not distributed
+inline constexpr int kKeepPlanimetric = 4; // the planimetric closure measured, not distributed
+inline constexpr int kKeepHeight = 8;      // the height closure measured, not distributed
+inline constexpr int kNoV0 = 16;           // the stations' V0 not written
+inline constexpr int kRadiate = 32; // the points sighted from the stations radiated once they are written
+
 // The tolerances of the closures, section "Options_Tolerances".
 inline constexpr const char* kKeyAngular = "FermAngulaire";
 inline constexpr const char* kKeyPlanimetric = "FermPlanimetr";
@@ -42,7 +51,11 @@ inline constexpr const char* kDistance = "distance";
 inline constexpr const char* kHeight = "dénivelée";
 inline constexpr const char* kLineFound = "Cheminement %s trouvé : %s%s";
 inline constexpr const char* kClosedMark = " (fermé)";
-inline constexpr const char* kLineSearch = "Recherche des cheminements : %d trouvé(s), %d ajouté(s) dans la GéoBase.";
+inline constexpr const char* kLineSearch =
+    "Recherche des cheminements : %d trouvé(s), %d ajouté(s) dans la GéoBase.";
+inline constexpr const char* kLineRadiated = "%d point(s) rayonné(s) depuis les stations des cheminements.";
+inline constexpr const char* kLineRadiatedOut =
+    "Point <%s> rayonné plusieurs fois avec un écart hors tolérance : non enregistré.";
 inline constexpr const char* kLineWritten = "%d station(s) et %d V0 écrit(s) dans la GéoBase.";
 inline constexpr const char* kLineNotWritten = "Cheminement <%s> hors tolérance : non enregistré.";
 

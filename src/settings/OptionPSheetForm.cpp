@@ -57,7 +57,15 @@ const std::vector<KeyField>& KeyFields() {
     using enum Widget;
     static const std::vector<KeyField> fields{
         {1, kSectionCalculations, "General", Bits, "Options &générales :", BitLines(3)},
-        {1, kSectionCalculations, "Cheminements", Bits, "Options des &cheminements :", BitLines(7)},
+        {1,
+         kSectionCalculations,
+         "Cheminements",
+         Bits,
+         "Options des &cheminements :",
+         {"Fermeture planimétrique répartie sur les écarts de coordonnées (1)",
+          "Fermeture angulaire non compensée (2)", "Fermeture planimétrique non compensée (4)",
+          "Fermeture altimétrique non compensée (8)", "V0 des stations non écrits (16)",
+          "Points rayonnés depuis les stations calculées (32)", "Interrupteur 7 (valeur 64)"}},
         {1, kSectionCalculations, "RayonHp0Check", Check,
          "Rayonnement : remplacer une hauteur de voyant &nulle"},
         {1, kSectionCalculations, "ValeurDeHp0", Edit, "&Hauteur de voyant qui la remplace (m) :"},

@@ -153,6 +153,17 @@ TEST(Traverse, MisclosuresAreSharedAsTheCompassRuleSharesThemByHand) {
     EXPECT_NEAR(r.stations[2].z, 50.5200012, 1e-6);
     EXPECT_NEAR(r.stations[3].z, 50.80, 1e-9);
 
+    // A closure measured but not distributed: the stations as carried, the misclosure reported all the same.
+    TraverseInput kept = input;
+    kept.distributeAngular = kept.distributePlanimetric = kept.distributeHeight = false;
+    const TraverseResult k = ComputeTraverse(kept);
+    ASSERT_TRUE(k.ok);
+    EXPECT_NEAR(k.angularMisclosure, -0.004, 1e-9);
+    EXPECT_NEAR(k.legs[2].bearing, 99.996, kTenthMgon);
+    EXPECT_NEAR(k.stations[3].x, 1300.010, 1e-6);
+    EXPECT_NEAR(k.stations[3].z, 50.77, 1e-9);
+    EXPECT_NEAR(k.fz, -0.030, 1e-9);
+
     // By the coordinate differences, the east misclosure goes by |dx| and the north one by |dy|: the
     // leg that went most north takes most of fy.
     input.rule = TraverseRule::Component;

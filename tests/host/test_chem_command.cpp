@@ -9,6 +9,7 @@ namespace {
 const Place kA{651200.000, 6862300.000, 52.310}, kB{651688.731, 6862554.562, 49.870};
 const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 55.021};
 const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
+const Place kP1{651390.5, 6862350.25, 54.1}; // a point sighted from T1 only
 constexpr double kHi = 1.55, kHp = 1.3;
 constexpr double kTenthMm = 1e-4;
 
@@ -27,6 +28,7 @@ protected:
         AddStation(carnet, "T1", kHi);
         AddSighting(carnet, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
         AddSighting(carnet, "T2", kT1, kHi, t2Seen, kHp, 210.0, kKindMesure);
+        AddSighting(carnet, "P1", kT1, kHi, kP1, kHp, 210.0, kKindMesure);
         AddStation(carnet, "T2", kHi);
         AddSighting(carnet, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
         AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
@@ -52,9 +54,10 @@ TEST_F(ChemCommand, ALinkedTraverseWritesItsStationsAndItsListing) {
     ASSERT_EQ(outcome.status, 0) << outcome.err;
     ExpectInOrder(outcome.out, {"Cheminement CH1 (encadré), 4 station(s)", "Fermeture angulaire",
                                 "Fermeture planimétrique", "Fermeture altimétrique",
-                                "2 station(s) et 4 V0 écrit(s) dans la GéoBase."});
+                                "2 station(s) et 4 V0 écrit(s) dans la GéoBase.",
+                                "1 point(s) rayonné(s) depuis les stations des cheminements."});
     const CCarnet saved = Saved();
-    for (const auto& [name, place] : {std::pair{"T1", kT1}, {"T2", kT2}}) {
+    for (const auto& [name, place] : {std::pair{"T1", kT1}, {"T2", kT2}, {"P1", kP1}}) {
         SCOPED_TRACE(name);
         const int at = saved.findMat(name);
         ASSERT_GE(at, 0);
@@ -67,6 +70,19 @@ TEST_F(ChemCommand, ALinkedTraverseWritesItsStationsAndItsListing) {
     ExpectInOrder(listing, {"Cheminement CH1 : encadré", "Fermeture = ", "Tronçons", "Gis. compensé",
                             "fx = ", "Stations compensées", "Altimétrie"});
     EXPECT_TRUE(Has(ReadBytes(dir / "chantier.jnl"), "Calcul de cheminements polygonaux"));
+}
+
+TEST_F(ChemCommand, TheSwitchesOfTheOptionsChooseWhatIsWritten) {
+    Write();
+    // 16: no V0 written; without 32: no point radiated.
+    WriteBytes(dir / "Pyralis.ini", "[Options_Calculs]\r\nCheminements=16\r\n");
+    const Outcome outcome = Run("--enregistrer");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(Has(outcome.out, "2 station(s) et 0 V0 écrit(s)")) << outcome.out;
+    const CCarnet saved = Saved();
+    EXPECT_GE(saved.findMat("T1"), 0);
+    EXPECT_LT(saved.findMat("P1"), 0);
+    EXPECT_EQ(saved.v0At(saved.findStaRep("T1", 1)), kUndefined);
 }
 
 TEST_F(ChemCommand, OutOfToleranceItIsWrittenOnlyWhenTheSurveyorSaysSo) {
