@@ -3,6 +3,7 @@
 #include "calc/CalcChemDriver.h"
 #include "calc/CalcExcentDriver.h"
 #include "calc/CalcIntersDriver.h"
+#include "calc/CalcNivDriver.h"
 #include "calc/CalcRayonDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "calc/ResectionDriver.h"
@@ -86,6 +87,15 @@ void OnCalRayon(const CommandEntry& command) {
 
 void OnCalChem(const CommandEntry& command) {
     RunCommandDialog(command.title, [] { return std::make_unique<CCalcChemDriver>(); });
+}
+
+void OnCalNivSm(const CommandEntry& command) {
+    RunCommandDialog(command.title, [] { return std::make_unique<CCalcNivDriver>(LevellingMethod::Simple); });
+}
+
+void OnCalNivSt(const CommandEntry& command) {
+    RunCommandDialog(command.title,
+                     [] { return std::make_unique<CCalcNivDriver>(LevellingMethod::DoubleStation); });
 }
 
 void OnReadFieldBook(const CommandEntry& command) {

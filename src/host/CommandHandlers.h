@@ -25,6 +25,10 @@ void OnCalExcen(const CommandEntry& command);
 // "CalRayon": the radiated points.
 void OnCalRayon(const CommandEntry& command);
 void OnCalChem(const CommandEntry& command);
+// "CalNivSm": levelling runs, simple.
+void OnCalNivSm(const CommandEntry& command);
+// "CalNivSt": levelling runs by double station.
+void OnCalNivSt(const CommandEntry& command);
 // The eleven readings of field books, told apart by their local name: each converts a field book of its
 // format into a GéoBase.
 void OnReadFieldBook(const CommandEntry& command);

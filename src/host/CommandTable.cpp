@@ -45,8 +45,8 @@ constexpr std::array<CommandEntry, 37> kCommands{{
     {"PyraCalChem", "CalChem", "calcul des cheminements polygonaux", OnCalChem},
     {"PyraCalRayon", "CalRayon", "calcul des points rayonnés", OnCalRayon},
     {"PyraCalBloc", "CalBloc", "calcul de compensation en bloc", OnPending},
-    {"PyraCalNivSm", "CalNivSm", "calcul d'un cheminement altimétrique simple", OnPending},
-    {"PyraCalNivSt", "CalNivSt", "calcul d'un cheminement par double station", OnPending},
+    {"PyraCalNivSm", "CalNivSm", "calcul d'un cheminement altimétrique simple", OnCalNivSm},
+    {"PyraCalNivSt", "CalNivSt", "calcul d'un cheminement par double station", OnCalNivSt},
     // The codification commands break the "Pyra" + local name rule of the global names.
     {"PyraAsmCode", "CalAsmCode", "fusion d'un fichier de codification", OnPending},
     {"PyraTabCode", "CalTabCode", "gestion d'un table de codes", OnTabCode},

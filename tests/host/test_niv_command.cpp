@@ -1,0 +1,163 @@
+// "pyralis CalNivSm" and "CalNivSt" run as a script runs them: a levelling run read by a perfect level
+// between two benchmarks gives the heights back; a misclosure of a few millimetres is shared along it; out
+// of tolerance, it is written only when the surveyor says so; what cannot be computed writes nothing.
+#include "HostTestSupport.h"
+#include "geobase/Elements.h"
+#include "geobase/Kinds.h"
+
+#include <memory>
+
+namespace pyr::test {
+namespace {
+
+constexpr double kTenthMm = 1e-4;
+
+// True heights (metres): A and B the benchmarks, T1 and T2 turning points, S a side point levelled from
+// the set-up on T1. The readings are what a perfect level reads, every sight 30 m long, so that a
+// misclosure is shared in equal thirds.
+constexpr double kA = 100.000, kT1 = 101.234, kT2 = 99.876, kB = 100.543, kS = 100.111;
+constexpr double kSight = 30.0;
+
+class NivCommand : public PyralisTest {
+protected:
+    CCarnet carnet;
+
+    void Benchmark(const char* name, double z) {
+        ASSERT_GE(carnet.Add(std::make_unique<CPointGen>(name, z), kKindPoint), 0);
+    }
+    void Back(const char* point, double reading) {
+        ASSERT_GE(carnet.Add(std::make_unique<CLectAR>(point, reading, kSight), kKindLectAR), 0);
+    }
+    void Forward(const char* point, double reading) {
+        ASSERT_GE(carnet.Add(std::make_unique<CLectAV>(point, reading, kSight), kKindLectAV), 0);
+    }
+    // One set-up from `from` (height zFrom) to `to` (height zTo), the back staff read at `back`.
+    void SetUp(const char* from, double zFrom, const char* to, double zTo, double back = 1.5) {
+        Back(from, back);
+        Forward(to, back + zFrom - zTo);
+    }
+    // The simple run A - T1 - (S) - T2 - B, B's height in the GéoBase being `zB`.
+    void WriteSimple(double zB) {
+        Benchmark("A", kA);
+        Benchmark("B", zB);
+        SetUp("A", kA, "T1", kT1, 1.432);
+        Back("T1", 0.512);
+        Forward("S", 0.512 + kT1 - kS);
+        Forward("T2", 0.512 + kT1 - kT2);
+        SetUp("T2", kT2, "B", kB, 2.222);
+        Save();
+    }
+    void Save() { ASSERT_EQ(carnet.Save(dir / "chantier.geo"), 1); }
+    double SavedZ(const CCarnet& saved, const char* name) {
+        const int at = saved.findMat(name);
+        return at >= 0 ? saved.zAt(at) : kUndefined;
+    }
+};
+
+TEST_F(NivCommand, AMisclosureOfSixMillimetresIsSharedAlongTheRunAndWritten) {
+    WriteSimple(kB + 0.006); // f = -6 mm over three equal set-ups: +2 mm each
+    const Outcome outcome = Run("CalNivSm --geobase chantier.geo --enregistrer --listing niv.cns");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    ExpectInOrder(outcome.out,
+                  {"Cheminement A - B : 3 dénivelée(s), longueur 180.000 m",
+                   "Fermeture -0.0060 m, tolérance 0.0100 m", "3 altitude(s) écrite(s) dans la GéoBase."});
+    EXPECT_FALSE(Has(outcome.out, "HORS TOLÉRANCE"));
+    const CCarnet saved = Saved();
+    EXPECT_NEAR(SavedZ(saved, "T1"), kT1 + 0.002, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "T2"), kT2 + 0.004, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "S"), kS + 0.002, kTenthMm); // from T1's compensated height
+    EXPECT_NEAR(SavedZ(saved, "B"), kB + 0.006, kTenthMm); // the benchmarks keep theirs
+    EXPECT_NEAR(SavedZ(saved, "A"), kA, kTenthMm);
+    EXPECT_FALSE(saved.As<CPointGen>(saved.findMat("T1"))->hasXY());
+
+    const std::string listing = ReadBytes(dir / "niv.cns");
+    ExpectInOrder(listing,
+                  {"Cheminement altimétrique de A à B", "Stations du niveau", "Lect. AR", "Dénivelée",
+                   "Correction", "T1", "+0.0020", "Points rayonnés", "S", "Fermeture = -0.0060 m",
+                   "tolérance 0.0100 m", "Compensation proportionnelle aux portées."});
+    EXPECT_TRUE(Has(ReadBytes(dir / "chantier.jnl"), "Calcul de cheminements altimétriques"));
+}
+
+TEST_F(NivCommand, ExactReadingsGiveTheTrueHeightsAndTheRunsCanBeChosen) {
+    WriteSimple(kB);
+    Outcome outcome = Run("CalNivSm --geobase chantier.geo --depart B --enregistrer");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.err, "ne correspond au départ et à l'arrivée demandés (départ B)"))
+        << outcome.err;
+    EXPECT_FALSE(IsKnown(SavedZ(Saved(), "T1")));
+
+    outcome = Run("CalNivSm --geobase chantier.geo --depart A --arrivee B --enregistrer");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    const CCarnet saved = Saved();
+    EXPECT_NEAR(SavedZ(saved, "T1"), kT1, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "T2"), kT2, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "S"), kS, kTenthMm);
+}
+
+TEST_F(NivCommand, OutOfToleranceItIsWrittenOnlyWhenTheSurveyorSaysSo) {
+    WriteSimple(kB + 0.030); // f = -30 mm, tolerance 10 mm
+    Outcome outcome = Run("CalNivSm --geobase chantier.geo --enregistrer --non --listing niv.cns");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(Has(outcome.out, "Fermeture -0.0300 m, tolérance 0.0100 m  HORS TOLÉRANCE")) << outcome.out;
+    EXPECT_TRUE(Has(outcome.err, "Le cheminement altimétrique de <A> à <B> est hors tolérance"))
+        << outcome.err;
+    EXPECT_TRUE(Has(outcome.out, "Cheminement A - B : non enregistré.")) << outcome.out;
+    EXPECT_FALSE(IsKnown(SavedZ(Saved(), "T1")));
+    EXPECT_TRUE(Has(ReadBytes(dir / "niv.cns"), "HORS TOLÉRANCE"));
+
+    outcome = Run("CalNivSm --geobase chantier.geo --enregistrer --oui");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_NEAR(SavedZ(Saved(), "T1"), kT1 + 0.010, kTenthMm);
+    EXPECT_NEAR(SavedZ(Saved(), "T2"), kT2 + 0.020, kTenthMm);
+}
+
+TEST_F(NivCommand, DoubleStationAveragesEachPairAndNamesThePairOutOfTolerance) {
+    // A - T1 levelled twice within 2 mm; T1 - B twice, 30 mm apart (tolerance 10 mm).
+    Benchmark("A", kA);
+    Benchmark("B", kB);
+    SetUp("A", kA, "T1", kT1 + 0.001, 1.4);
+    SetUp("A", kA, "T1", kT1 - 0.001, 1.6);
+    SetUp("T1", kT1, "B", kB + 0.015, 1.3);
+    SetUp("T1", kT1, "B", kB - 0.015, 1.7);
+    Save();
+    Outcome outcome = Run("CalNivSt --geobase chantier.geo --enregistrer --oui --listing niv.cna");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    ExpectInOrder(outcome.out, {"Cheminement A - B : 2 dénivelée(s)", "Fermeture 0.0000 m",
+                                "Attention : les deux dénivelées de T1 à B", "diffèrent de 0.0300 m"});
+    EXPECT_TRUE(Has(outcome.err, "dénivelées mal contrôlées")) << outcome.err;
+    EXPECT_NEAR(SavedZ(Saved(), "T1"), kT1, kTenthMm); // the mean of the pair
+    ExpectInOrder(ReadBytes(dir / "niv.cna"),
+                  {"Nivellement par double station de A à B", "Moyenne", "Écart", "+0.0020", "+0.0300 *",
+                   "Remarques", "les deux dénivelées de T1 à B"});
+    EXPECT_TRUE(Has(ReadBytes(dir / "chantier.jnl"), "Calcul de nivellement par double station"));
+
+    Save(); // T1 unknown again: the same run refused this time
+    outcome = Run("CalNivSt --geobase chantier.geo --enregistrer --non");
+    EXPECT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_FALSE(IsKnown(SavedZ(Saved(), "T1")));
+}
+
+TEST_F(NivCommand, WithoutStaffReadingOrBenchmarkItSaysSoAndWritesNothing) {
+    Benchmark("A", kA);
+    Save();
+    std::string before = ReadBytes(dir / "chantier.geo");
+    Outcome outcome = Run("CalNivSm --geobase chantier.geo --enregistrer");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.err, "ne contient aucune lecture sur mire !")) << outcome.err;
+    EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
+
+    carnet = CCarnet();
+    SetUp("P1", 10.0, "P2", 11.0);
+    SetUp("P2", 11.0, "P3", 12.0);
+    Save();
+    before = ReadBytes(dir / "chantier.geo");
+    outcome = Run("CalNivSt --geobase chantier.geo --enregistrer");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.out, "le cheminement de P1 à P3 ne passe par aucun repère d'altitude connue"))
+        << outcome.out;
+    EXPECT_TRUE(Has(outcome.err, "Aucun cheminement altimétrique n'a pu être calculé")) << outcome.err;
+    EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
+}
+
+} // namespace
+} // namespace pyr::test
