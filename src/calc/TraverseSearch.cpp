@@ -1,26 +1,26 @@
 #include "calc/TraverseSearch.h"
 
+#include "calc/SightingReduction.h"
 #include "core/Strings.h"
 #include "geobase/Carnet.h"
 
 #include <algorithm>
 #include <set>
-#include <string_view>
-#include <unordered_map>
 #include <unordered_set>
 
 namespace pyr {
 
 namespace {
 
-// One set-up: its station element, its point, what it sights, its neighbours (edge numbers).
+// One set-up: its station element, its point (by the rank of its identifier in the GéoBase), the points it
+// sights (their ranks, each once, sorted), its neighbours (edge numbers).
 struct SetUp {
     int index = -1;
-    std::string_view name;
-    std::unordered_set<std::string_view> sighted;
-    std::vector<std::string_view> order; // the points sighted, each once, in the order of the sightings
+    int rank = -1;
+    std::vector<int> sighted;
     std::vector<int> edges;
     bool known = false;
+    bool Sights(int point) const { return std::binary_search(sighted.begin(), sighted.end(), point); }
 };
 
 struct Edge {
@@ -37,44 +37,51 @@ std::string Designation(const CCarnet& carnet, int stationIndex) {
 } // namespace
 
 std::vector<FoundTraverse> FindTraverses(const CCarnet& carnet) {
-    // The set-ups and what each sights.
+    // The set-ups and what each sights, identifiers compared by their ranks in the GéoBase's index.
     std::vector<SetUp> setUps;
-    std::unordered_map<std::string_view, std::vector<int>> byName;
+    std::vector<int> firstOnPoint(static_cast<std::size_t>(carnet.NameCount()), -1); // by rank
+    std::vector<int> nextOnPoint;                                                    // by set-up
     for (int i = 0; i < carnet.GetSize(); ++i) {
         const int kind = carnet.GetType(i);
         if (kind == kKindStation) {
             SetUp setUp;
             setUp.index = i;
-            setUp.name = carnet.GetAt(i)->mat();
-            setUp.known = carnet.hasXY(setUp.name);
-            byName[setUp.name].push_back(static_cast<int>(setUps.size()));
+            setUp.rank = carnet.NameRank(i);
+            double x = 0.0, y = 0.0, z = 0.0;
+            setUp.known = PointPlaceOf(carnet, i, x, y, z);
+            const int number = static_cast<int>(setUps.size());
+            if (setUp.rank >= 0) {
+                int& first = firstOnPoint[static_cast<std::size_t>(setUp.rank)];
+                nextOnPoint.push_back(first);
+                first = number;
+            } else {
+                nextOnPoint.push_back(-1);
+            }
             setUps.push_back(std::move(setUp));
-        } else if (IsSightingKind(kind) && !setUps.empty()) {
-            SetUp& setUp = setUps.back();
-            if (setUp.sighted.insert(carnet.GetAt(i)->mat()).second)
-                setUp.order.push_back(carnet.GetAt(i)->mat());
+        } else if (IsSightingKind(kind) && !setUps.empty() && carnet.NameRank(i) >= 0) {
+            setUps.back().sighted.push_back(carnet.NameRank(i));
         }
+    }
+    for (SetUp& setUp : setUps) {
+        std::sort(setUp.sighted.begin(), setUp.sighted.end());
+        setUp.sighted.erase(std::unique(setUp.sighted.begin(), setUp.sighted.end()), setUp.sighted.end());
     }
     // The neighbours: each sights the other's point.
     std::vector<Edge> edges;
-    for (int a = 0; a < static_cast<int>(setUps.size()); ++a)
-        for (std::string_view name : setUps[static_cast<std::size_t>(a)].order) {
-            const auto found = byName.find(name);
-            if (found == byName.end()) continue;
-            for (int b : found->second) {
-                if (b <= a ||
-                    setUps[static_cast<std::size_t>(b)].name == setUps[static_cast<std::size_t>(a)].name)
-                    continue;
-                if (!setUps[static_cast<std::size_t>(b)].sighted.contains(
-                        setUps[static_cast<std::size_t>(a)].name))
-                    continue;
+    for (int a = 0; a < static_cast<int>(setUps.size()); ++a) {
+        const SetUp& from = setUps[static_cast<std::size_t>(a)];
+        for (const int point : from.sighted)
+            for (int b = firstOnPoint[static_cast<std::size_t>(point)]; b >= 0;
+                 b = nextOnPoint[static_cast<std::size_t>(b)]) {
+                SetUp& to = setUps[static_cast<std::size_t>(b)];
+                if (b <= a || to.rank == from.rank || !to.Sights(from.rank)) continue;
                 const int edge = static_cast<int>(edges.size());
                 edges.push_back({a, b});
                 setUps[static_cast<std::size_t>(a)].edges.push_back(edge);
-                setUps[static_cast<std::size_t>(b)].edges.push_back(edge);
+                to.edges.push_back(edge);
             }
-        }
-    // Each set-up's edges in the order they were found, the GéoBase's: the search is the same each time.
+    }
+    // Each set-up's edges in the order they were found: the search is the same each time.
     for (SetUp& setUp : setUps)
         std::sort(setUp.edges.begin(), setUp.edges.end());
 
@@ -112,7 +119,7 @@ std::vector<FoundTraverse> FindTraverses(const CCarnet& carnet) {
                 edges[static_cast<std::size_t>(e)].used = true;
             if (!reached) continue;
             FoundTraverse traverse;
-            const bool closed = setUps[static_cast<std::size_t>(chain.back())].name == first.name;
+            const bool closed = setUps[static_cast<std::size_t>(chain.back())].rank == first.rank;
             traverse.closed = closed;
             if (closed) chain.pop_back(); // a closed traverse names its start once
             for (int node : chain)
