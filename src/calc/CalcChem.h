@@ -48,10 +48,8 @@ public:
     void ChooseAll() { m_chosen.clear(); }
     const std::vector<int>& Chosen() const { return m_chosen; }
     TraverseGatherSettings& Settings() { return m_settings; }
-    TraverseTolerances& ClosureTolerances() { return m_tolerances; }
     // The switches of "Cheminements" (TraverseTexts.h), read at Open.
     int Switches() const { return m_switches; }
-    void SetSwitches(int switches) { m_switches = switches; }
 
     // ---- Actions
     // "Recherche automatique": the traverses found among the set-ups written into the GéoBase, which is

@@ -115,14 +115,6 @@ bool ExportFile::Commit() {
     return false;
 }
 
-bool WriteExportFile(const PointExportJob& job, std::string_view text) {
-    SafeFileWriter writer(job.path,
-                          job.append ? SafeFileWriter::Start::CopyOfFile : SafeFileWriter::Start::Empty);
-    if (writer.Error() == 0 && writer.Write(text) && writer.Commit()) return true;
-    ExportFrontEnd(job).ReportFailure(writer.FailureText());
-    return false;
-}
-
 bool CheckExportSettingsFile(const PointExportJob& job) {
     ui::FrontEnd& frontEnd = ExportFrontEnd(job);
     if (job.paramFile.empty()) {

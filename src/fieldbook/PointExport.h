@@ -62,11 +62,6 @@ std::vector<int> ExportedPoints(const PointExportJob& job);
 // selection (as a point when it is one, else as an observation element) and its identifier in the range.
 std::vector<bool> ElementsInScope(const PointExportJob& job);
 
-// Writes the text of an export to the job's file, whole or not at all: it replaces the file, or with
-// `append` follows its present contents. False when it cannot: the message, naming the file and the
-// reason, is shown on the job's front end, and the file is left as it was.
-bool WriteExportFile(const PointExportJob& job, std::string_view text);
-
 // The file of an export written as it is made, a megabyte at a time, so that a million points never
 // stand whole in memory: the writer appends its records to Text() and calls Flush() after each. The file
 // is replaced, or with `append` completed, whole or not at all, at Commit.
