@@ -47,6 +47,11 @@ void WriteTraverse(CDlgCfgListing& listing, const TraverseReport& report) {
     const TraverseResult& r = report.result;
     const TraverseInput& input = report.gathered.input;
     const bool swap = CPointGen::SwapXY();
+    if (!r.ok) { // named with its reason, and nothing else to list
+        DrawFrame(listing, {Sprintf(chem::kLineNotComputed, report.name.c_str(), r.why.c_str())}, true);
+        Blank(listing);
+        return;
+    }
     DrawFrame(listing, {Sprintf(chem::kListTraverse, report.name.c_str(), TraverseKindText(input.kind))},
               true);
     Blank(listing);

@@ -121,6 +121,18 @@ TEST_F(ChemCommand, WhatCannotBeComputedIsNamedAndNothingWritten) {
     EXPECT_TRUE(Has(outcome.err, "ne contient aucun cheminement")) << outcome.err;
     EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
     Write();
+    // A traverse through a station the GéoBase does not hold: named on screen and in the listing.
+    CCarnet withGap = Saved();
+    auto broken = std::make_unique<CChemin>("CH2");
+    for (const char* name : {"A", "T9", "B"})
+        broken->add(name);
+    withGap.Add(std::move(broken), kKindChemin);
+    ASSERT_EQ(withGap.Save(dir / "chantier.geo"), 1);
+    outcome = Run("--cheminement CH2 --enregistrer --listing ch2.ccp");
+    EXPECT_EQ(outcome.status, 1);
+    EXPECT_TRUE(Has(outcome.out, "Cheminement CH2 non calculé : la station <T9> n'est pas dans la GéoBase"))
+        << outcome.out;
+    EXPECT_TRUE(Has(ReadBytes(dir / "ch2.ccp"), "la station <T9> n'est pas dans la GéoBase")) << outcome.err;
     outcome = Run("--cheminement CH9 --enregistrer");
     EXPECT_EQ(outcome.status, 1);
     EXPECT_TRUE(Has(outcome.err, "Le cheminement <CH9> n'est pas dans la GéoBase !")) << outcome.err;
