@@ -43,6 +43,9 @@ void CCalcChem::ReadOptions() {
     m_tolerances.angular = ReadOptionReal(path, kSectionTolerances, chem::kKeyAngular);
     m_tolerances.planimetric = ReadOptionReal(path, kSectionTolerances, chem::kKeyPlanimetric);
     m_tolerances.height = ReadOptionReal(path, kSectionTolerances, chem::kKeyHeight);
+    const ToleranceMode mode = m_session.Tolerance().mode;
+    m_tolerances.angularFromInstruments = mode != ToleranceMode::Custom;
+    m_tolerances.direction = mode == ToleranceMode::Precise ? kV0TolerancePrecise : kV0ToleranceNormal;
 }
 
 void CCalcChem::ListTraverses() {
@@ -82,7 +85,7 @@ std::string CCalcChem::Close(bool, bool listingAsked, std::string listingPath) {
     request.resultCount = m_results.size();
     request.writeResult = [this](CDlgCfgListing& listing, std::size_t index) {
         const ComputedTraverse& t = m_results[index];
-        WriteTraverse(listing, {t.name, t.gathered, t.result, m_tolerances});
+        WriteTraverse(listing, {t.name, t.gathered, t.result, t.tolerances});
     };
     request.writeTolerances = [this](CDlgCfgListing& listing) {
         WriteTraverseTolerances(listing, m_tolerances);
@@ -142,15 +145,15 @@ void CCalcChem::Show(const ComputedTraverse& t) {
                   w.tolerance);
     if (IsKnown(r.angularMisclosure))
         txt.Print(chem::kLineAngular, FormatFixedShown(r.angularMisclosure, 4).c_str(),
-                  FormatFixedShown(m_tolerances.angular, 4).c_str(), Beyond(t.angularOut));
+                  FormatFixedShown(t.tolerances.angular, 4).c_str(), Beyond(t.angularOut));
     if (IsKnown(r.f))
         txt.Print(chem::kLinePlanimetric, FormatFixedShown(r.fx, 4).c_str(),
                   FormatFixedShown(r.fy, 4).c_str(), FormatFixedShown(r.f, 4).c_str(),
-                  TraverseRatioText(r).c_str(), FormatFixedShown(m_tolerances.planimetric, 4).c_str(),
+                  TraverseRatioText(r).c_str(), FormatFixedShown(t.tolerances.planimetric, 4).c_str(),
                   Beyond(t.planimetricOut));
     if (IsKnown(r.fz))
         txt.Print(chem::kLineHeight, FormatFixedShown(r.fz, 4).c_str(),
-                  FormatFixedShown(m_tolerances.height, 4).c_str(), Beyond(t.heightOut));
+                  FormatFixedShown(t.tolerances.height, 4).c_str(), Beyond(t.heightOut));
 }
 
 bool CCalcChem::Calculate() {
@@ -184,13 +187,17 @@ bool CCalcChem::Calculate() {
         } else {
             t.result.why = t.gathered.why;
         }
+        t.tolerances = m_tolerances;
         if (t.result.ok) {
             ++computed;
             const TraverseResult& r = t.result;
+            if (m_tolerances.angularFromInstruments)
+                t.tolerances.angular =
+                    AngularClosureTolerance(carnet, t.gathered, r.angles, m_tolerances.direction);
             t.angularOut =
-                IsKnown(r.angularMisclosure) && std::fabs(r.angularMisclosure) > m_tolerances.angular;
-            t.planimetricOut = IsKnown(r.f) && r.f > m_tolerances.planimetric;
-            t.heightOut = IsKnown(r.fz) && std::fabs(r.fz) > m_tolerances.height;
+                IsKnown(r.angularMisclosure) && std::fabs(r.angularMisclosure) > t.tolerances.angular;
+            t.planimetricOut = IsKnown(r.f) && r.f > t.tolerances.planimetric;
+            t.heightOut = IsKnown(r.fz) && std::fabs(r.fz) > t.tolerances.height;
         }
         Show(t);
         m_results.push_back(std::move(t));

@@ -17,6 +17,7 @@ struct ComputedTraverse {
     int element = -1; // of the traverse (1007) in the GéoBase
     GatheredTraverse gathered;
     TraverseResult result;
+    TraverseTolerances tolerances; // the angular one is this traverse's own with normal or precise tolerances
     bool angularOut = false;
     bool planimetricOut = false;
     bool heightOut = false;
@@ -61,6 +62,8 @@ public:
     bool Enregistrer();
 
     const std::vector<ComputedTraverse>& Results() const { return m_results; }
+    // The tolerances of the three closures, read at Open.
+    const TraverseTolerances& Tolerances() const { return m_tolerances; }
     const CCarnet& Carnet() const { return m_session.Carnet(); }
 
 private:

@@ -141,4 +141,21 @@ GatheredTraverse GatherTraverse(const CCarnet& carnet, const CChemin& traverse,
     return gathered;
 }
 
+double AngularClosureTolerance(const CCarnet& carnet, const GatheredTraverse& gathered, int angles,
+                               double direction) {
+    // A tolerance is 2.7 standard deviations, the convention of French surveying regulations.
+    constexpr double kToleranceOverSigma = 2.7;
+    if (angles <= 0) return 0.0;
+    double sum = 0.0;
+    for (const StationPlace& place : gathered.places) {
+        const CAppareil* instrument = carnet.findAppAt(place.index);
+        const double t = instrument && instrument->sigmaAh() > 0.0
+                             ? kToleranceOverSigma * instrument->sigmaAh()
+                             : direction;
+        sum += t * t;
+    }
+    const double meanSquare = gathered.places.empty() ? direction * direction : sum / gathered.places.size();
+    return std::sqrt(2.0 * angles * meanSquare);
+}
+
 } // namespace pyr

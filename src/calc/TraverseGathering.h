@@ -47,4 +47,13 @@ struct GatheredTraverse {
 GatheredTraverse GatherTraverse(const CCarnet& carnet, const CChemin& traverse,
                                 const TraverseGatherSettings& settings);
 
+// The tolerance (grads) of the angular closure of a traverse shared among `angles` angles, from the
+// precision of the instruments it was measured with: a direction of a station is good to
+// t = 2.7 sigma of its instrument ("SigmaAh" of the GéoBase's instrument in use at the set-up), or to
+// `direction` when the instrument gives no precision; an angle is the difference of two directions and
+// the closure the sum of the angles, so T = sqrt(2 x angles x mean of t^2), t sqrt(2n) when every
+// station has the same instrument.
+double AngularClosureTolerance(const CCarnet& carnet, const GatheredTraverse& gathered, int angles,
+                               double direction);
+
 } // namespace pyr

@@ -37,7 +37,11 @@ const char* TraverseKindText(TraverseKind kind) {
 }
 
 void WriteTraverseTolerances(CDlgCfgListing& listing, const TraverseTolerances& tolerances) {
-    listing.WriteLine(chem::kListTolerances, listing.FormatAngl(tolerances.angular).c_str(),
+    const std::string angular =
+        tolerances.angularFromInstruments
+            ? Sprintf(chem::kListAngularFromInstruments, listing.FormatAngl(tolerances.direction).c_str())
+            : listing.FormatAngl(tolerances.angular) + " gr";
+    listing.WriteLine(chem::kListTolerances, angular.c_str(),
                       listing.FormatDist(tolerances.planimetric).c_str(),
                       listing.FormatDist(tolerances.height).c_str());
     listing.WriteText("\n");

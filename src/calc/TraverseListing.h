@@ -16,6 +16,11 @@ struct TraverseTolerances {
     double angular = 0.01;
     double planimetric = 0.01;
     double height = 0.01;
+    // Normal or precise tolerances: the angular one of each traverse comes from its instruments'
+    // precision (AngularClosureTolerance), `direction` (grads) standing for an instrument without one;
+    // custom tolerances: "FermAngulaire" as it stands.
+    bool angularFromInstruments = false;
+    double direction = 0.0;
 };
 
 struct TraverseReport {

@@ -76,6 +76,8 @@ inline constexpr const char* kListHeight = "Fermeture altimétrique = %s m, tol�
 inline constexpr const char* kListOutOfTolerance = "HORS TOLÉRANCE";
 inline constexpr const char* kListOpen = "Cheminement en antenne : aucune fermeture, aucun contrôle.";
 inline constexpr const char* kListTolerances =
-    "Tolérances de fermeture : angulaire %s gr, planimétrique %s m, altimétrique %s m";
+    "Tolérances de fermeture : angulaire %s, planimétrique %s m, altimétrique %s m";
+inline constexpr const char* kListAngularFromInstruments =
+    "2.7 sigma x racine(2n) gr (sigma de l'appareil, %s gr par direction à défaut)";
 
 } // namespace pyr::chem

@@ -3,7 +3,9 @@
 #include "calc/TraverseGathering.h"
 #include "calc/test_v0_geometry.h"
 #include "core/Angles.h"
+#include "geobase/Carnet.h"
 
+#include <cmath>
 #include <gtest/gtest.h>
 
 namespace pyr::test {
@@ -16,13 +18,22 @@ const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 5
 const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
 constexpr double kHi = 1.55, kHp = 1.3;
 
+void AddInstrument(CCarnet& carnet, double sigmaAh) {
+    auto instrument = std::make_unique<CAppareil>("T");
+    instrument->setSigmaAh(sigmaAh);
+    carnet.Add(std::move(instrument), kKindAppareil);
+}
+
 // A, B and their references known; T1 and T2 set up in between, each instrument oriented its own way.
-CCarnet Job(bool endKnown = true) {
+// With `sigmaAh`, A and T1 are measured with an instrument of that precision of directions, T2 and B
+// with one that gives none.
+CCarnet Job(bool endKnown = true, double sigmaAh = 0.0) {
     CCarnet carnet;
     AddPoint(carnet, "A", kA);
     AddPoint(carnet, "R1", kR1);
     if (endKnown) AddPoint(carnet, "B", kB);
     AddPoint(carnet, "R2", kR2);
+    if (sigmaAh > 0.0) AddInstrument(carnet, sigmaAh);
     AddStation(carnet, "A", kHi);
     AddSighting(carnet, "R1", kA, kHi, kR1, kHp, 12.5);
     AddSighting(carnet, "T1", kA, kHi, kT1, kHp, 12.5, kKindMesure);
@@ -30,6 +41,7 @@ CCarnet Job(bool endKnown = true) {
     AddSighting(carnet, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
     AddSighting(carnet, "T2", kT1, kHi, kT2, kHp, 210.0, kKindMesure);
     AddSighting(carnet, "T2", kT1, kHi, kT2, kHp, 210.0, kKindMesure); // measured twice
+    if (sigmaAh > 0.0) AddInstrument(carnet, 0.0);
     AddStation(carnet, "T2", kHi);
     AddSighting(carnet, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
     AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
@@ -102,6 +114,22 @@ TEST(TraverseGathering, ALegWhoseTwoMeasuresDisagreeIsSaidAndItsMeanUsed) {
     EXPECT_FALSE(gathered.warnings[0].height);
     const double straight = std::hypot(kT1.x - kA.x, kT1.y - kA.y);
     EXPECT_NEAR(gathered.input.stations[0].distance, straight + 0.025, 2e-3);
+}
+
+// Each station's directions are good to 2.7 sigma of its instrument, or to the tolerance of one direction
+// when the instrument gives no precision; the closure of n angles sums 2n directions.
+TEST(TraverseGathering, TheAngularToleranceComesFromTheInstrumentsOfItsStations) {
+    const CCarnet carnet = Job(true, 0.001);
+    const GatheredTraverse gathered = GatherTraverse(carnet, Chain({"A", "T1", "T2", "B"}), {});
+    ASSERT_TRUE(gathered.ok) << gathered.why;
+    // A and T1: 0.0027 gr; T2 and B: 0.0043 gr; 4 angles.
+    const double meanSquare = (2 * 0.0027 * 0.0027 + 2 * 0.0043 * 0.0043) / 4;
+    EXPECT_NEAR(AngularClosureTolerance(carnet, gathered, 4, 0.0043), std::sqrt(8 * meanSquare), 1e-7);
+    // No instrument at all: 0.0018 gr x sqrt(2 x 5) for precise work over 5 angles.
+    const CCarnet bare = Job();
+    const GatheredTraverse plain = GatherTraverse(bare, Chain({"A", "T1", "T2", "B"}), {});
+    EXPECT_NEAR(AngularClosureTolerance(bare, plain, 5, 0.0018), 0.0018 * std::sqrt(10.0), 1e-7);
+    EXPECT_EQ(AngularClosureTolerance(bare, plain, 0, 0.0018), 0.0);
 }
 
 } // namespace

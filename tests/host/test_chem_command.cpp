@@ -17,7 +17,8 @@ class ChemCommand : public PyralisTest {
 protected:
     // A, B and their references known; T1 and T2 set up between them; the traverse CH1 written, unless
     // `withTraverse` is off. `t2Shift` moves where T2 really stood (metres east) when T1 sights it.
-    void Write(bool withTraverse = true, double t2Shift = 0.0) {
+    // `twist` turns T2's reading on B (grads): an angular misclosure of that much.
+    void Write(bool withTraverse = true, double t2Shift = 0.0, double twist = 0.0) {
         CCarnet carnet;
         for (const auto& [name, place] : {std::pair{"A", kA}, {"R1", kR1}, {"B", kB}, {"R2", kR2}})
             AddPoint(carnet, name, place);
@@ -31,7 +32,7 @@ protected:
         AddSighting(carnet, "P1", kT1, kHi, kP1, kHp, 210.0, kKindMesure);
         AddStation(carnet, "T2", kHi);
         AddSighting(carnet, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
-        AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
+        AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995 - twist, kKindMesure);
         AddStation(carnet, "B", kHi);
         AddSighting(carnet, "T2", kB, kHi, kT2, kHp, 77.0, kKindMesure);
         AddSighting(carnet, "R2", kB, kHi, kR2, kHp, 77.0);
@@ -95,6 +96,25 @@ TEST_F(ChemCommand, OutOfToleranceItIsWrittenOnlyWhenTheSurveyorSaysSo) {
     outcome = Run("--enregistrer --oui");
     EXPECT_EQ(outcome.status, 0) << outcome.err;
     EXPECT_GE(Saved().findMat("T1"), 0);
+}
+
+// 8 mgon over 4 angles measured with instruments that give no precision: within 4.3 mgon x sqrt(8) for
+// ordinary work, beyond 1.8 mgon x sqrt(8) for precise work, and against "FermAngulaire" when the
+// tolerances are the surveyor's own.
+TEST_F(ChemCommand, TheAngularToleranceFollowsTheKindOfTolerances) {
+    Write(true, 0.0, 0.008);
+    Outcome outcome = Run("--non --listing chem.ccp");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(Has(outcome.out, "Fermeture angulaire 0.0080 gr, tolérance 0.0122 gr\n")) << outcome.out;
+    EXPECT_TRUE(Has(ReadBytes(dir / "chem.ccp"), "angulaire 2.7 sigma x racine(2n) gr (sigma de l'appareil, "
+                                                 "0.0043"));
+    WriteBytes(dir / "Pyralis.ini", "[Options_Tolerances]\r\nTypeTolerance=1\r\n");
+    outcome = Run("--enregistrer --non");
+    EXPECT_TRUE(Has(outcome.out, "tolérance 0.0051 gr  HORS TOLÉRANCE")) << outcome.out;
+    EXPECT_TRUE(Has(outcome.err, "(angulaire")) << outcome.err;
+    WriteBytes(dir / "Pyralis.ini", "[Options_Tolerances]\r\nTypeTolerance=2\r\nFermAngulaire=0.009\r\n");
+    outcome = Run("--non");
+    EXPECT_TRUE(Has(outcome.out, "tolérance 0.0090 gr\n")) << outcome.out;
 }
 
 TEST_F(ChemCommand, TheSearchFindsTheTraverseWritesItAndTheComputationFollows) {
