@@ -175,6 +175,65 @@ TEST(Traverse, MisclosuresAreSharedAsTheCompassRuleSharesThemByHand) {
     EXPECT_NEAR(c.stations[3].y, 1000.0, 1e-9);
 }
 
+// A published worked example: the linked traverse S1-S2-S3-S4 of the corrected exercise
+// "ChEncadre3Correction" (fr.scribd.com/document/553771121), angles measured to the right, starting bearing
+// R1-S1 320.159 gr, closing bearing S4-R2 330.616 gr. Its figures are rounded to the millimetre and the
+// milligrad (60.1666 m is written 60.166), so lengths are compared to the millimetre they keep.
+TEST(Traverse, APublishedLinkedTraverseIsComputedAsItsCorrectionShows) {
+    struct Row {
+        const char* name;
+        double angle;    // to the right: the back reading minus the forward reading
+        double distance; // to the next station
+    };
+    const Row rows[] = {{"S1", 250.717, 246.522},
+                        {"S2", 154.892, 264.843},
+                        {"S3", 238.949, 218.961},
+                        {"S4", 145.065, kUndefined}};
+    // Each instrument oriented on the bearings the angles carry from R1, so that its readings are
+    // those bearings: the first station sights R1 at 120.159 gr, the last one R2 at 330.616 gr.
+    TraverseInput input;
+    input.kind = TraverseKind::Linked;
+    input.x0 = 10964.9, input.y0 = 5491.52, input.v00 = 0.0;
+    input.xn = 10285.1, input.yn = 5356.271;
+    double back = WrapGrads(320.159 + 200.0);
+    for (const Row& row : rows) {
+        TraverseStation station{row.name};
+        const double forward = WrapGrads(back - row.angle);
+        if (&row != rows) station.back = back;
+        if (&row != std::end(rows) - 1)
+            station.forward = forward, station.distance = row.distance;
+        else
+            input.v0n = 330.616 - forward; // the known closing bearing over the reading to R2
+        input.stations.push_back(station);
+        back = WrapGrads(forward + 200.0);
+    }
+    const TraverseResult result = ComputeTraverse(input);
+    ASSERT_TRUE(result.ok) << result.why;
+    // fa = 330.536 - 330.616 = -0.080 gr, 20 mgon given to each of the 4 angles.
+    EXPECT_NEAR(result.angularMisclosure, -0.080, kTenthMgon);
+    EXPECT_EQ(result.angles, 4);
+    const double bearings[] = {269.462, 314.590, 275.661};
+    const double dx[] = {-218.699, -257.918, -203.153}, dy[] = {-113.771, 60.166, -81.688};
+    for (int i = 0; i < 3; ++i) {
+        SCOPED_TRACE(i);
+        EXPECT_NEAR(result.legs[i].bearing, bearings[i], kTenthMgon);
+        EXPECT_NEAR(result.legs[i].dx, dx[i], 0.001);
+        EXPECT_NEAR(result.legs[i].dy, dy[i], 0.001);
+    }
+    // fx = +0.030 m, fy = -0.044 m, shared in proportion to the legs over 730.326 m.
+    EXPECT_NEAR(result.fx, 0.030, 0.001);
+    EXPECT_NEAR(result.fy, -0.044, 0.001);
+    EXPECT_NEAR(result.legs[0].cx, -0.0101, 0.001);
+    EXPECT_NEAR(result.legs[0].cy, 0.0149, 0.001);
+    const double x[] = {10964.9, 10746.191, 10488.262, 10285.1},
+                 y[] = {5491.52, 5377.764, 5437.946, 5356.271};
+    for (int i = 0; i < 4; ++i) {
+        SCOPED_TRACE(rows[i].name);
+        EXPECT_NEAR(result.stations[i].x, x[i], 0.001);
+        EXPECT_NEAR(result.stations[i].y, y[i], 0.001);
+    }
+}
+
 TEST(Traverse, WhatCannotBeComputedIsNamed) {
     const std::vector<Place> places = Winding();
     TraverseInput input = Exact(places, TraverseKind::Linked);
