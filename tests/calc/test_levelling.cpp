@@ -302,5 +302,61 @@ TEST(Levelling, PublishedLevelCircuit) {
         EXPECT_NEAR(run.steps[i].zTo, adjusted[i], kHundredthMm) << i;
 }
 
+// Published field notes: a run of five set-ups with side readings from OBM 1 (29.23 m) to OBM 2 (29.66 m),
+// without distances (Universiti Sains Malaysia, levelling lecture, "height of plane of collimation"
+// example, https://civil.eng.usm.my/wamin/lecture1/FYPGeomatik/JS/Ukur%20Aras/JSSUAE1.htm):
+//   BS 1.717 OBM1 | IS 1.432 A | FS 1.716, BS 2.918 B | IS 2.272 C | FS 0.953, BS 0.816 D
+//   FS 3.005, BS 1.436 E | FS 1.391, BS 1.246 CP | IS 1.353 F | IS 1.462 G | FS 0.628 OBM2
+// Its initial heights: B 29.231, D 31.196, E 29.007, CP 29.052, OBM2 29.670, so f = +0.010 m, and its
+// adjustments -2 mm a set-up: B -2, D -4, E -6, CP -8. A side point is levelled from the instrument line
+// of its set-up, drawn from the compensated back point: A 29.515 (29.23 + 1.717 - 1.432), C 29.231 - 0.002
+// + 2.918 - 2.272 = 29.875, F and G 29.052 - 0.008 + 1.246 - 1.353 (1.462) = 28.937 (28.828). The notes
+// give them their set-up's own adjustment too (A 29.513): that share is a convention, theirs not ours.
+TEST(Levelling, PublishedFieldNotesWithSideReadings) {
+    FieldBook book;
+    book.Benchmark("OBM1", 29.23);
+    book.Benchmark("OBM2", 29.66);
+    book.Back("OBM1", 1.717);
+    book.Forward("A", 1.432);
+    book.Forward("B", 1.716);
+    book.Back("B", 2.918);
+    book.Forward("C", 2.272);
+    book.Forward("D", 0.953);
+    book.Back("D", 0.816);
+    book.Forward("E", 3.005);
+    book.Back("E", 1.436);
+    book.Forward("CP", 1.391);
+    book.Back("CP", 1.246);
+    book.Forward("F", 1.353);
+    book.Forward("G", 1.462);
+    book.Forward("OBM2", 0.628);
+    LevellingOptions options = Fixed(0.005);
+    options.closureMode = LevellingToleranceMode::PerSetUp;
+    const LevellingResult result = ComputeLevelling(book.carnet, options);
+    ASSERT_EQ(result.runs.size(), 1u);
+    const LevellingRun& run = result.runs[0];
+    EXPECT_EQ(run.start, "OBM1");
+    EXPECT_EQ(run.end, "OBM2");
+    EXPECT_FALSE(run.distributedByDistance);
+    EXPECT_NEAR(run.misclosure, 0.010, kHundredthMm);
+    EXPECT_NEAR(run.tolerance, 0.005 * std::sqrt(5.0), 1e-9);
+    EXPECT_TRUE(run.inTolerance);
+    ASSERT_EQ(run.steps.size(), 5u);
+    const double turning[] = {29.229, 31.192, 29.001, 29.044, 29.66};
+    for (std::size_t i = 0; i < 5; ++i) {
+        EXPECT_NEAR(run.steps[i].correction, -0.002, kHundredthMm) << i;
+        EXPECT_NEAR(run.steps[i].zTo, turning[i], kHundredthMm) << run.steps[i].to;
+    }
+    const auto side = [&](std::size_t step, std::size_t rank) {
+        return run.steps[step].setUps[0].sides[rank];
+    };
+    EXPECT_EQ(side(0, 0).point, "A");
+    EXPECT_NEAR(side(0, 0).z, 29.515, kHundredthMm);
+    EXPECT_NEAR(side(1, 0).z, 29.875, kHundredthMm);
+    EXPECT_EQ(side(4, 1).point, "G");
+    EXPECT_NEAR(side(4, 0).z, 28.937, kHundredthMm);
+    EXPECT_NEAR(side(4, 1).z, 28.828, kHundredthMm);
+}
+
 } // namespace
 } // namespace pyr
