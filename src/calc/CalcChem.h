@@ -62,8 +62,6 @@ public:
     bool Enregistrer();
 
     const std::vector<ComputedTraverse>& Results() const { return m_results; }
-    // The tolerances of the three closures, read at Open.
-    const TraverseTolerances& Tolerances() const { return m_tolerances; }
     const CCarnet& Carnet() const { return m_session.Carnet(); }
 
 private:

@@ -1,5 +1,7 @@
 #include "calc/CalcChemDriver.h"
 
+#include "calc/CalcChemForm.h"
+
 namespace pyr {
 
 namespace {
@@ -51,6 +53,10 @@ ui::DialogResult CCalcChemDriver::Run(ui::FrontEnd& frontEnd) {
     const bool saved = done && m_computation.save && chem.Enregistrer();
     chem.Close(saved, m_computation.listing, m_computation.listingPath);
     return done && (saved || !m_computation.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+std::unique_ptr<ui::Form> CCalcChemDriver::MakeForm() {
+    return std::make_unique<CCalcChemForm>(*this, m_model);
 }
 
 } // namespace pyr

@@ -4,6 +4,7 @@
 #include "calc/ComputationOptions.h"
 #include "ui/Dialog.h"
 
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -20,6 +21,8 @@ public:
     ui::DialogModel& Model() override { return m_model; }
     void DeclareOptions(ui::DialogOptions& options) override;
     ui::DialogResult Run(ui::FrontEnd& frontEnd) override;
+    // The window, over the same model.
+    std::unique_ptr<ui::Form> MakeForm() override;
 
 private:
     CCalcChem m_model;

@@ -10,6 +10,7 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace pyr {
@@ -76,6 +77,21 @@ std::string CCalcNiv::Close(bool, bool listingAsked, std::string listingPath) {
     request.ask = !listingAsked;
     request.path = std::move(listingPath);
     return m_session.Close(std::move(request));
+}
+
+std::vector<std::string> CCalcNiv::Benchmarks() const {
+    std::vector<std::string> names;
+    const CCarnet& carnet = m_session.Carnet();
+    const auto add = [&](const std::string& point) {
+        if (carnet.hasZ(point) && std::find(names.begin(), names.end(), point) == names.end())
+            names.push_back(point);
+    };
+    for (const std::vector<LevellingSetUp>& block : m_setUps.blocks)
+        for (const LevellingSetUp& setUp : block) {
+            add(setUp.backPoint);
+            add(setUp.forwardPoint);
+        }
+    return names;
 }
 
 bool CCalcNiv::Chosen(const LevellingRun& run) const {

@@ -37,6 +37,11 @@ public:
         m_start = std::move(start);
         m_end = std::move(end);
     }
+    const std::string& Start() const { return m_start; }
+    const std::string& End() const { return m_end; }
+    // The turning points of the readings whose height the GéoBase knows, where runs may start and end:
+    // in the order of the readings, each once.
+    std::vector<std::string> Benchmarks() const;
     LevellingOptions& Options() { return m_options; }
 
     // ---- Actions

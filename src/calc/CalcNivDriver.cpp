@@ -1,5 +1,7 @@
 #include "calc/CalcNivDriver.h"
 
+#include "calc/CalcNivForm.h"
+
 namespace pyr {
 
 namespace {
@@ -33,6 +35,10 @@ ui::DialogResult CCalcNivDriver::Run(ui::FrontEnd& frontEnd) {
     const bool saved = done && m_computation.save && niv.Enregistrer();
     niv.Close(saved, m_computation.listing, m_computation.listingPath);
     return done && (saved || !m_computation.save) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+}
+
+std::unique_ptr<ui::Form> CCalcNivDriver::MakeForm() {
+    return std::make_unique<CCalcNivForm>(*this, m_model);
 }
 
 } // namespace pyr

@@ -1,11 +1,14 @@
 // The windows of the computations driven as a desktop host drives them: the person's actions sent to the
 // form, the states read back after each one. The GéoBases are built from exact coordinates, so that the
 // points and orientations found are known beforehand.
+#include "FormPerson.h"
 #include "TestSupport.h"
+#include "calc/CalcChemDriver.h"
 #include "calc/CalcExcentDriver.h"
 #include "calc/CalcExcentForm.h"
 #include "calc/CalcIntersDriver.h"
 #include "calc/CalcIntersForm.h"
+#include "calc/CalcNivDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "calc/CalculV0Form.h"
 #include "calc/GeoLines.h"
@@ -31,21 +34,6 @@ using ui::kIdOk;
 
 constexpr double kTenthMm = 1e-4, kTenthMgon = 1e-4;
 
-struct Person {
-    ui::Form& form;
-    ui::ScriptedFrontEnd& frontEnd;
-    void Click(int id) { form.Act(frontEnd, id, {EventKind::Click, -1, false, {}}); }
-    void Check(int id, bool on) { form.Act(frontEnd, id, {EventKind::Check, -1, on, {}}); }
-    void Select(int id, int rank) { form.Act(frontEnd, id, {EventKind::Select, rank, false, {}}); }
-    void CheckLine(int id, int rank, bool on) {
-        form.Act(frontEnd, id, {EventKind::CheckLine, rank, on, {}});
-    }
-    void Type(int id, std::string text) {
-        form.Act(frontEnd, id, {EventKind::Text, -1, false, std::move(text)});
-    }
-    ui::ControlState operator[](int id) const { return form.State(id); }
-};
-
 CCarnet Load(const std::string& path) {
     CCarnet carnet;
     carnet.Load(nullptr, path);
@@ -59,14 +47,19 @@ TEST(ComputationForms, TemplatesAreConsistentAndEveryAcceleratorIsUnique) {
     CCalculV0Driver v0;
     CReductionDriver reduction;
     CCalcExcentDriver excent;
-    for (ui::Dialog* dialog : std::initializer_list<ui::Dialog*>{&intersection, &v0, &reduction, &excent}) {
+    CCalcChemDriver traverses;
+    CCalcNivDriver simple(LevellingMethod::Simple), doubleStation(LevellingMethod::DoubleStation);
+    for (ui::Dialog* dialog : std::initializer_list<ui::Dialog*>{&intersection, &v0, &reduction, &excent,
+                                                                 &traverses, &simple, &doubleStation}) {
         const auto form = dialog->MakeForm();
         ASSERT_TRUE(form);
         std::set<int> ids{0, ui::kButtonRow};
+        std::set<std::string> names;
         std::set<char> keys;
         int defaults = 0;
         for (const ui::Control& control : form->Controls()) {
             EXPECT_TRUE(ids.insert(control.id).second && ids.count(control.parent)) << control.name;
+            EXPECT_TRUE(!control.name.empty() && names.insert(control.name).second) << control.id;
             defaults += control.isDefault;
             const std::size_t mark = control.text.find('&');
             const char key =

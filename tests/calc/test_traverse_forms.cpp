@@ -1,0 +1,361 @@
+// The windows of the polygonal traverses and of direct levelling driven as a desktop host drives them.
+// The traverse is measured by a perfect instrument between two known and oriented stations, the levelling
+// run read by a perfect level between two benchmarks: the coordinates and heights written are known
+// beforehand.
+#include "FormPerson.h"
+#include "TestSupport.h"
+#include "calc/CalcChemDriver.h"
+#include "calc/CalcChemForm.h"
+#include "calc/CalcNivDriver.h"
+#include "calc/CalcNivForm.h"
+#include "calc/IntersectionJob.h"
+#include "calc/test_v0_geometry.h"
+#include "core/Strings.h"
+#include "geobase/Elements.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+
+namespace pyr::test {
+namespace {
+
+using ui::kIdCancel;
+using ui::kIdOk;
+
+constexpr double kTenthMm = 1e-4;
+
+// The cells of a table's line.
+std::vector<std::string> Cells(const std::string& line) {
+    std::vector<std::string> cells;
+    std::size_t from = 0;
+    for (std::size_t tab; (tab = line.find('\t', from)) != std::string::npos; from = tab + 1)
+        cells.push_back(line.substr(from, tab - from));
+    cells.push_back(line.substr(from));
+    return cells;
+}
+
+CCarnet Load(const std::string& path) {
+    CCarnet carnet;
+    carnet.Load(nullptr, path);
+    return carnet;
+}
+
+bool Contains(const std::string& text, std::string_view part) {
+    return text.find(part) != std::string::npos;
+}
+
+// ---- Polygonal traverses
+
+// A and B known, each oriented on a reference; T1 and T2 set up between them, a perfect instrument
+// reading every sighting. CH1 goes A - T1 - T2 - B, CH2 the same way back.
+const Place kA{651200.000, 6862300.000, 52.310}, kB{651688.731, 6862554.562, 49.870};
+const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 55.021};
+const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
+constexpr double kHi = 1.55, kHp = 1.3;
+
+struct TraverseJob {
+    CCarnet job;
+
+    // `t2Shift` moves where T2 really stood (metres east) when T1 sights it: the traverse no longer closes.
+    explicit TraverseJob(bool withTraverses, double t2Shift = 0.0) {
+        for (const auto& [name, place] : {std::pair{"A", kA}, {"R1", kR1}, {"B", kB}, {"R2", kR2}})
+            AddPoint(job, name, place);
+        const Place t2Seen{kT2.x + t2Shift, kT2.y, kT2.z};
+        AddStation(job, "A", kHi);
+        AddSighting(job, "R1", kA, kHi, kR1, kHp, 12.5);
+        AddSighting(job, "T1", kA, kHi, kT1, kHp, 12.5, kKindMesure);
+        AddStation(job, "T1", kHi);
+        AddSighting(job, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
+        AddSighting(job, "T2", kT1, kHi, t2Seen, kHp, 210.0, kKindMesure);
+        AddStation(job, "T2", kHi);
+        AddSighting(job, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
+        AddSighting(job, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
+        AddStation(job, "B", kHi);
+        AddSighting(job, "T2", kB, kHi, kT2, kHp, 77.0, kKindMesure);
+        AddSighting(job, "R2", kB, kHi, kR2, kHp, 77.0);
+        if (!withTraverses) return;
+        for (const auto& [name, stations] : {std::pair{"CH1", std::vector<const char*>{"A", "T1", "T2", "B"}},
+                                             {"CH2", {"B", "T2", "T1", "A"}}}) {
+            auto chain = std::make_unique<CChemin>(name);
+            for (const char* station : stations)
+                chain->add(station);
+            job.Add(std::move(chain), kKindChemin);
+        }
+    }
+
+    std::string Prepare(const TempDir& dir) {
+        WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
+        job.Save(dir / "chantier.geo");
+        return dir / "chantier.geo";
+    }
+};
+
+class TraverseForm : public ::testing::Test {
+protected:
+    using F = CCalcChemForm;
+    TempDir dir;
+    ui::ScriptedFrontEnd frontEnd;
+    CCalcChemDriver dialog;
+    std::unique_ptr<ui::Form> form;
+    std::string geo;
+
+    Person Open(TraverseJob job) {
+        geo = job.Prepare(dir);
+        dialog.SetInputs({geo, dir / "Pyralis.ini", "", ""});
+        form = dialog.MakeForm();
+        EXPECT_TRUE(form->Open(frontEnd));
+        return Person{*form, frontEnd};
+    }
+};
+
+TEST_F(TraverseForm, TheCheckedTraverseComputedSavedThenFinishedWithTheListing) {
+    Person person = Open(TraverseJob(true));
+    EXPECT_EQ(form->Caption(), "PYRALIS - Calcul de cheminements polygonaux");
+    EXPECT_EQ(person[F::kTraverses].items, (std::vector<std::string>{"CH1", "CH2"}));
+    EXPECT_TRUE(Contains(person[F::kStatus].text, "aucun coché")) << person[F::kStatus].text;
+    EXPECT_FALSE(person[F::kSave].enabled);
+    EXPECT_FALSE(person[kIdOk].enabled);
+
+    // Both checked, then CH2 unchecked: CH1 alone is computed.
+    person.CheckLine(F::kTraverses, 1, true);
+    person.CheckLine(F::kTraverses, 0, true);
+    person.CheckLine(F::kTraverses, 1, false);
+    EXPECT_EQ(person[F::kTraverses].checks, (std::vector<bool>{true, false}));
+    person.Click(F::kCalculate);
+    const ui::ControlState results = person[F::kResults];
+    ASSERT_EQ(results.items.size(), 1u);
+    const std::vector<std::string> cells = Cells(results.items[0]);
+    ASSERT_EQ(cells.size(), 10u);
+    EXPECT_EQ(cells[0], "CH1");
+    EXPECT_EQ(cells[1], "encadré");
+    for (int closure : {2, 4, 7}) // fa, f, fz: a perfect instrument closes
+        EXPECT_NEAR(std::stod(cells[static_cast<std::size_t>(closure)]), 0.0, 1e-3) << closure;
+    EXPECT_EQ(cells[9], "dans les tolérances");
+    EXPECT_TRUE(person[F::kSave].enabled);
+
+    person.Click(F::kSave);
+    EXPECT_FALSE(person[F::kSave].enabled); // written once
+    const CCarnet saved = Load(geo);
+    for (const auto& [name, place] : {std::pair{"T1", kT1}, {"T2", kT2}}) {
+        SCOPED_TRACE(name);
+        const int at = saved.findMat(name);
+        ASSERT_GE(at, 0);
+        EXPECT_NEAR(saved.xAt(at), place.x, kTenthMm);
+        EXPECT_NEAR(saved.yAt(at), place.y, kTenthMm);
+        EXPECT_NEAR(saved.zAt(at), place.z, kTenthMm);
+    }
+    EXPECT_NEAR(saved.v0At(saved.findStaRep("T1", 1)), 210.0, 1e-4);
+
+    person.Click(kIdOk);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Ok);
+    EXPECT_TRUE(frontEnd.questions.empty()); // the listing was asked for: no question
+    const std::string listing = ReadBytes(dir / "chantier.ccp");
+    EXPECT_TRUE(Contains(listing, "Cheminement CH1 : encadré"));
+    EXPECT_FALSE(Contains(listing, "CH2"));
+}
+
+TEST_F(TraverseForm, OutOfToleranceItIsShownAndClosingWithoutSavingWritesNothing) {
+    Person person = Open(TraverseJob(true, 0.05)); // T2 seen 5 cm east from T1
+    const std::string before = ReadBytes(geo);
+    person.Click(F::kCalculate);
+    const ui::ControlState results = person[F::kResults];
+    ASSERT_EQ(results.items.size(), 2u);
+    for (std::size_t line = 0; line < 2; ++line) {
+        EXPECT_EQ(Cells(results.items[line]).back(), "HORS TOLÉRANCE");
+        EXPECT_TRUE(Contains(results.tips[line], "planimétrique")) << results.tips[line];
+    }
+    EXPECT_TRUE(Contains(person[F::kStatus].text, "2 hors tolérance")) << person[F::kStatus].text;
+
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    person.Click(kIdCancel);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Cancel);
+    EXPECT_EQ(frontEnd.questions.size(), 1u);
+    EXPECT_EQ(ReadBytes(geo), before);
+    EXPECT_FALSE(std::filesystem::exists(dir / "chantier.ccp"));
+}
+
+TEST_F(TraverseForm, AGeoBaseWithoutTraversesSaysSoAndTheSearchFindsThem) {
+    Person person = Open(TraverseJob(false));
+    EXPECT_TRUE(person[F::kTraverses].items.empty());
+    EXPECT_TRUE(Contains(person[F::kStatus].text, "aucun cheminement")) << person[F::kStatus].text;
+    EXPECT_FALSE(person[F::kCalculate].enabled);
+
+    person.Click(F::kSearch);
+    EXPECT_EQ(person[F::kTraverses].items, std::vector<std::string>{"CH1"});
+    EXPECT_TRUE(Contains(person[F::kStatus].text, "1 cheminement(s) ajouté(s)")) << person[F::kStatus].text;
+    EXPECT_GE(Load(geo).Find(kKindChemin, "CH1"), 0); // the search saves what it found
+    person.Click(F::kCalculate);
+    ASSERT_EQ(person[F::kResults].items.size(), 1u);
+    EXPECT_EQ(Cells(person[F::kResults].items[0]).back(), "dans les tolérances");
+}
+
+// ---- Direct levelling
+
+// True heights (metres): A and B the benchmarks, T1 and T2 turning points, S a side point levelled from
+// the set-up on T1; every sight 30 m long.
+constexpr double kZA = 100.000, kZT1 = 101.234, kZT2 = 99.876, kZB = 100.543, kZS = 100.111;
+constexpr double kSight = 30.0;
+
+struct LevellingJob {
+    CCarnet job;
+
+    void Benchmark(const char* name, double z) { job.Add(std::make_unique<CPointGen>(name, z), kKindPoint); }
+    void Back(const char* point, double reading) {
+        job.Add(std::make_unique<CLectAR>(point, reading, kSight), kKindLectAR);
+    }
+    void Forward(const char* point, double reading) {
+        job.Add(std::make_unique<CLectAV>(point, reading, kSight), kKindLectAV);
+    }
+    // One set-up from `from` (height zFrom) to `to` (height zTo).
+    void SetUp(const char* from, double zFrom, const char* to, double zTo, double back = 1.5) {
+        Back(from, back);
+        Forward(to, back + zFrom - zTo);
+    }
+    // The run A - T1 - (S) - T2 - B, B's height in the GéoBase being `zB`.
+    void Simple(double zB) {
+        Benchmark("A", kZA);
+        Benchmark("B", zB);
+        SetUp("A", kZA, "T1", kZT1, 1.432);
+        Back("T1", 0.512);
+        Forward("S", 0.512 + kZT1 - kZS);
+        Forward("T2", 0.512 + kZT1 - kZT2);
+        SetUp("T2", kZT2, "B", kZB, 2.222);
+    }
+
+    std::string Prepare(const TempDir& dir) {
+        WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
+        job.Save(dir / "chantier.geo");
+        return dir / "chantier.geo";
+    }
+};
+
+double SavedZ(const CCarnet& saved, const char* name) {
+    const int at = saved.findMat(name);
+    return at >= 0 ? saved.zAt(at) : kUndefined;
+}
+
+class LevellingForm : public ::testing::Test {
+protected:
+    using F = CCalcNivForm;
+    TempDir dir;
+    ui::ScriptedFrontEnd frontEnd;
+    std::unique_ptr<CCalcNivDriver> dialog;
+    std::unique_ptr<ui::Form> form;
+    std::string geo;
+
+    bool Open(LevellingJob& job, LevellingMethod method = LevellingMethod::Simple) {
+        geo = job.Prepare(dir);
+        dialog = std::make_unique<CCalcNivDriver>(method);
+        dialog->SetInputs({geo, dir / "Pyralis.ini", "", ""});
+        form = dialog->MakeForm();
+        return form->Open(frontEnd);
+    }
+};
+
+TEST_F(LevellingForm, AMisclosureSharedAlongTheRunTheHeightsSavedThenTheListing) {
+    LevellingJob job;
+    job.Simple(kZB + 0.006); // f = -6 mm over three equal set-ups: +2 mm each
+    ASSERT_TRUE(Open(job));
+    Person person{*form, frontEnd};
+    EXPECT_EQ(form->Caption(), "PYRALIS - Calcul de cheminement altimétrique");
+    EXPECT_EQ(person[F::kStart].items, (std::vector<std::string>{"(toutes)", "A", "B"}));
+    EXPECT_EQ(person[F::kStart].current, 0);
+    EXPECT_FALSE(person[F::kSave].enabled);
+
+    person.Select(F::kStart, 1);
+    person.Select(F::kEnd, 2);
+    EXPECT_EQ(person[F::kStart].current, 1);
+    EXPECT_EQ(person[F::kEnd].current, 2);
+    person.Click(F::kCalculate);
+    const ui::ControlState results = person[F::kResults];
+    ASSERT_EQ(results.items.size(), 1u);
+    const std::vector<std::string> cells = Cells(results.items[0]);
+    ASSERT_EQ(cells.size(), 7u);
+    EXPECT_EQ(cells[0], "A");
+    EXPECT_EQ(cells[1], "B");
+    EXPECT_EQ(cells[2], "3");
+    EXPECT_NEAR(std::stod(cells[3]), 180.0, 1e-3);
+    EXPECT_EQ(cells[4], "-0.0060");
+    EXPECT_EQ(cells[5], "0.0100");
+    EXPECT_EQ(cells[6], "dans la tolérance");
+    EXPECT_TRUE(person[F::kProblems].items.empty());
+
+    person.Click(F::kSave);
+    const CCarnet saved = Load(geo);
+    EXPECT_NEAR(SavedZ(saved, "T1"), kZT1 + 0.002, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "T2"), kZT2 + 0.004, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "S"), kZS + 0.002, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "B"), kZB + 0.006, kTenthMm); // the benchmarks keep theirs
+
+    person.Click(kIdOk);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Ok);
+    EXPECT_TRUE(Contains(ReadBytes(dir / "chantier.cns"), "Cheminement altimétrique de A à B"));
+}
+
+TEST_F(LevellingForm, AChoiceThatMatchesNoRunAndWhatReachesNoBenchmarkAreSaid) {
+    LevellingJob job;
+    job.Simple(kZB);
+    job.SetUp("B", kZB, "X", 101.0); // levelled on from B to a point of unknown height
+    ASSERT_TRUE(Open(job));
+    Person person{*form, frontEnd};
+    const std::string before = ReadBytes(geo);
+
+    person.Select(F::kStart, 2); // B: no run leaves it
+    person.Click(F::kCalculate);
+    EXPECT_TRUE(person[F::kResults].items.empty());
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_TRUE(Contains(frontEnd.messages[0].text, "départ B")) << frontEnd.messages[0].text;
+    ASSERT_EQ(person[F::kProblems].items.size(), 1u);
+    EXPECT_TRUE(Contains(person[F::kProblems].items[0], "parti de B")) << person[F::kProblems].items[0];
+    EXPECT_FALSE(person[F::kSave].enabled);
+    EXPECT_FALSE(person[kIdOk].enabled);
+
+    person.Select(F::kStart, 0); // any
+    person.Click(F::kCalculate);
+    ASSERT_EQ(person[F::kResults].items.size(), 1u);
+    EXPECT_TRUE(
+        Contains(person[F::kStatus].text, "1 cheminement(s) calculé(s), 0 hors tolérance, 1 remarque"))
+        << person[F::kStatus].text;
+
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    person.Click(kIdCancel);
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Cancel);
+    EXPECT_EQ(ReadBytes(geo), before);
+    EXPECT_FALSE(std::filesystem::exists(dir / "chantier.cns"));
+}
+
+TEST_F(LevellingForm, DoubleStationShowsThePairOutOfToleranceAndWritesOnlyWhenTold) {
+    LevellingJob job;
+    job.Benchmark("A", kZA);
+    job.Benchmark("B", kZB);
+    job.SetUp("A", kZA, "T1", kZT1 + 0.001, 1.4);
+    job.SetUp("A", kZA, "T1", kZT1 - 0.001, 1.6);
+    job.SetUp("T1", kZT1, "B", kZB + 0.015, 1.3); // 30 mm between the two: over 10 mm
+    job.SetUp("T1", kZT1, "B", kZB - 0.015, 1.7);
+    ASSERT_TRUE(Open(job, LevellingMethod::DoubleStation));
+    Person person{*form, frontEnd};
+    EXPECT_EQ(form->Caption(), "PYRALIS - Calcul de nivellement par double station");
+    person.Click(F::kCalculate);
+    const ui::ControlState results = person[F::kResults];
+    ASSERT_EQ(results.items.size(), 1u);
+    const std::vector<std::string> cells = Cells(results.items[0]);
+    EXPECT_EQ(cells[2], "4"); // four set-ups of the level, two steps
+    EXPECT_EQ(cells.back(), "dénivelées mal contrôlées");
+    EXPECT_TRUE(Contains(results.tips[0], "T1 à B")) << results.tips[0];
+
+    frontEnd.answers = {ui::Answer::No}; // not written
+    person.Click(F::kSave);
+    EXPECT_FALSE(IsKnown(SavedZ(Load(geo), "T1")));
+}
+
+TEST_F(LevellingForm, AGeoBaseWithoutStaffReadingsSaysSoAndTheWindowDoesNotOpen) {
+    LevellingJob job;
+    job.Benchmark("A", kZA);
+    EXPECT_FALSE(Open(job));
+    EXPECT_EQ(form->Ended(), ui::DialogResult::Failed);
+    ASSERT_EQ(frontEnd.messages.size(), 1u);
+    EXPECT_TRUE(Contains(frontEnd.messages[0].text, "aucune lecture sur mire")) << frontEnd.messages[0].text;
+}
+
+} // namespace
+} // namespace pyr::test
