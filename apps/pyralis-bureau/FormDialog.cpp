@@ -187,6 +187,9 @@ QWidget* FormDialog::Make(const ui::Control& control) {
             for (const std::string& column : control.columns)
                 headings << Text(column);
             table->setHeaderLabels(headings);
+            // Each column as wide as its heading until rows come: no heading cut, no empty width.
+            for (int column = 0; column < table->columnCount(); ++column)
+                table->resizeColumnToContents(column);
             table->setRootIsDecorated(false);
             table->setUniformRowHeights(true);
             table->setAlternatingRowColors(true);

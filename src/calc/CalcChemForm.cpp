@@ -81,9 +81,9 @@ std::vector<ui::Control> CCalcChemForm::Controls() const {
             .Width(104)
             .Lines(6),
         Ctl(kStatus, K::Status, "etat").At(6, 0, 1, 2),
-        Ctl(kSave, K::Button, "enregistrer", "&Enregistrer").At(7, 0),
-        Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow),
-        Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 1),
+        Ctl(kSave, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
+        Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow).At(0, 1),
+        Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 2),
     };
 }
 

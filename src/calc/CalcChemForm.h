@@ -7,8 +7,8 @@ namespace pyr {
 
 // The window of the polygonal traverses: the traverses of the GéoBase in a check list (none checked
 // computes them all), the automatic search that adds those found among the set-ups, "&Calculer", a table
-// of their closures against the tolerances, the status line, "&Enregistrer" which writes the stations,
-// and "Fin + Listing" or "&Fermer" at the foot.
+// of their closures against the tolerances, the status line, and at the foot "&Enregistrer", which writes
+// the stations, "Fin + Listing" and "&Fermer".
 class CCalcChemForm : public ui::Form {
 public:
     enum Id : int {

@@ -67,9 +67,9 @@ std::vector<ui::Control> CCalcNivForm::Controls() const {
         Ctl(kLabelProblems, K::Label, "etiquetteRemarques", "Re&marques :").At(3, 0, 1, 5).Buddy(kProblems),
         Ctl(kProblems, K::List, "remarques").At(4, 0, 1, 5).Width(84).Lines(3),
         Ctl(kStatus, K::Status, "etat").At(5, 0, 1, 5),
-        Ctl(kSave, K::Button, "enregistrer", "&Enregistrer").At(6, 0, 1, 2),
-        Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow),
-        Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 1),
+        Ctl(kSave, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
+        Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow).At(0, 1),
+        Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 2),
     };
 }
 

@@ -8,7 +8,7 @@ namespace pyr {
 // The window of direct levelling, simple or by double station as its model is: the benchmarks a run
 // leaves and reaches chosen in two combos ("(toutes)" for any), "&Calculer", a table of the runs with
 // their misclosures against their tolerances, the remarks on what could not be made into a run, the
-// status line, "&Enregistrer" which writes the heights, and "Fin + Listing" or "&Fermer" at the foot.
+// status line, and at the foot "&Enregistrer", which writes the heights, "Fin + Listing" and "&Fermer".
 class CCalcNivForm : public ui::Form {
 public:
     enum Id : int {
