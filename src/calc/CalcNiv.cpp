@@ -113,6 +113,8 @@ bool CCalcNiv::Calculate() {
     if (!m_frontEnd || !m_session.IsOpen()) return false;
     m_runs.clear();
     m_written = false;
+    m_options.start = m_start;
+    m_options.end = m_end;
     LevellingResult result = ComputeLevelling(m_session.Carnet(), m_setUps, m_options);
     m_problems = std::move(result.problems);
     CPyrTxtWnd txt(*m_frontEnd);

@@ -14,11 +14,11 @@
 namespace pyr {
 
 namespace {
-// Computed coordinates go into the GéoBase to the tenth of a millimetre.
-constexpr int kWrittenDecimals = 4;
-
-double Kept(double value) {
-    return IsKnown(value) ? RoundToDecimals(value, kWrittenDecimals) : kUndefined;
+// Computed values go into the GéoBase with its own decimals, rounded once: a height rounded first to
+// the tenth of a millimetre and then to the millimetre may lose half a millimetre (100.67852 would give
+// 100.6785, then 100.678).
+double Kept(double value, int decimals) {
+    return IsKnown(value) ? RoundToDecimals(value, decimals) : kUndefined;
 }
 } // namespace
 
@@ -60,7 +60,7 @@ bool CComputationSession::Open(ui::FrontEnd& frontEnd, ui::DialogModel& dialog) 
 
 bool CComputationSession::WritePoint(std::string_view mat, double x, double y, double z) {
     if (!IsOpen()) return false;
-    x = Kept(x), y = Kept(y), z = Kept(z);
+    x = Kept(x, CPointGen::DeciXY()), y = Kept(y, CPointGen::DeciXY()), z = Kept(z, CPointGen::DeciZ());
     bool withXY = IsKnown(x) && IsKnown(y);
     bool withZ = IsKnown(z);
     const std::string name(mat);

@@ -216,6 +216,30 @@ void CompensateLevellingRun(LevellingRun& run, const LevellingOptions& options) 
     run.flagged = !run.warnings.empty();
 }
 
+namespace {
+
+// The benchmarks of a chain (ranks of its points) without those that stand between `start` and the next
+// `end` after it: a run named by its two ends passes through them.
+template <typename PointAt>
+void PassThroughBetween(std::vector<std::size_t>& benchmarks, std::vector<double>& heights,
+                        const PointAt& point, const std::string& start, const std::string& end) {
+    std::vector<std::size_t> kept;
+    std::vector<double> keptHeights;
+    for (std::size_t j = 0; j < benchmarks.size(); ++j) {
+        kept.push_back(benchmarks[j]);
+        keptHeights.push_back(heights[j]);
+        if (point(benchmarks[j]) != start) continue;
+        std::size_t k = j + 1;
+        while (k < benchmarks.size() && point(benchmarks[k]) != end)
+            ++k;
+        if (k < benchmarks.size()) j = k - 1; // the next one kept is that end
+    }
+    benchmarks = std::move(kept);
+    heights = std::move(keptHeights);
+}
+
+} // namespace
+
 LevellingResult ComputeLevelling(const CCarnet& carnet, const LevellingSetUps& setUps,
                                  const LevellingOptions& options) {
     LevellingResult result;
@@ -240,6 +264,8 @@ LevellingResult ComputeLevelling(const CCarnet& carnet, const LevellingSetUps& s
                     Sprintf(kLevellingNoBenchmark, point(0).c_str(), point(chain.size()).c_str()));
                 continue;
             }
+            if (!options.start.empty() && !options.end.empty())
+                PassThroughBetween(benchmarks, heights, point, options.start, options.end);
             if (benchmarks.front() > 0)
                 result.problems.push_back(Sprintf(kLevellingNoBenchmarkAtStart, point(0).c_str(),
                                                   point(benchmarks.front()).c_str()));

@@ -68,6 +68,11 @@ struct LevellingOptions {
     LevellingToleranceMode closureMode = LevellingToleranceMode::Fixed;
     double closureTolerance = 0.01; // metres (per sqrt(km) or per sqrt(set-up) as closureMode says)
     double pairTolerance = 0.01;    // double station: the largest gap between the two height differences
+    // A run named by its two benchmarks: from `start` to the next `end` of its chain, the points of known
+    // height between them are turning points like the others, their heights computed again (after a
+    // reading was corrected, say, the heights written by an earlier computation no longer hold the run
+    // in pieces). Empty: every point of known height is a benchmark.
+    std::string start, end;
 
     // "TypeTolerance" and "FermAltimetr" of "Options_Nivellement"; the pair tolerance is "TolAltitudes"
     // of "Options_Tolerances". The method is the caller's (it is the command's).

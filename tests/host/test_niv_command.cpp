@@ -159,5 +159,57 @@ TEST_F(NivCommand, WithoutStaffReadingOrBenchmarkItSaysSoAndWritesNothing) {
     EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
 }
 
+// A digital level's GSI book: BM1 (100.000 m) to BM2 (100.880 m) through T1 and T2, staff readings 331
+// (back) and 332 (fore) with their distances 32, and on each fore line the height the level computed, 83,
+// unadjusted: T1 100.4645, T2 100.6745, BM2 100.8745. The run's height differences give the level's
+// heights back; f = 100.8745 - 100.880 = -5.5 mm, shared over 49, 53 and 50 m of sights:
+// T1 100.4645 + 0.0055 x 49 / 152 = 100.46627, T2 100.6745 + 0.0055 x 102 / 152 = 100.67819.
+constexpr const char* kLevelBook = "410001+0000LINE 42....+00000001 \r\n"
+                                   "110001+00000BM1 83..18+10000000 \r\n"
+                                   "110002+00000BM1 32...8+02500000 331.08+00145210 \r\n"
+                                   "110003+000000T1 32...8+02400000 332.08+00098760 83..08+10046450 \r\n"
+                                   "110004+000000T1 32...8+02600000 331.08+00132100 \r\n"
+                                   "110005+000000T2 32...8+02700000 332.08+00111100 83..08+10067450 \r\n"
+                                   "110006+000000T2 32...8+02500000 331.08+00120000 \r\n"
+                                   "110007+00000BM2 32...8+02500000 332.08+00100000 83..08+10087450 \r\n"
+                                   "110008+00000BM2 83..18+10088000 \r\n";
+
+// Heights are written in the GéoBase to its millimetre.
+constexpr double kGeoBaseMm = 0.0005;
+
+TEST_F(NivCommand, ALevelsGsiBookIsReadAndComputedAndARunNamedByItsEndsIsComputedAgain) {
+    WriteBytes(dir / "niv.gsi", kLevelBook);
+    Outcome outcome = Run("--oui LecWild niv.gsi --geobase chantier.geo");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    outcome = Run("CalNivSm --geobase chantier.geo --enregistrer --listing niv.cns");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    ExpectInOrder(outcome.out, {"Cheminement BM1 - BM2 : 3 dénivelée(s), longueur 152.000 m",
+                                "Fermeture -0.0055 m, tolérance 0.0100 m"});
+    // The level's own heights, before the adjustment: 100 + 0.4645, + 0.2100, + 0.2000.
+    ExpectInOrder(ReadBytes(dir / "niv.cns"), {"| BM1     | T1    |", "+0.4645", "| T1      | T2    |",
+                                               "+0.2100", "| T2      | BM2   |", "+0.2000"});
+    CCarnet saved = Saved();
+    EXPECT_NEAR(SavedZ(saved, "T1"), 100.46627, kGeoBaseMm);
+    EXPECT_NEAR(SavedZ(saved, "T2"), 100.67819, kGeoBaseMm);
+
+    // T1 and T2 now have heights: run again as it stands, each set-up is a run of its own...
+    outcome = Run("CalNivSm --geobase chantier.geo");
+    EXPECT_TRUE(Has(outcome.out, "Cheminement BM1 - T1 : 1 dénivelée(s)")) << outcome.out;
+    // ...but named by its two benchmarks, the run passes through them again. A fore reading on T1
+    // corrected by 1 mm (0.9866) raises T1 and T2 by 1 mm less its share of the new misclosure.
+    std::string geo = ReadBytes(dir / "chantier.geo");
+    const std::size_t reading = geo.find("0.9876");
+    ASSERT_NE(reading, std::string::npos);
+    geo.replace(reading, 6, "0.9866");
+    WriteBytes(dir / "chantier.geo", geo);
+    outcome = Run("--oui CalNivSm --geobase chantier.geo --depart BM1 --arrivee BM2 --enregistrer");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    ExpectInOrder(outcome.out, {"Cheminement BM1 - BM2 : 3 dénivelée(s)", "Fermeture -0.0045 m"});
+    saved = Saved();
+    EXPECT_NEAR(SavedZ(saved, "T1"), 100.4655 + 0.0045 * 49 / 152, kGeoBaseMm);
+    EXPECT_NEAR(SavedZ(saved, "T2"), 100.6755 + 0.0045 * 102 / 152, kGeoBaseMm);
+    EXPECT_NEAR(SavedZ(saved, "BM2"), 100.880, kGeoBaseMm);
+}
+
 } // namespace
 } // namespace pyr::test
