@@ -9,7 +9,7 @@
 #include "calc/CalcNivDriver.h"
 #include "calc/CalcNivForm.h"
 #include "calc/IntersectionJob.h"
-#include "calc/test_v0_geometry.h"
+#include "calc/TraverseJob.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
 
@@ -46,41 +46,17 @@ bool Contains(const std::string& text, std::string_view part) {
 
 // ---- Polygonal traverses
 
-// A and B known, each oriented on a reference; T1 and T2 set up between them, a perfect instrument
-// reading every sighting. CH1 goes A - T1 - T2 - B, CH2 the same way back.
-const Place kA{651200.000, 6862300.000, 52.310}, kB{651688.731, 6862554.562, 49.870};
-const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 55.021};
-const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
-constexpr double kHi = 1.55, kHp = 1.3;
+using namespace traverse_job;
 
-struct TraverseJob {
+// CH1 goes A - T1 - T2 - B, CH2 the same way back.
+struct TraverseJobFile {
     CCarnet job;
 
-    // `t2Shift` moves where T2 really stood (metres east) when T1 sights it: the traverse no longer closes.
-    explicit TraverseJob(bool withTraverses, double t2Shift = 0.0) {
-        for (const auto& [name, place] : {std::pair{"A", kA}, {"R1", kR1}, {"B", kB}, {"R2", kR2}})
-            AddPoint(job, name, place);
-        const Place t2Seen{kT2.x + t2Shift, kT2.y, kT2.z};
-        AddStation(job, "A", kHi);
-        AddSighting(job, "R1", kA, kHi, kR1, kHp, 12.5);
-        AddSighting(job, "T1", kA, kHi, kT1, kHp, 12.5, kKindMesure);
-        AddStation(job, "T1", kHi);
-        AddSighting(job, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
-        AddSighting(job, "T2", kT1, kHi, t2Seen, kHp, 210.0, kKindMesure);
-        AddStation(job, "T2", kHi);
-        AddSighting(job, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
-        AddSighting(job, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
-        AddStation(job, "B", kHi);
-        AddSighting(job, "T2", kB, kHi, kT2, kHp, 77.0, kKindMesure);
-        AddSighting(job, "R2", kB, kHi, kR2, kHp, 77.0);
-        if (!withTraverses) return;
-        for (const auto& [name, stations] : {std::pair{"CH1", std::vector<const char*>{"A", "T1", "T2", "B"}},
-                                             {"CH2", {"B", "T2", "T1", "A"}}}) {
-            auto chain = std::make_unique<CChemin>(name);
-            for (const char* station : stations)
-                chain->add(station);
-            job.Add(std::move(chain), kKindChemin);
-        }
+    explicit TraverseJobFile(bool withTraverses, double t2Shift = 0.0) {
+        TraverseJobOptions options;
+        options.t2Shift = t2Shift;
+        if (withTraverses) options.traverses = {kTraverseCH1, {"CH2", {"B", "T2", "T1", "A"}}};
+        job = TraverseJob(options);
     }
 
     std::string Prepare(const TempDir& dir) {
@@ -99,7 +75,7 @@ protected:
     std::unique_ptr<ui::Form> form;
     std::string geo;
 
-    Person Open(TraverseJob job) {
+    Person Open(TraverseJobFile job) {
         geo = job.Prepare(dir);
         dialog.SetInputs({geo, dir / "Pyralis.ini", "", ""});
         form = dialog.MakeForm();
@@ -109,7 +85,7 @@ protected:
 };
 
 TEST_F(TraverseForm, TheCheckedTraverseComputedSavedThenFinishedWithTheListing) {
-    Person person = Open(TraverseJob(true));
+    Person person = Open(TraverseJobFile(true));
     EXPECT_EQ(form->Caption(), "PYRALIS - Calcul de cheminements polygonaux");
     EXPECT_EQ(person[F::kTraverses].items, (std::vector<std::string>{"CH1", "CH2"}));
     EXPECT_TRUE(Contains(person[F::kStatus].text, "aucun coché")) << person[F::kStatus].text;
@@ -155,7 +131,7 @@ TEST_F(TraverseForm, TheCheckedTraverseComputedSavedThenFinishedWithTheListing) 
 }
 
 TEST_F(TraverseForm, OutOfToleranceItIsShownAndClosingWithoutSavingWritesNothing) {
-    Person person = Open(TraverseJob(true, 0.05)); // T2 seen 5 cm east from T1
+    Person person = Open(TraverseJobFile(true, 0.05)); // T2 seen 5 cm east from T1
     const std::string before = ReadBytes(geo);
     person.Click(F::kCalculate);
     const ui::ControlState results = person[F::kResults];
@@ -175,7 +151,7 @@ TEST_F(TraverseForm, OutOfToleranceItIsShownAndClosingWithoutSavingWritesNothing
 }
 
 TEST_F(TraverseForm, AGeoBaseWithoutTraversesSaysSoAndTheSearchFindsThem) {
-    Person person = Open(TraverseJob(false));
+    Person person = Open(TraverseJobFile(false));
     EXPECT_TRUE(person[F::kTraverses].items.empty());
     EXPECT_TRUE(Contains(person[F::kStatus].text, "aucun cheminement")) << person[F::kStatus].text;
     EXPECT_FALSE(person[F::kCalculate].enabled);

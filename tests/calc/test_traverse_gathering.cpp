@@ -1,7 +1,7 @@
 // A traverse gathered from a GéoBase that a perfect instrument measured: the kind read from what is known,
 // the legs measured both ways, and the stations placed back where they were.
 #include "calc/TraverseGathering.h"
-#include "calc/test_v0_geometry.h"
+#include "calc/TraverseJob.h"
 #include "core/Angles.h"
 #include "geobase/Carnet.h"
 
@@ -13,42 +13,15 @@ namespace {
 
 constexpr double kTenthMm = 1e-4;
 
-const Place kA{651200.000, 6862300.000, 52.310}, kB{651688.731, 6862554.562, 49.870};
-const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 55.021};
-const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
-constexpr double kHi = 1.55, kHp = 1.3;
+using namespace traverse_job;
 
-void AddInstrument(CCarnet& carnet, double sigmaAh) {
-    auto instrument = std::make_unique<CAppareil>("T");
-    instrument->setSigmaAh(sigmaAh);
-    carnet.Add(std::move(instrument), kKindAppareil);
-}
-
-// A, B and their references known; T1 and T2 set up in between, each instrument oriented its own way.
-// With `sigmaAh`, A and T1 are measured with an instrument of that precision of directions, T2 and B
-// with one that gives none.
+// T1 sights T2 twice.
 CCarnet Job(bool endKnown = true, double sigmaAh = 0.0) {
-    CCarnet carnet;
-    AddPoint(carnet, "A", kA);
-    AddPoint(carnet, "R1", kR1);
-    if (endKnown) AddPoint(carnet, "B", kB);
-    AddPoint(carnet, "R2", kR2);
-    if (sigmaAh > 0.0) AddInstrument(carnet, sigmaAh);
-    AddStation(carnet, "A", kHi);
-    AddSighting(carnet, "R1", kA, kHi, kR1, kHp, 12.5);
-    AddSighting(carnet, "T1", kA, kHi, kT1, kHp, 12.5, kKindMesure);
-    AddStation(carnet, "T1", kHi);
-    AddSighting(carnet, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
-    AddSighting(carnet, "T2", kT1, kHi, kT2, kHp, 210.0, kKindMesure);
-    AddSighting(carnet, "T2", kT1, kHi, kT2, kHp, 210.0, kKindMesure); // measured twice
-    if (sigmaAh > 0.0) AddInstrument(carnet, 0.0);
-    AddStation(carnet, "T2", kHi);
-    AddSighting(carnet, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
-    AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995, kKindMesure);
-    AddStation(carnet, "B", kHi);
-    AddSighting(carnet, "T2", kB, kHi, kT2, kHp, 77.0, kKindMesure);
-    AddSighting(carnet, "R2", kB, kHi, kR2, kHp, 77.0);
-    return carnet;
+    TraverseJobOptions options;
+    options.endKnown = endKnown;
+    options.sigmaAh = sigmaAh;
+    options.measuredTwice = true;
+    return TraverseJob(options);
 }
 
 CChemin Chain(std::initializer_list<const char*> names) {

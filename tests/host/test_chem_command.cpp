@@ -1,48 +1,24 @@
 // "pyralis CalChem" run as a script runs it: a traverse measured by a perfect instrument between two known
 // and oriented stations, its stations written back with their V0, its listing; what is refused.
 #include "HostTestSupport.h"
-#include "calc/test_v0_geometry.h"
+#include "calc/TraverseJob.h"
 
 namespace pyr::test {
 namespace {
 
-const Place kA{651200.000, 6862300.000, 52.310}, kB{651688.731, 6862554.562, 49.870};
-const Place kT1{651325.412, 6862371.905, 53.874}, kT2{651502.118, 6862492.447, 55.021};
-const Place kR1{651050.118, 6862512.447, 55.0}, kR2{651900.0, 6862300.0, 48.0};
-const Place kP1{651390.5, 6862350.25, 54.1}; // a point sighted from T1 only
-constexpr double kHi = 1.55, kHp = 1.3;
+using namespace traverse_job;
 constexpr double kTenthMm = 1e-4;
 
 class ChemCommand : public PyralisTest {
 protected:
-    // A, B and their references known; T1 and T2 set up between them; the traverse CH1 written, unless
-    // `withTraverse` is off. `t2Shift` moves where T2 really stood (metres east) when T1 sights it.
-    // `twist` turns T2's reading on B (grads): an angular misclosure of that much.
+    // The traverse job, CH1 written unless `withTraverse` is off.
     void Write(bool withTraverse = true, double t2Shift = 0.0, double twist = 0.0) {
-        CCarnet carnet;
-        for (const auto& [name, place] : {std::pair{"A", kA}, {"R1", kR1}, {"B", kB}, {"R2", kR2}})
-            AddPoint(carnet, name, place);
-        const Place t2Seen{kT2.x + t2Shift, kT2.y, kT2.z};
-        AddStation(carnet, "A", kHi);
-        AddSighting(carnet, "R1", kA, kHi, kR1, kHp, 12.5);
-        AddSighting(carnet, "T1", kA, kHi, kT1, kHp, 12.5, kKindMesure);
-        AddStation(carnet, "T1", kHi);
-        AddSighting(carnet, "A", kT1, kHi, kA, kHp, 210.0, kKindMesure);
-        AddSighting(carnet, "T2", kT1, kHi, t2Seen, kHp, 210.0, kKindMesure);
-        AddSighting(carnet, "P1", kT1, kHi, kP1, kHp, 210.0, kKindMesure);
-        AddStation(carnet, "T2", kHi);
-        AddSighting(carnet, "T1", kT2, kHi, kT1, kHp, 399.995, kKindMesure);
-        AddSighting(carnet, "B", kT2, kHi, kB, kHp, 399.995 - twist, kKindMesure);
-        AddStation(carnet, "B", kHi);
-        AddSighting(carnet, "T2", kB, kHi, kT2, kHp, 77.0, kKindMesure);
-        AddSighting(carnet, "R2", kB, kHi, kR2, kHp, 77.0);
-        if (withTraverse) {
-            auto chain = std::make_unique<CChemin>("CH1");
-            for (const char* name : {"A", "T1", "T2", "B"})
-                chain->add(name);
-            carnet.Add(std::move(chain), kKindChemin);
-        }
-        ASSERT_EQ(carnet.Save(dir / "chantier.geo"), 1);
+        TraverseJobOptions options;
+        options.t2Shift = t2Shift;
+        options.twist = twist;
+        options.sideShot = true;
+        if (withTraverse) options.traverses = {kTraverseCH1};
+        ASSERT_EQ(TraverseJob(options).Save(dir / "chantier.geo"), 1);
     }
     Outcome Run(const std::string& arguments) {
         return RunPyralis(dir.Root(), "CalChem --geobase chantier.geo " + arguments);
