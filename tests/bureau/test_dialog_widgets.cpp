@@ -4,12 +4,15 @@
 #include "Capture.h"
 #include "FormDialog.h"
 #include "TestSupport.h"
+#include "calc/CalcChemDriver.h"
 #include "calc/CalcInters.h"
 #include "calc/CalcIntersDriver.h"
+#include "calc/CalcNivDriver.h"
 #include "calc/CalcRayonDriver.h"
 #include "calc/CalculV0Driver.h"
 #include "calc/IntersectionJob.h"
 #include "calc/ResectionDriver.h"
+#include "calc/TraverseJob.h"
 #include "settings/OptionPages.h"
 #include "ui/Form.h"
 #include "ui/ScriptedFrontEnd.h"
@@ -212,6 +215,64 @@ TEST_F(DialogWidgets, EveryStationOfTheDemoRadiatedThroughTheRadiationDialog) {
     ASSERT_GE(point, 0);
     EXPECT_NEAR(saved.xAt(point), points.topLevelItem(0)->text(1).toDouble(), kTenthMm);
     EXPECT_GE(saved.v0At(saved.findStaRep("S2", 1)), 0.0);
+}
+
+// The traverse CH1 measured by a perfect instrument and CH2, the same stations the other way: both close,
+// the stations written.
+TEST_F(DialogWidgets, TwoTraversesComputedAndWrittenThroughTheTraverseDialog) {
+    TraverseJobOptions options;
+    options.traverses = {kTraverseCH1, {"CH2", {"B", "T2", "T1", "A"}}};
+    WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
+    ASSERT_EQ(TraverseJob(options).Save(dir / "chantier.geo"), 1);
+    ASSERT_TRUE(Show(std::make_unique<CCalcChemDriver>(), dir / "chantier.geo",
+                     "calcul des cheminements polygonaux"));
+    EXPECT_EQ(Find<QListWidget>(*dialog, "cheminements").count(), 2);
+    Click(*dialog, "calculer");
+    auto& results = Find<QTreeWidget>(*dialog, "resultats");
+    ASSERT_EQ(results.topLevelItemCount(), 2);
+    EXPECT_EQ(results.topLevelItem(0)->text(0).toStdString(), "CH1");
+    EXPECT_EQ(results.topLevelItem(1)->text(1).toStdString(), "encadré");
+    Picture(*dialog, "CalChem-calcule.png");
+    Click(*dialog, "enregistrer");
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    Click(*dialog, "fermer");
+    CCarnet saved;
+    saved.Load(nullptr, dir / "chantier.geo");
+    const int t2 = saved.findMat("T2");
+    ASSERT_GE(t2, 0);
+    EXPECT_NEAR(saved.xAt(t2), traverse_job::kT2.x, kTenthMm);
+}
+
+// A level run BM1 - T1 - T2 - BM2 with a side reading on S from T1, 3 mm short of BM2.
+TEST_F(DialogWidgets, ALevelRunComputedThroughTheLevellingDialog) {
+    CCarnet job;
+    job.Add(std::make_unique<CPointGen>("BM1", 100.0), kKindPoint);
+    job.Add(std::make_unique<CPointGen>("BM2", 100.677), kKindPoint);
+    const auto back = [&](const char* point, double reading) {
+        job.Add(std::make_unique<CLectAR>(point, reading, 30.0), kKindLectAR);
+    };
+    const auto forward = [&](const char* point, double reading) {
+        job.Add(std::make_unique<CLectAV>(point, reading, 30.0), kKindLectAV);
+    };
+    back("BM1", 1.452), forward("T1", 0.988);
+    back("T1", 1.321), forward("S", 1.7), forward("T2", 1.111);
+    back("T2", 1.2), forward("BM2", 1.2);
+    WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
+    ASSERT_EQ(job.Save(dir / "chantier.geo"), 1);
+    ASSERT_TRUE(Show(std::make_unique<CCalcNivDriver>(LevellingMethod::Simple), dir / "chantier.geo",
+                     "calcul d'un cheminement altimétrique simple"));
+    Click(*dialog, "calculer");
+    auto& results = Find<QTreeWidget>(*dialog, "resultats");
+    ASSERT_EQ(results.topLevelItemCount(), 1);
+    EXPECT_EQ(results.topLevelItem(0)->text(0).toStdString(), "BM1");
+    EXPECT_EQ(results.topLevelItem(0)->text(4).toStdString(), "-0.0030");
+    Picture(*dialog, "CalNivSm-calcule.png");
+    Click(*dialog, "enregistrer");
+    frontEnd.answers = {ui::Answer::No}; // no listing
+    Click(*dialog, "fermer");
+    CCarnet saved;
+    saved.Load(nullptr, dir / "chantier.geo");
+    EXPECT_NEAR(saved.zAt(saved.findMat("T1")), 100.465, 0.0005); // 100.464 + 1 mm
 }
 
 TEST_F(DialogWidgets, AValueTypedOnAPageOfTheOptionsThenOkWritesWhatThePageWouldWrite) {
