@@ -16,6 +16,7 @@ namespace pyr {
 namespace {
 
 constexpr const char* kKeyToleranceMode = "TypeTolerance";
+constexpr const char* kKeyDistribution = "TypeNivel";
 constexpr const char* kKeyClosure = "FermAltimetr";
 constexpr const char* kKeyHeightTolerance = "TolAltitudes";
 
@@ -74,6 +75,8 @@ LevellingOptions LevellingOptions::FromOptions(std::string_view paramPath, Level
     options.closureMode = static_cast<LevellingToleranceMode>(
         std::clamp(ReadOptionInt(paramPath, kSectionLevelling, kKeyToleranceMode), 0, 2));
     options.closureTolerance = ReadOptionReal(paramPath, kSectionLevelling, kKeyClosure);
+    options.distribution = static_cast<LevellingDistribution>(
+        std::clamp(ReadOptionInt(paramPath, kSectionLevelling, kKeyDistribution), 0, 2));
     options.pairTolerance = ReadOptionReal(paramPath, kSectionTolerances, kKeyHeightTolerance);
     return options;
 }
@@ -171,21 +174,42 @@ void CompensateLevellingRun(LevellingRun& run, const LevellingOptions& options) 
             lengthsKnown = false;
     }
     run.length = lengthsKnown ? length : kUndefined;
-    run.distributedByDistance = lengthsKnown && length > 0.0;
+    double climb = 0.0;
+    for (const LevellingStep& step : run.steps)
+        climb += std::fabs(step.heightDifference);
+    // The weight of a step under the rule that applies to this run.
+    run.distribution = LevellingDistribution::BySetUp;
+    if (options.distribution == LevellingDistribution::ByDistance && lengthsKnown && length > 0.0)
+        run.distribution = LevellingDistribution::ByDistance;
+    if (options.distribution == LevellingDistribution::ByHeightDifference && climb > 0.0)
+        run.distribution = LevellingDistribution::ByHeightDifference;
+    const auto weight = [&run](const LevellingStep& step) {
+        switch (run.distribution) {
+        case LevellingDistribution::ByDistance:
+            return step.length;
+        case LevellingDistribution::ByHeightDifference:
+            return std::fabs(step.heightDifference);
+        case LevellingDistribution::BySetUp:
+            break;
+        }
+        return 1.0;
+    };
     run.misclosure = run.zStart + sum - run.zEnd;
     run.tolerance = options.ClosureTolerance(run.length, count);
     run.inTolerance = std::fabs(run.misclosure) <= run.tolerance + kComparisonSlack;
 
     // Each point takes -f times the share of the run (of its length, or of its steps) behind it; the
     // last one is the arrival benchmark itself.
-    const double whole = run.distributedByDistance ? length : static_cast<double>(count);
+    const double whole = run.distribution == LevellingDistribution::ByDistance           ? length
+                         : run.distribution == LevellingDistribution::ByHeightDifference ? climb
+                                                                                         : count;
     double behind = 0.0;
     double measured = 0.0;
     double previousCorrection = 0.0;
     double z = run.zStart;
     for (int i = 0; i < count; ++i) {
         LevellingStep& step = run.steps[i];
-        behind += run.distributedByDistance ? step.length : 1.0;
+        behind += weight(step);
         measured += step.heightDifference;
         const double correction = i + 1 == count ? -run.misclosure : -run.misclosure * behind / whole;
         step.correction = correction - previousCorrection;

@@ -63,8 +63,18 @@ enum class LevellingToleranceMode {
     PerSetUp = 2, // T x sqrt(n), n the number of set-ups (of steps, in double station)
 };
 
+// What "TypeNivel" of the levelling options selects: how a run's misclosure is shared among its steps.
+enum class LevellingDistribution {
+    ByDistance = 0,         // in proportion to the sights' lengths: ordinary levelling on open ground
+    BySetUp = 1,            // in equal shares per step: site levelling, where the sights are not measured
+    ByHeightDifference = 2, // in proportion to |dh|: steep ground, where the errors grow with the climb
+};
+
 struct LevellingOptions {
     LevellingMethod method = LevellingMethod::Simple;
+    // Asked for; a run whose steps lack a length, or whose lengths (or height differences) are all zero,
+    // falls back on equal shares per step.
+    LevellingDistribution distribution = LevellingDistribution::ByDistance;
     LevellingToleranceMode closureMode = LevellingToleranceMode::Fixed;
     double closureTolerance = 0.01; // metres (per sqrt(km) or per sqrt(set-up) as closureMode says)
     double pairTolerance = 0.01;    // double station: the largest gap between the two height differences
@@ -74,7 +84,8 @@ struct LevellingOptions {
     // in pieces). Empty: every point of known height is a benchmark.
     std::string start, end;
 
-    // "TypeTolerance" and "FermAltimetr" of "Options_Nivellement"; the pair tolerance is "TolAltitudes"
+    // "TypeTolerance", "TypeNivel" and "FermAltimetr" of "Options_Nivellement"; the pair tolerance is
+    // "TolAltitudes"
     // of "Options_Tolerances". The method is the caller's (it is the command's).
     static LevellingOptions FromOptions(std::string_view paramPath, LevellingMethod method);
 
@@ -135,9 +146,9 @@ struct LevellingRun {
     double zStart = 0.0, zEnd = 0.0;
     std::vector<LevellingStep> steps;
 
-    double length = kUndefined;         // sum of the steps' lengths; kUndefined when one is missing
-    bool distributedByDistance = false; // else by the number of steps
-    double misclosure = 0.0;            // f = Z start + sum of height differences - Z end
+    double length = kUndefined; // sum of the steps' lengths; kUndefined when one is missing
+    LevellingDistribution distribution = LevellingDistribution::BySetUp; // the rule the run was shared by
+    double misclosure = 0.0; // f = Z start + sum of height differences - Z end
     double tolerance = 0.0;
     bool inTolerance = true;           // |f| <= tolerance
     bool flagged = false;              // double station: a pair out of tolerance, or a step levelled once

@@ -110,7 +110,10 @@ void WriteLevellingRun(CDlgCfgListing& listing, const LevellingRun& run, const L
     listing.WriteLine(niv::kListClosure, Difference(listing, run.misclosure).c_str(), length.c_str(),
                       static_cast<int>(run.steps.size()), Reading(listing, run.tolerance).c_str());
     listing.WriteText(run.inTolerance ? "\n" : std::string("   ") + niv::kListOutOfTolerance + "\n");
-    listing.WriteLine("%s", run.distributedByDistance ? niv::kListByDistance : niv::kListBySetUp);
+    listing.WriteLine("%s", run.distribution == LevellingDistribution::ByDistance ? niv::kListByDistance
+                            : run.distribution == LevellingDistribution::ByHeightDifference
+                                ? niv::kListByHeightDifference
+                                : niv::kListBySetUp);
     listing.WriteText("\n");
     Blank(listing);
 

@@ -56,7 +56,8 @@ inline constexpr const char* kListClosure = "Fermeture = %s m sur %s (%d dénive
 inline constexpr const char* kListLength = "%s m";
 inline constexpr const char* kListNoLength = "une longueur inconnue";
 inline constexpr const char* kListByDistance = "Compensation proportionnelle aux portées.";
-inline constexpr const char* kListBySetUp = "Compensation égale par dénivelée (portées incomplètes).";
+inline constexpr const char* kListBySetUp = "Compensation en parts égales par dénivelée.";
+inline constexpr const char* kListByHeightDifference = "Compensation proportionnelle aux dénivelées.";
 inline constexpr const char* kListOutOfTolerance = "HORS TOLÉRANCE";
 inline constexpr const char* kListWarningsTitle = "Remarques";
 inline constexpr const char* kListToleranceFixed = "Tolérance de fermeture : %s m";

@@ -68,7 +68,7 @@ TEST(Levelling, ExactReadingsGiveTheHeightsBack) {
     EXPECT_FALSE(run.closedLoop);
     EXPECT_NEAR(run.misclosure, 0.0, 1e-9);
     EXPECT_TRUE(run.inTolerance);
-    EXPECT_TRUE(run.distributedByDistance);
+    EXPECT_EQ(run.distribution, LevellingDistribution::ByDistance);
     EXPECT_DOUBLE_EQ(run.length, 70.0 + 58.0 + 81.0);
     ASSERT_EQ(run.steps.size(), 3u);
     EXPECT_NEAR(run.steps[0].zTo, 101.2345, kHundredthMm);
@@ -111,7 +111,7 @@ TEST(Levelling, MisclosureSharedByCumulatedDistance) {
     ASSERT_EQ(result.runs.size(), 1u);
     const LevellingRun& run = result.runs[0];
     EXPECT_NEAR(run.misclosure, 0.012, 1e-9);
-    EXPECT_TRUE(run.distributedByDistance);
+    EXPECT_EQ(run.distribution, LevellingDistribution::ByDistance);
     EXPECT_DOUBLE_EQ(run.length, 150.0);
     EXPECT_NEAR(run.steps[0].correction, -0.0048, 1e-9);
     EXPECT_NEAR(run.steps[1].correction, -0.0024, 1e-9);
@@ -136,6 +136,30 @@ TEST(Levelling, MisclosureSharedByCumulatedDistance) {
     EXPECT_TRUE(ComputeLevelling(book.carnet, Fixed(0.012)).runs[0].inTolerance);
 }
 
+// The same run shared by the rule the surveyor chose, its sights measured or not:
+//   by set-up, -0.004 each: T1 100.496, T2 100.692;
+//   by height difference over 0.500 + 0.200 + 0.312 = 1.012 m of climb: T1 takes -0.012 x 0.5 / 1.012 =
+//   -0.0059289 -> 100.4940711, T2 -0.012 x 0.7 / 1.012 = -0.0083004 -> 100.6916996.
+TEST(Levelling, TheMisclosureIsSharedByTheRuleChosen) {
+    const FieldBook book = MisclosedRun(true);
+    LevellingOptions options = Fixed(0.02);
+    options.distribution = LevellingDistribution::BySetUp;
+    const LevellingRun bySetUp = ComputeLevelling(book.carnet, options).runs[0];
+    EXPECT_EQ(bySetUp.distribution, LevellingDistribution::BySetUp);
+    EXPECT_NEAR(bySetUp.steps[0].zTo, 100.496, kHundredthMm);
+    EXPECT_NEAR(bySetUp.steps[1].zTo, 100.692, kHundredthMm);
+    options.distribution = LevellingDistribution::ByHeightDifference;
+    const LevellingRun byClimb = ComputeLevelling(book.carnet, options).runs[0];
+    EXPECT_EQ(byClimb.distribution, LevellingDistribution::ByHeightDifference);
+    EXPECT_NEAR(byClimb.steps[0].zTo, 100.4940711, kHundredthMm);
+    EXPECT_NEAR(byClimb.steps[1].zTo, 100.6916996, kHundredthMm);
+    EXPECT_DOUBLE_EQ(byClimb.steps[2].zTo, 101.0);
+    // By distance without the sights' lengths: equal shares.
+    options.distribution = LevellingDistribution::ByDistance;
+    EXPECT_EQ(ComputeLevelling(MisclosedRun(false).carnet, options).runs[0].distribution,
+              LevellingDistribution::BySetUp);
+}
+
 TEST(Levelling, MissingDistanceSharesByNumberOfSetUps) {
     // The first set-up has no distances: each set-up takes -0.012 / 3 = -0.004.
     //   T1: 100.500 - 0.004 = 100.496;  T2: 100.700 - 0.008 = 100.692;  B: 101.000.
@@ -144,7 +168,7 @@ TEST(Levelling, MissingDistanceSharesByNumberOfSetUps) {
     LevellingOptions options = Fixed(0.02);
     options.closureMode = LevellingToleranceMode::PerKm;
     const LevellingRun run = ComputeLevelling(book.carnet, options).runs[0];
-    EXPECT_FALSE(run.distributedByDistance);
+    EXPECT_EQ(run.distribution, LevellingDistribution::BySetUp);
     EXPECT_FALSE(IsKnown(run.length));
     EXPECT_DOUBLE_EQ(run.tolerance, 0.02);
     EXPECT_NEAR(run.steps[0].zTo, 100.496, kHundredthMm);
@@ -337,7 +361,7 @@ TEST(Levelling, PublishedFieldNotesWithSideReadings) {
     const LevellingRun& run = result.runs[0];
     EXPECT_EQ(run.start, "OBM1");
     EXPECT_EQ(run.end, "OBM2");
-    EXPECT_FALSE(run.distributedByDistance);
+    EXPECT_EQ(run.distribution, LevellingDistribution::BySetUp);
     EXPECT_NEAR(run.misclosure, 0.010, kHundredthMm);
     EXPECT_NEAR(run.tolerance, 0.005 * std::sqrt(5.0), 1e-9);
     EXPECT_TRUE(run.inTolerance);

@@ -78,6 +78,17 @@ TEST_F(NivCommand, AMisclosureOfSixMillimetresIsSharedAlongTheRunAndWritten) {
     EXPECT_TRUE(Has(ReadBytes(dir / "chantier.jnl"), "Calcul de cheminements altimétriques"));
 }
 
+// "TypeNivel" 2 shares it by the height differences, 1.234 + 1.358 + 0.667 = 3.259 m of climb: T2 takes
+// +0.006 x 2.592 / 3.259 = +0.0047720 (by the sights' lengths, +0.004).
+TEST_F(NivCommand, TheMisclosureIsSharedByTheHeightDifferencesWhenTheOptionsSaySo) {
+    WriteSimple(kB + 0.006);
+    WriteBytes(dir / "Pyralis.ini", "[Options_Nivellement]\r\nTypeNivel=2\r\n");
+    const Outcome outcome = Run("CalNivSm --geobase chantier.geo --enregistrer --listing niv.cns");
+    ASSERT_EQ(outcome.status, 0) << outcome.err;
+    EXPECT_TRUE(Has(ReadBytes(dir / "niv.cns"), "Compensation proportionnelle aux dénivelées."));
+    EXPECT_NEAR(SavedZ(Saved(), "T2"), kT2 + 0.0047720, 0.0005); // the GéoBase's millimetre
+}
+
 TEST_F(NivCommand, ExactReadingsGiveTheTrueHeightsAndTheRunsCanBeChosen) {
     WriteSimple(kB);
     Outcome outcome = Run("CalNivSm --geobase chantier.geo --depart B --enregistrer");
