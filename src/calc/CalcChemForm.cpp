@@ -29,8 +29,6 @@ constexpr const char* kChoiceAll = "aucun coché : tous seront calculés";
 constexpr const char* kChoiceSome = "%d coché(s)";
 constexpr const char* kStatusComputed = "%d cheminement(s) calculé(s) sur %d, %d hors tolérance.";
 constexpr const char* kStatusFound = "Recherche automatique : %d cheminement(s) ajouté(s) dans la GéoBase.";
-constexpr const char* kStatusSaved = "Enregistrement terminé : le détail est dans la fenêtre de texte.";
-constexpr const char* kStatusNotSaved = "La GéoBase n'a pas pu être enregistrée.";
 
 std::string Fixed(double value, int decimals) {
     return IsKnown(value) ? FormatFixedShown(value, decimals) : std::string("-");
@@ -69,7 +67,7 @@ std::string Tip(const ComputedTraverse& t) {
 std::vector<ui::Control> CCalcChemForm::Controls() const {
     // The traverses with the two actions beside them, the results across the whole window under them.
     using K = ControlKind;
-    return {
+    std::vector<ui::Control> controls{
         Ctl(kLabelTraverses, K::Label, "etiquetteCheminements", "C&heminements :").Buddy(kTraverses),
         Ctl(kTraverses, K::CheckList, "cheminements").At(1, 0, 3, 1).Width(24).Lines(5),
         Ctl(kSearch, K::Button, "recherche", "Recherche &automatique").At(1, 1),
@@ -81,10 +79,10 @@ std::vector<ui::Control> CCalcChemForm::Controls() const {
             .Width(104)
             .Lines(6),
         Ctl(kStatus, K::Status, "etat").At(6, 0, 1, 2),
-        Ctl(kSave, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
-        Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow).At(0, 1),
-        Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 2),
     };
+    const std::vector<ui::Control> foot = FootButtons();
+    controls.insert(controls.end(), foot.begin(), foot.end());
+    return controls;
 }
 
 bool CCalcChemForm::Open(ui::FrontEnd& frontEnd) {
@@ -98,7 +96,7 @@ bool CCalcChemForm::Open(ui::FrontEnd& frontEnd) {
 }
 
 std::string CCalcChemForm::StatusText() const {
-    if (!m_message.empty()) return m_message;
+    if (!Message().empty()) return Message();
     const int count = static_cast<int>(m_model.TraverseNames().size());
     if (count == 0) return kStatusNone;
     const std::vector<ComputedTraverse>& results = m_model.Results();
@@ -138,13 +136,8 @@ ui::ControlState CCalcChemForm::State(int id) const {
     case kStatus:
         state.text = StatusText();
         break;
-    case kSave:
-        state.enabled = m_pending;
-        break;
-    case ui::kIdOk:
-        state.enabled = !results.empty();
-        break;
     default:
+        FootState(id, state);
         break;
     }
     return state;
@@ -161,49 +154,29 @@ void CCalcChemForm::CheckTraverse(int rank, bool on) {
         m_model.Choose(names[static_cast<std::size_t>(kept)]);
 }
 
-void CCalcChemForm::Finish(bool listingAsked) {
-    m_model.Close(m_saved, listingAsked);
-    End(listingAsked || m_saved ? ui::DialogResult::Ok : ui::DialogResult::Cancel);
-}
-
 void CCalcChemForm::Act(ui::FrontEnd&, int id, const ui::Event& event) {
     using ui::EventKind;
     switch (id) {
     case kTraverses:
         if (event.kind == EventKind::CheckLine) {
             CheckTraverse(event.rank, event.on);
-            m_message.clear();
+            Say({});
         }
         return;
     case kSearch: {
         const int added = m_model.Search();
-        m_message = added < 0 ? kStatusNotSaved : Sprintf(kStatusFound, added);
+        if (added < 0)
+            SayNotSaved();
+        else
+            Say(Sprintf(kStatusFound, added));
         return;
     }
     case kCalculate:
         if (m_model.TraverseNames().empty()) return;
-        m_message.clear();
-        m_pending = m_model.Calculate();
-        if (m_pending) Focus(kSave);
-        return;
-    case kSave:
-        if (!m_pending) return;
-        if (m_model.Enregistrer()) {
-            m_saved = true;
-            m_pending = false;
-            m_message = kStatusSaved;
-            Focus(ui::kIdOk);
-        } else {
-            m_message = kStatusNotSaved;
-        }
-        return;
-    case ui::kIdOk:
-        if (!m_model.Results().empty()) Finish(true);
-        return;
-    case ui::kIdCancel:
-        Finish(false);
+        Computed(m_model.Calculate());
         return;
     default:
+        FootAct(id);
         return;
     }
 }

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "calc/CalcChem.h"
-#include "ui/Form.h"
+#include "calc/ResultsForm.h"
 
 namespace pyr {
 
@@ -9,7 +9,7 @@ namespace pyr {
 // computes them all), the automatic search that adds those found among the set-ups, "&Calculer", a table
 // of their closures against the tolerances, the status line, and at the foot "&Enregistrer", which writes
 // the stations, "Fin + Listing" and "&Fermer".
-class CCalcChemForm : public ui::Form {
+class CCalcChemForm : public CResultsForm {
 public:
     enum Id : int {
         kLabelTraverses = 3,
@@ -23,7 +23,8 @@ public:
     };
 
     // `dialog` gives the command's inputs when the window opens; `model` is the dialog shown.
-    CCalcChemForm(const ui::DialogModel& dialog, CCalcChem& model) : m_dialog(dialog), m_model(model) {}
+    CCalcChemForm(const ui::DialogModel& dialog, CCalcChem& model)
+        : CResultsForm(kSave), m_dialog(dialog), m_model(model) {}
 
     ui::DialogModel& Model() override { return m_model; }
     std::vector<ui::Control> Controls() const override;
@@ -35,13 +36,12 @@ private:
     std::string StatusText() const;
     // The traverse of rank `rank` checked or not: the others keep their marks.
     void CheckTraverse(int rank, bool on);
-    void Finish(bool listingAsked);
+    bool WriteResults() override { return m_model.Enregistrer(); }
+    void CloseModel(bool saved, bool listingAsked) override { m_model.Close(saved, listingAsked); }
+    bool HasResults() const override { return !m_model.Results().empty(); }
 
     const ui::DialogModel& m_dialog;
     CCalcChem& m_model;
-    bool m_saved = false;   // the results written into the GéoBase
-    bool m_pending = false; // results computed and not yet written
-    std::string m_message;  // what the last action left to say in the status line
 };
 
 } // namespace pyr

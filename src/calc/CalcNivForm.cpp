@@ -23,8 +23,6 @@ constexpr const char* kStateOut = "HORS TOLÉRANCE";
 constexpr const char* kStateFlagged = "dénivelées mal contrôlées";
 constexpr const char* kStatusReady = "%d repère(s) d'altitude connue parmi les lectures sur mire.";
 constexpr const char* kStatusComputed = "%d cheminement(s) calculé(s), %d hors tolérance, %d remarque(s).";
-constexpr const char* kStatusSaved = "Enregistrement terminé : le détail est dans la fenêtre de texte.";
-constexpr const char* kStatusNotSaved = "La GéoBase n'a pas pu être enregistrée.";
 // Misclosures and tolerances to the tenth of a millimetre, as the text window and the listing show them.
 constexpr int kClosureDecimals = 4;
 
@@ -52,7 +50,7 @@ std::string Tip(const LevellingRun& run) {
 std::vector<ui::Control> CCalcNivForm::Controls() const {
     // The choice of the runs on one line, the results and the remarks across the window under it.
     using K = ControlKind;
-    return {
+    std::vector<ui::Control> controls{
         Ctl(kLabelStart, K::Label, "etiquetteDepart", "&Départ :").Buddy(kStart),
         Ctl(kStart, K::Combo, "depart").At(0, 1).Width(14),
         Ctl(kLabelEnd, K::Label, "etiquetteArrivee", "&Arrivée :").At(0, 2).Buddy(kEnd),
@@ -67,10 +65,10 @@ std::vector<ui::Control> CCalcNivForm::Controls() const {
         Ctl(kLabelProblems, K::Label, "etiquetteRemarques", "Re&marques :").At(3, 0, 1, 5).Buddy(kProblems),
         Ctl(kProblems, K::List, "remarques").At(4, 0, 1, 5).Width(84).Lines(3),
         Ctl(kStatus, K::Status, "etat").At(5, 0, 1, 5),
-        Ctl(kSave, K::Button, "enregistrer", "&Enregistrer").In(ui::kButtonRow),
-        Ctl(ui::kIdOk, K::Button, "finListing", "Fin + Listing").In(ui::kButtonRow).At(0, 1),
-        Ctl(ui::kIdCancel, K::Button, "fermer", "&Fermer").In(ui::kButtonRow).At(0, 2),
     };
+    const std::vector<ui::Control> foot = FootButtons();
+    controls.insert(controls.end(), foot.begin(), foot.end());
+    return controls;
 }
 
 bool CCalcNivForm::Open(ui::FrontEnd& frontEnd) {
@@ -97,7 +95,7 @@ ui::ControlState CCalcNivForm::BenchmarkState(const std::string& chosen) const {
 }
 
 std::string CCalcNivForm::StatusText() const {
-    if (!m_message.empty()) return m_message;
+    if (!Message().empty()) return Message();
     if (!m_computed) return Sprintf(kStatusReady, static_cast<int>(m_benchmarks.size()));
     const std::vector<LevellingRun>& runs = m_model.Runs();
     const auto out =
@@ -125,21 +123,11 @@ ui::ControlState CCalcNivForm::State(int id) const {
     case kStatus:
         state.text = StatusText();
         break;
-    case kSave:
-        state.enabled = m_pending;
-        break;
-    case ui::kIdOk:
-        state.enabled = !m_model.Runs().empty();
-        break;
     default:
+        FootState(id, state);
         break;
     }
     return state;
-}
-
-void CCalcNivForm::Finish(bool listingAsked) {
-    m_model.Close(m_saved, listingAsked);
-    End(listingAsked || m_saved ? ui::DialogResult::Ok : ui::DialogResult::Cancel);
 }
 
 void CCalcNivForm::Act(ui::FrontEnd&, int id, const ui::Event& event) {
@@ -159,29 +147,11 @@ void CCalcNivForm::Act(ui::FrontEnd&, int id, const ui::Event& event) {
         return;
     }
     case kCalculate:
-        m_message.clear();
         m_computed = true;
-        m_pending = m_model.Calculate();
-        if (m_pending) Focus(kSave);
-        return;
-    case kSave:
-        if (!m_pending) return;
-        if (m_model.Enregistrer()) {
-            m_saved = true;
-            m_pending = false;
-            m_message = kStatusSaved;
-            Focus(ui::kIdOk);
-        } else {
-            m_message = kStatusNotSaved;
-        }
-        return;
-    case ui::kIdOk:
-        if (!m_model.Runs().empty()) Finish(true);
-        return;
-    case ui::kIdCancel:
-        Finish(false);
+        Computed(m_model.Calculate());
         return;
     default:
+        FootAct(id);
         return;
     }
 }

@@ -1,7 +1,7 @@
 #pragma once
 
 #include "calc/CalcNiv.h"
-#include "ui/Form.h"
+#include "calc/ResultsForm.h"
 
 namespace pyr {
 
@@ -9,7 +9,7 @@ namespace pyr {
 // leaves and reaches chosen in two combos ("(toutes)" for any), "&Calculer", a table of the runs with
 // their misclosures against their tolerances, the remarks on what could not be made into a run, the
 // status line, and at the foot "&Enregistrer", which writes the heights, "Fin + Listing" and "&Fermer".
-class CCalcNivForm : public ui::Form {
+class CCalcNivForm : public CResultsForm {
 public:
     enum Id : int {
         kLabelStart = 3,
@@ -26,7 +26,8 @@ public:
     };
 
     // `dialog` gives the command's inputs when the window opens; `model` is the dialog shown.
-    CCalcNivForm(const ui::DialogModel& dialog, CCalcNiv& model) : m_dialog(dialog), m_model(model) {}
+    CCalcNivForm(const ui::DialogModel& dialog, CCalcNiv& model)
+        : CResultsForm(kSave), m_dialog(dialog), m_model(model) {}
 
     ui::DialogModel& Model() override { return m_model; }
     std::vector<ui::Control> Controls() const override;
@@ -37,15 +38,14 @@ public:
 private:
     std::string StatusText() const;
     ui::ControlState BenchmarkState(const std::string& chosen) const;
-    void Finish(bool listingAsked);
+    bool WriteResults() override { return m_model.Enregistrer(); }
+    void CloseModel(bool saved, bool listingAsked) override { m_model.Close(saved, listingAsked); }
+    bool HasResults() const override { return !m_model.Runs().empty(); }
 
     const ui::DialogModel& m_dialog;
     CCalcNiv& m_model;
     std::vector<std::string> m_benchmarks; // read when the window opens
     bool m_computed = false;
-    bool m_saved = false;   // the heights written into the GéoBase
-    bool m_pending = false; // runs computed and not yet written
-    std::string m_message;  // what the last action left to say in the status line
 };
 
 } // namespace pyr
