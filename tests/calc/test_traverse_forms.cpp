@@ -9,6 +9,7 @@
 #include "calc/CalcNivDriver.h"
 #include "calc/CalcNivForm.h"
 #include "calc/IntersectionJob.h"
+#include "calc/LevelJob.h"
 #include "calc/TraverseJob.h"
 #include "core/Strings.h"
 #include "geobase/Elements.h"
@@ -167,40 +168,13 @@ TEST_F(TraverseForm, AGeoBaseWithoutTraversesSaysSoAndTheSearchFindsThem) {
 
 // ---- Direct levelling
 
-// True heights (metres): A and B the benchmarks, T1 and T2 turning points, S a side point levelled from
-// the set-up on T1; every sight 30 m long.
-constexpr double kZA = 100.000, kZT1 = 101.234, kZT2 = 99.876, kZB = 100.543, kZS = 100.111;
-constexpr double kSight = 30.0;
+namespace lj = level_job;
 
-struct LevellingJob {
-    CCarnet job;
-
-    void Benchmark(const char* name, double z) { job.Add(std::make_unique<CPointGen>(name, z), kKindPoint); }
-    void Back(const char* point, double reading) {
-        job.Add(std::make_unique<CLectAR>(point, reading, kSight), kKindLectAR);
-    }
-    void Forward(const char* point, double reading) {
-        job.Add(std::make_unique<CLectAV>(point, reading, kSight), kKindLectAV);
-    }
-    // One set-up from `from` (height zFrom) to `to` (height zTo).
-    void SetUp(const char* from, double zFrom, const char* to, double zTo, double back = 1.5) {
-        Back(from, back);
-        Forward(to, back + zFrom - zTo);
-    }
-    // The run A - T1 - (S) - T2 - B, B's height in the GéoBase being `zB`.
-    void Simple(double zB) {
-        Benchmark("A", kZA);
-        Benchmark("B", zB);
-        SetUp("A", kZA, "T1", kZT1, 1.432);
-        Back("T1", 0.512);
-        Forward("S", 0.512 + kZT1 - kZS);
-        Forward("T2", 0.512 + kZT1 - kZT2);
-        SetUp("T2", kZT2, "B", kZB, 2.222);
-    }
-
+// The level job, written where the window finds it.
+struct LevellingJob : LevelJob {
     std::string Prepare(const TempDir& dir) {
         WriteBytes(dir / "Pyralis.ini", kPlainListingOptions);
-        job.Save(dir / "chantier.geo");
+        carnet.Save(dir / "chantier.geo");
         return dir / "chantier.geo";
     }
 };
@@ -230,7 +204,7 @@ protected:
 
 TEST_F(LevellingForm, AMisclosureSharedAlongTheRunTheHeightsSavedThenTheListing) {
     LevellingJob job;
-    job.Simple(kZB + 0.006); // f = -6 mm over three equal set-ups: +2 mm each
+    job.SimpleRun(lj::kB + 0.006); // f = -6 mm over three equal set-ups: +2 mm each
     ASSERT_TRUE(Open(job));
     Person person{*form, frontEnd};
     EXPECT_EQ(form->Caption(), "PYRALIS - Calcul de cheminement altimétrique");
@@ -258,10 +232,10 @@ TEST_F(LevellingForm, AMisclosureSharedAlongTheRunTheHeightsSavedThenTheListing)
 
     person.Click(F::kSave);
     const CCarnet saved = Load(geo);
-    EXPECT_NEAR(SavedZ(saved, "T1"), kZT1 + 0.002, kTenthMm);
-    EXPECT_NEAR(SavedZ(saved, "T2"), kZT2 + 0.004, kTenthMm);
-    EXPECT_NEAR(SavedZ(saved, "S"), kZS + 0.002, kTenthMm);
-    EXPECT_NEAR(SavedZ(saved, "B"), kZB + 0.006, kTenthMm); // the benchmarks keep theirs
+    EXPECT_NEAR(SavedZ(saved, "T1"), lj::kT1 + 0.002, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "T2"), lj::kT2 + 0.004, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "S"), lj::kS + 0.002, kTenthMm);
+    EXPECT_NEAR(SavedZ(saved, "B"), lj::kB + 0.006, kTenthMm); // the benchmarks keep theirs
 
     person.Click(kIdOk);
     EXPECT_EQ(form->Ended(), ui::DialogResult::Ok);
@@ -270,8 +244,8 @@ TEST_F(LevellingForm, AMisclosureSharedAlongTheRunTheHeightsSavedThenTheListing)
 
 TEST_F(LevellingForm, AChoiceThatMatchesNoRunAndWhatReachesNoBenchmarkAreSaid) {
     LevellingJob job;
-    job.Simple(kZB);
-    job.SetUp("B", kZB, "X", 101.0); // levelled on from B to a point of unknown height
+    job.SimpleRun(lj::kB);
+    job.SetUp("B", lj::kB, "X", 101.0); // levelled on from B to a point of unknown height
     ASSERT_TRUE(Open(job));
     Person person{*form, frontEnd};
     const std::string before = ReadBytes(geo);
@@ -302,12 +276,12 @@ TEST_F(LevellingForm, AChoiceThatMatchesNoRunAndWhatReachesNoBenchmarkAreSaid) {
 
 TEST_F(LevellingForm, DoubleStationShowsThePairOutOfToleranceAndWritesOnlyWhenTold) {
     LevellingJob job;
-    job.Benchmark("A", kZA);
-    job.Benchmark("B", kZB);
-    job.SetUp("A", kZA, "T1", kZT1 + 0.001, 1.4);
-    job.SetUp("A", kZA, "T1", kZT1 - 0.001, 1.6);
-    job.SetUp("T1", kZT1, "B", kZB + 0.015, 1.3); // 30 mm between the two: over 10 mm
-    job.SetUp("T1", kZT1, "B", kZB - 0.015, 1.7);
+    job.Benchmark("A", lj::kA);
+    job.Benchmark("B", lj::kB);
+    job.SetUp("A", lj::kA, "T1", lj::kT1 + 0.001, 1.4);
+    job.SetUp("A", lj::kA, "T1", lj::kT1 - 0.001, 1.6);
+    job.SetUp("T1", lj::kT1, "B", lj::kB + 0.015, 1.3); // 30 mm between the two: over 10 mm
+    job.SetUp("T1", lj::kT1, "B", lj::kB - 0.015, 1.7);
     ASSERT_TRUE(Open(job, LevellingMethod::DoubleStation));
     Person person{*form, frontEnd};
     EXPECT_EQ(form->Caption(), "PYRALIS - Calcul de nivellement par double station");
@@ -326,7 +300,7 @@ TEST_F(LevellingForm, DoubleStationShowsThePairOutOfToleranceAndWritesOnlyWhenTo
 
 TEST_F(LevellingForm, AGeoBaseWithoutStaffReadingsSaysSoAndTheWindowDoesNotOpen) {
     LevellingJob job;
-    job.Benchmark("A", kZA);
+    job.Benchmark("A", lj::kA);
     EXPECT_FALSE(Open(job));
     EXPECT_EQ(form->Ended(), ui::DialogResult::Failed);
     ASSERT_EQ(frontEnd.messages.size(), 1u);

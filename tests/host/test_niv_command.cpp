@@ -2,6 +2,7 @@
 // between two benchmarks gives the heights back; a misclosure of a few millimetres is shared along it; out
 // of tolerance, it is written only when the surveyor says so; what cannot be computed writes nothing.
 #include "HostTestSupport.h"
+#include "calc/LevelJob.h"
 #include "geobase/Elements.h"
 #include "geobase/Kinds.h"
 
@@ -12,42 +13,17 @@ namespace {
 
 constexpr double kTenthMm = 1e-4;
 
-// True heights (metres): A and B the benchmarks, T1 and T2 turning points, S a side point levelled from
-// the set-up on T1. The readings are what a perfect level reads, every sight 30 m long, so that a
-// misclosure is shared in equal thirds.
-constexpr double kA = 100.000, kT1 = 101.234, kT2 = 99.876, kB = 100.543, kS = 100.111;
-constexpr double kSight = 30.0;
+using namespace level_job;
 
 class NivCommand : public PyralisTest {
 protected:
-    CCarnet carnet;
+    LevelJob job;
 
-    void Benchmark(const char* name, double z) {
-        ASSERT_GE(carnet.Add(std::make_unique<CPointGen>(name, z), kKindPoint), 0);
-    }
-    void Back(const char* point, double reading) {
-        ASSERT_GE(carnet.Add(std::make_unique<CLectAR>(point, reading, kSight), kKindLectAR), 0);
-    }
-    void Forward(const char* point, double reading) {
-        ASSERT_GE(carnet.Add(std::make_unique<CLectAV>(point, reading, kSight), kKindLectAV), 0);
-    }
-    // One set-up from `from` (height zFrom) to `to` (height zTo), the back staff read at `back`.
-    void SetUp(const char* from, double zFrom, const char* to, double zTo, double back = 1.5) {
-        Back(from, back);
-        Forward(to, back + zFrom - zTo);
-    }
-    // The simple run A - T1 - (S) - T2 - B, B's height in the GéoBase being `zB`.
     void WriteSimple(double zB) {
-        Benchmark("A", kA);
-        Benchmark("B", zB);
-        SetUp("A", kA, "T1", kT1, 1.432);
-        Back("T1", 0.512);
-        Forward("S", 0.512 + kT1 - kS);
-        Forward("T2", 0.512 + kT1 - kT2);
-        SetUp("T2", kT2, "B", kB, 2.222);
+        job.SimpleRun(zB);
         Save();
     }
-    void Save() { ASSERT_EQ(carnet.Save(dir / "chantier.geo"), 1); }
+    void Save() { ASSERT_EQ(job.carnet.Save(dir / "chantier.geo"), 1); }
     double SavedZ(const CCarnet& saved, const char* name) {
         const int at = saved.findMat(name);
         return at >= 0 ? saved.zAt(at) : kUndefined;
@@ -124,12 +100,12 @@ TEST_F(NivCommand, OutOfToleranceItIsWrittenOnlyWhenTheSurveyorSaysSo) {
 
 TEST_F(NivCommand, DoubleStationAveragesEachPairAndNamesThePairOutOfTolerance) {
     // A - T1 levelled twice within 2 mm; T1 - B twice, 30 mm apart (tolerance 10 mm).
-    Benchmark("A", kA);
-    Benchmark("B", kB);
-    SetUp("A", kA, "T1", kT1 + 0.001, 1.4);
-    SetUp("A", kA, "T1", kT1 - 0.001, 1.6);
-    SetUp("T1", kT1, "B", kB + 0.015, 1.3);
-    SetUp("T1", kT1, "B", kB - 0.015, 1.7);
+    job.Benchmark("A", kA);
+    job.Benchmark("B", kB);
+    job.SetUp("A", kA, "T1", kT1 + 0.001, 1.4);
+    job.SetUp("A", kA, "T1", kT1 - 0.001, 1.6);
+    job.SetUp("T1", kT1, "B", kB + 0.015, 1.3);
+    job.SetUp("T1", kT1, "B", kB - 0.015, 1.7);
     Save();
     Outcome outcome = Run("CalNivSt --geobase chantier.geo --enregistrer --oui --listing niv.cna");
     ASSERT_EQ(outcome.status, 0) << outcome.err;
@@ -149,7 +125,7 @@ TEST_F(NivCommand, DoubleStationAveragesEachPairAndNamesThePairOutOfTolerance) {
 }
 
 TEST_F(NivCommand, WithoutStaffReadingOrBenchmarkItSaysSoAndWritesNothing) {
-    Benchmark("A", kA);
+    job.Benchmark("A", kA);
     Save();
     std::string before = ReadBytes(dir / "chantier.geo");
     Outcome outcome = Run("CalNivSm --geobase chantier.geo --enregistrer");
@@ -157,9 +133,9 @@ TEST_F(NivCommand, WithoutStaffReadingOrBenchmarkItSaysSoAndWritesNothing) {
     EXPECT_TRUE(Has(outcome.err, "ne contient aucune lecture sur mire !")) << outcome.err;
     EXPECT_EQ(ReadBytes(dir / "chantier.geo"), before);
 
-    carnet = CCarnet();
-    SetUp("P1", 10.0, "P2", 11.0);
-    SetUp("P2", 11.0, "P3", 12.0);
+    job.carnet = CCarnet();
+    job.SetUp("P1", 10.0, "P2", 11.0);
+    job.SetUp("P2", 11.0, "P3", 12.0);
     Save();
     before = ReadBytes(dir / "chantier.geo");
     outcome = Run("CalNivSt --geobase chantier.geo --enregistrer");
