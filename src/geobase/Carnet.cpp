@@ -103,6 +103,16 @@ void CCarnet::removeElement(int index) {
     RemoveRange(index, index + 1);
 }
 
+std::unique_ptr<CElement> CCarnet::TakeAt(int index, int& kind) {
+    if (!IsValidIndex(index)) return nullptr;
+    const auto at = static_cast<std::size_t>(index);
+    std::unique_ptr<CElement> element = std::move(m_elements[at]);
+    element->m_inStore = false;
+    kind = m_kinds[at];
+    RemoveRange(index, index + 1);
+    return element;
+}
+
 void CCarnet::RemoveRange(int first, int last) {
     first = std::max(first, 0);
     last = std::min(last, GetSize());

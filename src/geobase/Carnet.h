@@ -53,6 +53,9 @@ public:
     int InsertAt(int index, std::unique_ptr<CElement> element, int kind);
     // Removes the element and its kind at that index.
     void removeElement(int index);
+    // Removes the element at that index and hands it over with its kind (an edit that may be undone keeps
+    // it); null, and nothing changed, outside the store.
+    std::unique_ptr<CElement> TakeAt(int index, int& kind);
     // Removes the elements of [first, last).
     void RemoveRange(int first, int last);
     void RemoveAll();
