@@ -95,7 +95,9 @@ int CCarnet::InsertAt(int index, std::unique_ptr<CElement> element, int kind) {
     element->m_inStore = true;
     m_elements.insert(m_elements.begin() + index, std::move(element));
     m_kinds.insert(m_kinds.begin() + index, kind);
-    Changed();
+    m_index.Inserted(m_elements.size(), CElement::IdentifierChanges(), index,
+                     *m_elements[static_cast<size_t>(index)], kind);
+    m_noStationBefore = 0;
     return index;
 }
 
@@ -109,7 +111,10 @@ std::unique_ptr<CElement> CCarnet::TakeAt(int index, int& kind) {
     std::unique_ptr<CElement> element = std::move(m_elements[at]);
     element->m_inStore = false;
     kind = m_kinds[at];
-    RemoveRange(index, index + 1);
+    m_elements.erase(m_elements.begin() + index);
+    m_kinds.erase(m_kinds.begin() + index);
+    m_index.Removed(m_elements.size(), CElement::IdentifierChanges(), index, kind);
+    m_noStationBefore = 0;
     return element;
 }
 
@@ -180,7 +185,9 @@ bool CCarnet::ExchangeAt(int index, std::unique_ptr<CElement>& element) {
     slot->m_inStore = false;
     element->m_inStore = true;
     slot.swap(element);
-    Changed(); // the index views the identifiers in the elements
+    // The index views the identifiers in the elements.
+    m_index.Exchanged(m_elements.size(), CElement::IdentifierChanges(), index, *element, *slot);
+    m_noStationBefore = 0;
     return true;
 }
 

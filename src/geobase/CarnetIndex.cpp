@@ -63,6 +63,85 @@ void CarnetIndex::Appended(std::size_t size, std::uint64_t identifierChanges, co
     m_size = size;
 }
 
+void CarnetIndex::Exchanged(std::size_t size, std::uint64_t identifierChanges, int index,
+                            const CElement& before, const CElement& element) {
+    if (!IsValid(size, identifierChanges) || before.mat() != element.mat()) {
+        Invalidate();
+        return;
+    }
+    // Same identifier, same place: only the view of its text may have to follow the element.
+    const int rank = NameRankOf(index);
+    if (rank < 0) return;
+    Name& name = m_names[static_cast<std::size_t>(rank)];
+    if (name.indices.front() == index) name.mat = element.mat();
+}
+
+int CarnetIndex::RankOf(const std::string& mat) const {
+    if (mat.empty()) return -1;
+    const std::uint64_t entry = m_slots[SlotOf(mat, std::hash<std::string_view>{}(mat))];
+    return entry == 0 ? -1 : static_cast<int>((entry & kRankBits) - 1);
+}
+
+void CarnetIndex::Shift(int from, int by) {
+    const auto shift = [from, by](std::vector<int>& indices) {
+        for (auto at = std::lower_bound(indices.begin(), indices.end(), from); at != indices.end(); ++at)
+            *at += by;
+    };
+    for (Name& name : m_names)
+        if (name.indices.back() >= from) shift(name.indices);
+    for (auto& list : m_byKind)
+        shift(list);
+}
+
+void CarnetIndex::Inserted(std::size_t size, std::uint64_t identifierChanges, int index,
+                           const CElement& element, int kind) {
+    if (!IsValid(size - 1, identifierChanges) || !IsKnownKind(kind)) {
+        Invalidate();
+        return;
+    }
+    // An identifier new to the store, or whose first element it now is, changes the order of the ranks.
+    const int rank = RankOf(element.mat());
+    if (!element.mat().empty() &&
+        (rank < 0 || m_names[static_cast<std::size_t>(rank)].indices.front() >= index)) {
+        Invalidate();
+        return;
+    }
+    Shift(index, 1);
+    m_rankOf.insert(m_rankOf.begin() + index, rank);
+    if (rank >= 0) {
+        std::vector<int>& indices = m_names[static_cast<std::size_t>(rank)].indices;
+        indices.insert(std::lower_bound(indices.begin(), indices.end(), index), index);
+    }
+    std::vector<int>& ofKind = m_byKind[static_cast<std::size_t>(kind - kKindComment)];
+    ofKind.insert(std::lower_bound(ofKind.begin(), ofKind.end(), index), index);
+    m_size = size;
+}
+
+void CarnetIndex::Removed(std::size_t size, std::uint64_t identifierChanges, int index, int kind) {
+    if (!IsValid(size + 1, identifierChanges) || !IsKnownKind(kind)) {
+        Invalidate();
+        return;
+    }
+    // The last element of an identifier, or its first one, changes the order of the ranks.
+    const int rank = NameRankOf(index);
+    if (rank >= 0) {
+        const std::vector<int>& indices = m_names[static_cast<std::size_t>(rank)].indices;
+        if (indices.size() < 2 || indices.front() == index) {
+            Invalidate();
+            return;
+        }
+    }
+    if (rank >= 0) {
+        std::vector<int>& indices = m_names[static_cast<std::size_t>(rank)].indices;
+        indices.erase(std::lower_bound(indices.begin(), indices.end(), index));
+    }
+    std::vector<int>& ofKind = m_byKind[static_cast<std::size_t>(kind - kKindComment)];
+    ofKind.erase(std::lower_bound(ofKind.begin(), ofKind.end(), index));
+    m_rankOf.erase(m_rankOf.begin() + index);
+    Shift(index + 1, -1);
+    m_size = size;
+}
+
 void CarnetIndex::Reserve(std::size_t names) {
     std::size_t capacity = 16;
     while (capacity < 2 * names)

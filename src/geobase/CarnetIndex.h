@@ -24,6 +24,17 @@ public:
                std::uint64_t identifierChanges);
     // An element appended at the end: kept in the index when the index was valid.
     void Appended(std::size_t size, std::uint64_t identifierChanges, const CElement& element, int kind);
+    // The edits of the editor, kept in the index without building it again over a million elements
+    // when they leave the order of the identifiers' first elements as it was; otherwise the index is
+    // dropped. `size` is the store's size after the change.
+    // The element at `index` was exchanged with `element`, of the same kind.
+    void Exchanged(std::size_t size, std::uint64_t identifierChanges, int index, const CElement& before,
+                   const CElement& element);
+    // `element` of `kind` was inserted at `index`.
+    void Inserted(std::size_t size, std::uint64_t identifierChanges, int index, const CElement& element,
+                  int kind);
+    // The element of `kind` at `index` was removed.
+    void Removed(std::size_t size, std::uint64_t identifierChanges, int index, int kind);
 
     // The indices of the elements of that identifier (all kinds), in increasing order; null when none.
     // Valid until the index changes.
@@ -58,6 +69,10 @@ private:
     };
 
     void Add(int index, const CElement& element, int kind);
+    // The rank of that identifier, -1 when the index holds none.
+    int RankOf(const std::string& mat) const;
+    // Every index from `from` on moved by `by` (+1 or -1), in the identifiers' and the kinds' lists.
+    void Shift(int from, int by);
     void Clear();
     // The slots for `names` identifiers: at most half of them used, so that a look-up seldom probes
     // more than one or two.

@@ -295,3 +295,74 @@ TEST(Store, TheIndexAnswersLikeAScanWhileItGrowsUnderAppends) {
     EXPECT_EQ(c.Find(kKindPoint, "TRES_LONG_PREFIXE_5997"), -1); // a measure, not a point
     EXPECT_EQ(c.findMat("TRES_LONG_PREFIXE_5994"), 5994);
 }
+
+// The editor inserts, removes and exchanges elements one at a time in a store of a million: the index
+// follows those edits instead of being built again, and must answer as one built from scratch would,
+// ranks included (a traverse search numbers what it finds in the order of the ranks).
+TEST(Store, TheIndexKeptThroughInsertionsRemovalsAndExchangesAnswersLikeANewOne) {
+    CCarnet c;
+    auto name = [](unsigned n) {
+        return n % 5 == 0 ? "TRES_LONG_PREFIXE_" + std::to_string(n % 40) : "P" + std::to_string(n % 60);
+    };
+    for (unsigned n = 0; n < 400; ++n) {
+        if (n % 7 == 0)
+            c.Add(std::make_unique<CComment>("remarque"), kKindComment);
+        else if (n % 2 == 0)
+            c.Add(std::make_unique<CPointGen>(name(n), n, n, n), kKindPoint);
+        else
+            c.Add(std::make_unique<CMesure>(name(n), 1.3, 10.0, 100.0, n), kKindMesure);
+    }
+    unsigned seed = 12345;
+    auto next = [&seed] { return seed = seed * 1103515245u + 12345u, (seed >> 8) % 100000; };
+    std::vector<std::unique_ptr<CElement>> held; // what the edits took out, alive as in a history
+    for (int edit = 0; edit < 600; ++edit) {
+        if (edit % 50 == 0) c.findMat("P1"); // the index built, then kept through what follows
+        const int at = static_cast<int>(next() % static_cast<unsigned>(c.GetSize()));
+        switch (next() % 3) {
+        case 0: {
+            const unsigned n = next();
+            if (n % 4 == 0)
+                c.InsertAt(at, std::make_unique<CComment>("ajout"), kKindComment);
+            else
+                c.InsertAt(at, std::make_unique<CMesure>(name(n), 1.5, 20.0, 100.0, 5.0), kKindMesure);
+            break;
+        }
+        case 1: {
+            int kind = 0;
+            held.push_back(c.TakeAt(at, kind));
+            break;
+        }
+        default: {
+            // Its new state, under the same identifier most often, as a moved point or an edited reading.
+            std::unique_ptr<CElement> other = c.copyElement(at);
+            if (next() % 5 == 0 && !other->mat().empty()) other->setMat(name(next()));
+            c.ExchangeAt(at, other);
+            held.push_back(std::move(other));
+        }
+        }
+        if (edit % 7 != 0) continue;
+        const CCarnet fresh = c; // a copy builds its own index
+        ASSERT_EQ(c.NameCount(), fresh.NameCount()) << "edit " << edit;
+        for (int i = 0; i < c.GetSize(); ++i) {
+            ASSERT_EQ(c.NameRank(i), fresh.NameRank(i)) << "edit " << edit << ", element " << i;
+            ASSERT_EQ(c.SameMat(i), fresh.SameMat(i)) << "edit " << edit << ", element " << i;
+            ASSERT_EQ(c.Find(c.GetType(i), "", i), i) << "edit " << edit << ", element " << i;
+        }
+        ASSERT_EQ(c.Find(kKindComment, "", 0), fresh.Find(kKindComment, "", 0));
+        ASSERT_EQ(c.findMat("TRES_LONG_PREFIXE_0"), fresh.findMat("TRES_LONG_PREFIXE_0"));
+    }
+    held.clear(); // the views of the identifiers must not have followed the elements taken out
+    const CCarnet fresh = c;
+    for (int i = 0; i < c.GetSize(); ++i)
+        ASSERT_EQ(c.SameMat(i), fresh.SameMat(i)) << "element " << i;
+    for (unsigned n = 0; n < 60; ++n)
+        ASSERT_EQ(c.findMat(name(n)), fresh.findMat(name(n))) << name(n);
+
+    // The first element of a long identifier exchanged, and its former state let go.
+    const int first = c.findMat("TRES_LONG_PREFIXE_10");
+    ASSERT_GE(first, 0);
+    std::unique_ptr<CElement> moved = c.copyElement(first);
+    ASSERT_TRUE(c.ExchangeAt(first, moved));
+    moved.reset();
+    EXPECT_EQ(c.findMat("TRES_LONG_PREFIXE_10"), first);
+}
