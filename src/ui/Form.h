@@ -11,6 +11,10 @@
 // person's actions on them sent back to the model. A desktop front end builds its widgets from the
 // template, shows the states again after every change notice and forwards the actions; the module is
 // reached through these virtual calls only, so the front end needs none of the module's symbols.
+namespace pyr {
+class GeoScene;
+}
+
 namespace pyr::ui {
 
 class FrontEnd;
@@ -26,9 +30,11 @@ enum class ControlKind {
     List,      // a list box, or a table when the control has columns
     CheckList, // a list whose lines are checked or not
     Button,
-    Status,    // a status line
-    Group,     // a frame with a title; the controls whose parent it is go inside, in their own grid
-    Page       // a page of a property sheet; the dialog is then a sheet of its pages
+    Status, // a status line
+    Group,  // a frame with a title; the controls whose parent it is go inside, in their own grid
+    Page,   // a page of a property sheet; the dialog is then a sheet of its pages
+    Drawing // the graphic view of a GéoBase: the form's Scene(), the elements of `selection` shown
+            // selected with their sightings; a click on a point or a station selects its element
 };
 
 // The parent of the buttons that close the dialog, set in a row at its foot (OK, Cancel, "Fin + Listing").
@@ -42,25 +48,35 @@ struct Control {
     int id = 0; // unique in the dialog, above 2 but for OK and Cancel
     ControlKind kind = ControlKind::Label;
     std::string name{}; // a stable name in the code ("ajouterUne"): the widget's name for tests and captures
-    std::string text{}; // a label, a button, a check box, a group or page title, with "&" before its accelerator
-    int parent = 0;   // 0 the dialog itself, a Group or Page id, or kButtonRow
+    // A label, a button, a check box, a group or page title, with "&" before its accelerator.
+    std::string text{};
+    int parent = 0; // 0 the dialog itself, a Group or Page id, or kButtonRow
     int row = 0, column = 0, rowSpan = 1, columnSpan = 1; // the place in the parent's grid
-    int buddy = 0;                    // a label: the control its accelerator gives the focus to
-    bool isDefault = false;           // a button: the one Enter presses
+    int buddy = 0;                      // a label: the control its accelerator gives the focus to
+    bool isDefault = false;             // a button: the one Enter presses
     std::vector<std::string> columns{}; // a list shown as a table: the column headings
-    int width = 0;                    // an edit, a field or a list: the characters it shows at least
-    int lines = 0;                    // a list: the lines it shows at least
+    int width = 0;                      // an edit, a field or a list: the characters it shows at least
+    int lines = 0;                      // a list: the lines it shows at least
+    // A list whose lines the form gives only as they are shown (Form::Rows and Form::Row), not in its
+    // state: a table of a million lines.
+    bool onDemand = false;
+    bool multiple = false; // a list: several lines may be selected at once
 };
 
 struct ControlState {
     bool enabled = true;
     bool visible = true;
-    bool checked = false;           // a check box or a radio
-    std::string text{};             // an edit, a field, a status line; a label or button whose text changes
+    bool checked = false;             // a check box or a radio
+    std::string text{};               // an edit, a field, a status line; a label or button whose text changes
     std::vector<std::string> items{}; // the lines of a combo or a list; columns separated by '\t'
     std::vector<std::string> tips{};  // the tooltip of each line, when it has one
     std::vector<bool> checks{};       // a check list: each line checked or not
-    int current = -1;               // the line chosen or highlighted, -1 for none
+    int current = -1;                 // the line chosen or highlighted, -1 for none
+    // A list of several: the lines selected, in increasing order. A drawing: the elements selected.
+    std::vector<int> selection{};
+    // A list on demand, a drawing: changes whenever its lines, or its scene, changed and must be asked
+    // for again.
+    long revision = 0;
 };
 
 enum class EventKind {
@@ -78,6 +94,9 @@ struct Event {
     int rank = -1;
     bool on = false;
     std::string text{};
+    // Select in a list of several: every line selected, in increasing order (`rank` the current one);
+    // in a drawing: the element picked, alone (`rank` too, -1 for a click on nothing).
+    std::vector<int> ranks{};
 };
 
 class Form {
@@ -96,6 +115,13 @@ public:
     virtual ControlState State(int id) const = 0;
     // An action of the person on a control.
     virtual void Act(FrontEnd& frontEnd, int id, const Event& event) = 0;
+
+    // A list on demand: its number of lines, and the line of that rank (columns separated by '\t'),
+    // asked for as they come into view.
+    virtual int Rows(int /*id*/) const { return 0; }
+    virtual std::string Row(int /*id*/, int /*rank*/) const { return {}; }
+    // A drawing: what it shows, null for nothing. Valid until the control's revision changes.
+    virtual const GeoScene* Scene(int /*id*/) const { return nullptr; }
 
     // Set by the action that closes the dialog.
     std::optional<DialogResult> Ended() const { return m_ended; }

@@ -49,6 +49,14 @@ public:
         m_control.lines = lines;
         return *this;
     }
+    Ctl& OnDemand() {
+        m_control.onDemand = true;
+        return *this;
+    }
+    Ctl& Multiple() {
+        m_control.multiple = true;
+        return *this;
+    }
     operator Control() const { return m_control; }
 
 private:
