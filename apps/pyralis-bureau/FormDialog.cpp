@@ -230,6 +230,9 @@ QWidget* FormDialog::Make(const ui::Control& control) {
         widget = page;
         break;
     }
+    case ControlKind::Drawing:
+        widget = new QWidget;
+        break;
     }
     widget->setObjectName(control.name.empty() ? QString("c%1").arg(control.id) : Text(control.name));
     if (control.width > 0) widget->setMinimumWidth(CharactersWide(widget, control.width));
@@ -417,6 +420,7 @@ void FormDialog::Show(Shown& shown, const ui::ControlState& state) {
     case ControlKind::CheckList:
         ShowLines(shown, state);
         break;
+    case ControlKind::Drawing:
     case ControlKind::Page:
         break;
     }

@@ -57,7 +57,7 @@ struct Control {
     std::vector<std::string> columns{}; // a list shown as a table: the column headings
     int width = 0;                      // an edit, a field or a list: the characters it shows at least
     int lines = 0;                      // a list: the lines it shows at least
-    // A list whose lines the form gives only as they are shown (Form::Rows and Form::Row), not in its
+    // A list whose lines the form gives only as they are shown (OnDemandRows, OnDemandRow), not in its
     // state: a table of a million lines.
     bool onDemand = false;
     bool multiple = false; // a list: several lines may be selected at once
@@ -118,8 +118,8 @@ public:
 
     // A list on demand: its number of lines, and the line of that rank (columns separated by '\t'),
     // asked for as they come into view.
-    virtual int Rows(int /*id*/) const { return 0; }
-    virtual std::string Row(int /*id*/, int /*rank*/) const { return {}; }
+    virtual int OnDemandRows(int /*id*/) const { return 0; }
+    virtual std::string OnDemandRow(int /*id*/, int /*rank*/) const { return {}; }
     // A drawing: what it shows, null for nothing. Valid until the control's revision changes.
     virtual const GeoScene* Scene(int /*id*/) const { return nullptr; }
 
