@@ -21,7 +21,7 @@ constexpr const char* kLabelEnable = "Réactivation de l'élément # %d";
 bool CGeoDocument::Open(ui::FrontEnd& frontEnd, const std::string& path) {
     CPyrTxtWnd txt(frontEnd);
     CCarnet read;
-    if (read.Load(&txt, path, {}, 1, &frontEnd) != 1) return false;
+    if (read.Load(&txt, path, {}, 0, &frontEnd) != 1) return false;
     m_carnet = std::move(read);
     m_path = path;
     m_selection.clear();
@@ -32,14 +32,14 @@ bool CGeoDocument::Open(ui::FrontEnd& frontEnd, const std::string& path) {
 }
 
 bool CGeoDocument::Save(ui::FrontEnd& frontEnd) {
-    if (m_carnet.Save(m_path, &frontEnd, true) != 1) return false;
+    if (m_carnet.Save(m_path, &frontEnd) != 1) return false;
     m_savedState = m_history.State();
     Notify(kPartHistory);
     return true;
 }
 
 bool CGeoDocument::SaveAs(ui::FrontEnd& frontEnd, const std::string& path) {
-    if (m_carnet.Save(path, &frontEnd, true) != 1) return false;
+    if (m_carnet.Save(path, &frontEnd) != 1) return false;
     m_path = path;
     m_savedState = m_history.State();
     Notify(kPartHistory | kPartFile);

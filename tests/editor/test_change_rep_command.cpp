@@ -62,13 +62,13 @@ TEST_F(ChangeRepCommand, PointsAndV0AreChangedSavedWithABackupAndTrackedForUndo)
     EXPECT_EQ(ReadBytes(dir / "a.bak"), kJob);
     EXPECT_NE(frontEnd.AllLines().find("GéoBase enregistrée dans <" + dir / "a.geo" + ">."),
               std::string::npos);
-    // Tracked for the undo: each element changed, with the state before that the GéoBase no longer holds.
-    const pyr::ElementChanges& tracked = editor.TrackedChanges();
-    ASSERT_EQ(tracked.size(), 3u);
-    EXPECT_EQ(tracked[0].index, 0);
-    EXPECT_EQ(static_cast<const pyr::CStation&>(*tracked[0].other).v0(), 50.0);
-    EXPECT_EQ(tracked[2].index, 3);
-    EXPECT_EQ(static_cast<const pyr::CPointGen&>(*tracked[2].other).x(), -35.5);
+    // One edit of the editor's history: undone, the GéoBase is as it was, byte for byte once saved.
+    ASSERT_TRUE(editor.Document().CanUndo());
+    EXPECT_EQ(editor.Document().UndoLabel(), pyr::rep::kCaption);
+    ASSERT_TRUE(editor.Document().Undo());
+    EXPECT_TRUE(editor.Document().Modified());
+    ASSERT_TRUE(editor.Save(frontEnd));
+    EXPECT_EQ(ReadBytes(dir / "a.geo"), kJob);
 }
 
 TEST_F(ChangeRepCommand, ARefusedRequestFailsAndLeavesTheFileAsItWas) {
@@ -106,7 +106,7 @@ TEST_F(ChangeRepCommand, ASelectionChangesOnlyItsPointsAndNothingSelectedIsNotSa
     const pyr::CCarnet saved = Saved();
     EXPECT_EQ(saved.xAt(2), 10.0);
     EXPECT_NEAR(saved.xAt(3), -4.25, 1e-4);
-    EXPECT_EQ(editor.TrackedChanges().size(), 1u);
+    EXPECT_TRUE(editor.Document().CanUndo());
 
     const std::string before = ReadBytes(dir / "a.geo");
     arguments.back() = "Z1-Z9";
@@ -114,7 +114,7 @@ TEST_F(ChangeRepCommand, ASelectionChangesOnlyItsPointsAndNothingSelectedIsNotSa
     EXPECT_EQ(LastMessage(), pyr::msg::kNoChange);
     EXPECT_EQ(ReadBytes(dir / "a.geo"), before);
     // The GéoBase opened again: the change made on the former copy is no longer the undo's to take back.
-    EXPECT_TRUE(editor.TrackedChanges().empty());
+    EXPECT_FALSE(editor.Document().CanUndo());
 }
 
 // The change saves only once the former GéoBase is backed up: a backup that fails stops it.

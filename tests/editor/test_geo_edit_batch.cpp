@@ -1,0 +1,124 @@
+// The editor's edits from a command line: each one saves the GéoBase when it changed it, and a refused
+// one changes nothing and says why.
+#include "TestSupport.h"
+#include "editor/GeoEditor.h"
+#include "geobase/Carnet.h"
+#include "ui/ScriptedFrontEnd.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+
+namespace {
+
+using pyr::ui::DialogResult;
+
+// What a reader makes of sightings met before any station: a station "INCONNUE" that the surveyor
+// names afterwards, here the point 12 sighted from S2 and listed in a traverse.
+constexpr const char* kJob = "GEOBASE PYRALIS\t1\n"
+                             "1001\tINCONNUE\t1.55\t-999999\n"
+                             "1003\t101\t1.3\t10\t100\t25\n"
+                             "1003\t102\t1.3\t110\t100\t30\n"
+                             "1001\tS2\t1.6\t-999999\n"
+                             "1002\t12\t1.3\t210\t100\t40\n"
+                             "1003\t101\t1.3\t220\t100\t42\n"
+                             "1006\t101\t1000\t2000\t-999999\t-\n"
+                             "1006\t102\t1010\t2030\t-999999\t-\n"
+                             "1007\tCH1\t0\t2\tS2\tINCONNUE\n";
+
+class EditBatch : public ::testing::Test {
+protected:
+    EditBatch() { WriteBytes(dir / "a.geo", kJob); }
+    DialogResult Run(std::vector<std::string> arguments) {
+        pyr::CGeoEditor editor;
+        editor.SetInputs({"", dir / "Pyralis.ini", "", "éditeur de GéoBases"});
+        frontEnd.dialogArguments = std::move(arguments);
+        frontEnd.dialogArguments.insert(frontEnd.dialogArguments.begin(), dir / "a.geo");
+        frontEnd.lines.clear();
+        return frontEnd.DoModal(editor);
+    }
+    std::string Saved() const { return ReadBytes(dir / "a.geo"); }
+
+    TempDir dir;
+    pyr::ui::ScriptedFrontEnd frontEnd;
+};
+
+} // namespace
+
+TEST_F(EditBatch, RenamingTheUnknownStationFollowsItsSightingsAndTraverses) {
+    ASSERT_EQ(Run({"--renommer", "INCONNUE=12"}), DialogResult::Ok);
+    EXPECT_EQ(Saved(), "GEOBASE PYRALIS\t1\n"
+                       "1001\t12\t1.55\t-999999\n"
+                       "1003\t101\t1.3\t10\t100\t25\n"
+                       "1003\t102\t1.3\t110\t100\t30\n"
+                       "1001\tS2\t1.6\t-999999\n"
+                       "1002\t12\t1.3\t210\t100\t40\n"
+                       "1003\t101\t1.3\t220\t100\t42\n"
+                       "1006\t101\t1000\t2000\t-999999\t-\n"
+                       "1006\t102\t1010\t2030\t-999999\t-\n"
+                       "1007\tCH1\t0\t2\tS2\t12\n");
+    EXPECT_EQ(ReadBytes(dir / "a.bak"), kJob);
+    // The station and the traverse: the sighting of 12 from S2 bore the name already.
+    EXPECT_NE(frontEnd.AllLines().find("Station <INCONNUE> renommée <12> : 2 élément(s) modifié(s)."),
+              std::string::npos)
+        << frontEnd.AllLines();
+}
+
+TEST_F(EditBatch, RenumberingAndRemovingPointsSaveOnce) {
+    ASSERT_EQ(Run({"--renumeroter", "--selection", "101-102", "--decalage", "100", "--prefixe", "P"}),
+              DialogResult::Ok);
+    std::string expected = kJob;
+    for (const auto& [from, to] : {std::pair{"\t101\t", "\tP201\t"}, {"\t102\t", "\tP202\t"}})
+        for (std::size_t at = expected.find(from); at != std::string::npos; at = expected.find(from, at))
+            expected.replace(at, std::string(from).size(), to);
+    EXPECT_EQ(Saved(), expected);
+
+    // The point P201 removed: its sightings stay.
+    ASSERT_EQ(Run({"--supprimer", "P201"}), DialogResult::Ok);
+    pyr::CCarnet saved;
+    ASSERT_TRUE(saved.Load(nullptr, dir / "a.geo"));
+    EXPECT_EQ(saved.GetSize(), 8);
+    EXPECT_EQ(saved.findMat("P201"), -1);
+    EXPECT_EQ(saved.Find(pyr::kKindMesure, "P201"), 1);
+}
+
+TEST_F(EditBatch, ARefusedEditChangesNothingAndSaysWhy) {
+    const struct {
+        std::vector<std::string> arguments;
+        std::string message;
+    } cases[] = {
+        {{"--renommer", "S7=S8"}, "La station <S7> n'existe pas dans la GéoBase."},
+        {{"--renommer", "INCONNUE=S2"},
+         "La station <S2> existe déjà : le changement de nom de la station est refusé."},
+        {{"--renumeroter", "--selection", "101", "--decalage", "1"},
+         "Le point <102> existe déjà : la renumérotation est refusée."},
+        {{"--supprimer", "P9-P1"}, "La liste de sélection des points n'est pas correcte !"},
+    };
+    for (const auto& [arguments, message] : cases) {
+        SCOPED_TRACE(arguments.front() + " " + arguments[1]);
+        frontEnd.messages.clear();
+        EXPECT_EQ(Run(arguments), DialogResult::Failed);
+        ASSERT_FALSE(frontEnd.messages.empty());
+        EXPECT_EQ(frontEnd.messages.front().text.find(message), 0u) << frontEnd.messages.front().text;
+        EXPECT_EQ(Saved(), kJob);
+    }
+    // An option that cannot be read: the command does not run.
+    frontEnd.messages.clear();
+    EXPECT_EQ(Run({"--renommer", "INCONNUE"}), DialogResult::Failed);
+    ASSERT_FALSE(frontEnd.messages.empty());
+    EXPECT_NE(frontEnd.messages.back().text.find("n'est pas de la forme ANCIEN=NOUVEAU"), std::string::npos);
+    // Nothing to remove: nothing saved.
+    EXPECT_EQ(Run({"--supprimer", "Z1"}), DialogResult::Failed);
+    EXPECT_FALSE(std::filesystem::exists(dir / "a.bak"));
+}
+
+TEST_F(EditBatch, TheSearchListsWhatItFindsWithoutSaving) {
+    ASSERT_EQ(Run({"--chercher", "101", "--genre", "Mesure"}), DialogResult::Ok);
+    ASSERT_EQ(frontEnd.lines.size(), 3u);
+    EXPECT_EQ(frontEnd.lines[0], "2 élément(s) trouvé(s).");
+    EXPECT_EQ(frontEnd.lines[1], "000002  Mesure        101  1.3  10  100  25");
+    ASSERT_EQ(Run({"--chercher", "--genre", "1006", "--valeur", "y>2010"}), DialogResult::Ok);
+    ASSERT_EQ(frontEnd.lines.size(), 2u);
+    EXPECT_EQ(frontEnd.lines[1], "000008  Point         102  1010  2030  -999999  -");
+    EXPECT_EQ(Run({"--chercher", "--valeur", "y~2010"}), DialogResult::Failed);
+    EXPECT_FALSE(std::filesystem::exists(dir / "a.bak"));
+}
