@@ -233,7 +233,9 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
             txt.PrintText(EditorLine(Carnet(), index));
     }
     if (m_export) return ExportPoints(frontEnd, false);
-    if (m_reading || m_reduce || m_changeFrame || m_batch.Edits() || m_batch.search) return result;
+    // After a reduction or a change of frame, the GéoBase is shown as it now stands; the edits say
+    // what they did, the search shows what it found.
+    if (m_reading || m_batch.Edits() || m_batch.search) return result;
     txt.Print(kOpened, path->c_str(), Carnet().GetSize());
     for (int i = 0; i < Carnet().GetSize(); ++i)
         txt.PrintText(EditorLine(Carnet(), i));
