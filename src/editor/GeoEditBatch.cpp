@@ -49,6 +49,9 @@ constexpr const char* kValueHelp = "la valeur cherchée : CHAMP=NOMBRE, CHAMP<NO
 constexpr const char* kValueForm =
     "--valeur : « %s » n'est pas de la forme CHAMP=NOMBRE, CHAMP<NOMBRE ou CHAMP>NOMBRE.";
 constexpr const char* kFound = "%d élément(s) trouvé(s).";
+constexpr const char* kProjectionHelp =
+    "convertit les points de la projection du chantier (options, corrections) dans la projection NOM";
+constexpr const char* kProjectionFromHelp = "la projection de départ, au lieu de celle des options";
 
 bool ParseWhole(std::string_view text, long long& value) {
     const char* end = text.data() + text.size();
@@ -83,7 +86,6 @@ std::optional<ValueCriterion> ValueNamed(std::string_view text) {
 }
 
 } // namespace
-
 
 void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
     BatchEdits& batch = m_batch;
@@ -172,6 +174,14 @@ void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
             return std::string();
         },
         true);
+    options.Value("changement-projection", "NOM", kProjectionHelp, [&batch](const std::string& value) {
+        batch.projection = value;
+        return std::string();
+    });
+    options.Value("projection-depart", "NOM", kProjectionFromHelp, [&batch](const std::string& value) {
+        batch.projectionFrom = value;
+        return std::string();
+    });
     options.Value("valeur", "CHAMP=NOMBRE", kValueHelp, [&batch](const std::string& value) {
         const std::optional<ValueCriterion> criterion = ValueNamed(value);
         if (!criterion) return Sprintf(kValueForm, value.c_str());
@@ -218,6 +228,8 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
     if (m_reduce && !ReduceStations(txt, frontEnd, false)) return ui::DialogResult::Failed;
     if (m_changeFrame && ChangeFrame(txt, frontEnd, false) == ui::DialogResult::Failed)
         return ui::DialogResult::Failed;
+    if (m_batch.projection && !ChangeProjection(frontEnd, *m_batch.projection, m_batch.projectionFrom))
+        return ui::DialogResult::Failed;
     if (m_reading) {
         const ui::DialogResult read = ReadFieldBook(*m_reading, txt, frontEnd, false);
         if (read != ui::DialogResult::Ok) return read;
@@ -235,7 +247,7 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
     if (m_export) return ExportPoints(frontEnd, false);
     // After a reduction or a change of frame, the GéoBase is shown as it now stands; the edits say
     // what they did, the search shows what it found.
-    if (m_reading || m_batch.Edits() || m_batch.search) return result;
+    if (m_reading || m_batch.Edits() || m_batch.search || m_batch.projection) return result;
     txt.Print(kOpened, path->c_str(), Carnet().GetSize());
     for (int i = 0; i < Carnet().GetSize(); ++i)
         txt.PrintText(EditorLine(Carnet(), i));

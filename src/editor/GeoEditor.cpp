@@ -12,6 +12,7 @@
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/GeoFile.h"
 #include "geobase/Selection.h"
+#include "settings/CalcOptions.h"
 #include "settings/LastGeoBase.h"
 #include "settings/ParamStore.h"
 #include "ui/FrontEnd.h"
@@ -32,6 +33,8 @@ constexpr const char* kUnnumbered = "Le point <%s> n'a pas de numéro : il garde
 constexpr const char* kRenumbered = "%d point(s) renuméroté(s).";
 constexpr const char* kRenamed = "Station <%s> renommée <%s> : %d élément(s) modifié(s).";
 constexpr const char* kNoPointRemoved = "Aucun point de la sélection dans la GéoBase.";
+constexpr const char* kLabelProjection = "Changement de projection de %s en %s";
+constexpr const char* kProjected = "%d point(s) convertis de %s en %s.";
 constexpr const char* kPointsRemoved = "%d point(s) supprimé(s) ; les visées sur ces points sont gardées.";
 
 // The code table the editor holds for a GéoBase: the one it goes with, else the job's table of the
@@ -335,6 +338,28 @@ int CGeoEditor::SearchNext(ui::FrontEnd& frontEnd, const SearchCriteria& criteri
 }
 
 // ---------------------------------------------------------------- the dialogs of the menus
+
+std::string CGeoEditor::JobProjection() const {
+    std::string projection;
+    ReadParamString(Inputs().paramPath, kSectionCorrections, "Projection", "Aucune", projection);
+    return projection;
+}
+
+bool CGeoEditor::ChangeProjection(ui::FrontEnd& frontEnd, const std::string& to, std::string from) {
+    if (m_current < 0) return false;
+    if (from.empty()) from = JobProjection();
+    CCarnet& carnet = Document().Store();
+    // The points as they are, for the undo: the conversion changes their planimetry in place.
+    ElementChanges before{LargeBlocks()};
+    for (int index = carnet.Find(kKindPoint, ""); index >= 0; index = carnet.Find(kKindPoint, "", index + 1))
+        if (carnet.hasXY(index)) before.push_back({index, carnet.copyElement(index)});
+    if (!carnet.Projection(from, to, &frontEnd)) return false;
+    const int count = static_cast<int>(before.size());
+    Document().RecordChanges(Sprintf(kLabelProjection, from.c_str(), to.c_str()), std::move(before));
+    CPyrTxtWnd txt(frontEnd);
+    txt.Print(kProjected, count, from.c_str(), to.c_str());
+    return SaveAfterDialog(txt, frontEnd);
+}
 
 bool CGeoEditor::SaveAfterDialog(CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
     const std::string path = Carnet().PathName();

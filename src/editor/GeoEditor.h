@@ -110,6 +110,12 @@ public:
     ui::DialogResult ReadFieldBook(ui::FrontEnd& frontEnd, FieldBookFormat format);
     // "&Exportation de points...": the export dialog, run by the front end on the current GéoBase.
     ui::DialogResult ExportPoints(ui::FrontEnd& frontEnd);
+    // The change of projection: every point with a planimetry converted from the projection of the job
+    // ("Projection" of the options' corrections, or `from` when given) into `to`, all or none, then
+    // saved; one edit of the history. False when refused (said why) or not saved.
+    bool ChangeProjection(ui::FrontEnd& frontEnd, const std::string& to, std::string from = {});
+    // The projection the job's options give.
+    std::string JobProjection() const;
 
 private:
     struct Reading {
@@ -123,7 +129,9 @@ private:
         RenumberRequest renumbering;
         std::optional<std::string> remove;
         std::optional<SearchCriteria> search;
-        SearchCriteria criteria; // --code, --genre, --valeur: given before or after --chercher
+        SearchCriteria criteria;               // --code, --genre, --valeur: given before or after --chercher
+        std::optional<std::string> projection; // --projection, and its --projection-depart
+        std::string projectionFrom;
 
         bool Edits() const { return !renames.empty() || renumber || remove; }
     };

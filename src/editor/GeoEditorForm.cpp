@@ -4,6 +4,7 @@
 #include "core/Strings.h"
 #include "fieldbook/FieldBookFormats.h"
 #include "geobase/Kinds.h"
+#include "projection/ProjectionNames.h"
 #include "ui/FormControls.h"
 #include "ui/FrontEnd.h"
 
@@ -186,6 +187,15 @@ std::vector<ui::Control> CGeoEditorForm::Controls() const {
                            .Buddy(kFormat));
     controls.push_back(Ctl(kFormat, ControlKind::Combo, "format").In(kMenuGroup).At(1, 1));
     controls.push_back(Ctl(kRead, ControlKind::Button, "lecture", "&Lecture").In(kMenuGroup).At(1, 2));
+    controls.push_back(Ctl(kProjectionLabel, ControlKind::Label, "projectionLabel", "Pro&jection d'arrivée :")
+                           .In(kMenuGroup)
+                           .At(2, 0)
+                           .Buddy(kProjection));
+    controls.push_back(Ctl(kProjection, ControlKind::Combo, "projection").In(kMenuGroup).At(2, 1));
+    controls.push_back(
+        Ctl(kChangeProjection, ControlKind::Button, "changementProjection", "Changement de &projection")
+            .In(kMenuGroup)
+            .At(2, 2));
 
     controls.push_back(Ctl(kStatus, ControlKind::Status, "etat").At(5, 0, 1, 8));
     ui::Control close = Ctl(ui::kIdCancel, ControlKind::Button, "fermer", "&Fermer");
@@ -303,7 +313,8 @@ ui::ControlState CGeoEditorForm::State(int id) const {
     case kDocuments:
         for (int rank = 0; rank < m_editor.DocumentCount(); ++rank) {
             const CGeoDocument& each = m_editor.DocumentAt(rank);
-            state.items.push_back(std::filesystem::path(each.Path()).filename().string() + (each.Modified() ? " *" : ""));
+            state.items.push_back(std::filesystem::path(each.Path()).filename().string() +
+                                  (each.Modified() ? " *" : ""));
             state.tips.push_back(each.Path());
         }
         state.current = m_editor.CurrentDocument();
@@ -391,6 +402,14 @@ ui::ControlState CGeoEditorForm::State(int id) const {
         state.current = m_format;
         break;
     case kRead:
+        break;
+    case kProjection:
+        for (const NamedProjection& projection : OfferedProjections())
+            state.items.emplace_back(projection.name);
+        state.current = m_projection;
+        break;
+    case kChangeProjection:
+        state.enabled = open;
         break;
     case kStatus:
         state.text = !m_said.empty() ? m_said
@@ -579,6 +598,15 @@ void CGeoEditorForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event)
         break;
     case kRead:
         m_editor.ReadFieldBook(frontEnd, FieldBookFormats()[static_cast<std::size_t>(m_format)].format);
+        break;
+    case kProjection:
+        if (event.kind == ui::EventKind::Select && event.rank >= 0 &&
+            event.rank < static_cast<int>(OfferedProjections().size()))
+            m_projection = event.rank;
+        break;
+    case kChangeProjection:
+        m_editor.ChangeProjection(frontEnd,
+                                  OfferedProjections()[static_cast<std::size_t>(m_projection)].name);
         break;
     case ui::kIdCancel:
         if (m_editor.CanCloseAll(frontEnd)) End(ui::DialogResult::Ok);

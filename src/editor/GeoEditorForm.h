@@ -75,6 +75,9 @@ public:
         kFormatLabel,
         kFormat,
         kRead,
+        kProjectionLabel,
+        kProjection,
+        kChangeProjection,
         kElements, // the tables, one per view, the view shown the only one seen
     };
 
@@ -118,8 +121,9 @@ private:
     int m_searchKind = 0;
     std::string m_renumberPoints, m_renumberOffset, m_renumberPrefix;
     std::string m_renameFrom, m_renameTo;
-    int m_format = 0;   // the format of the next reading, in the order of the reading menu
-    std::string m_said; // the last result said in the status line
+    int m_format = 0;     // the format of the next reading, in the order of the reading menu
+    int m_projection = 0; // the projection into which the points are converted, among those offered
+    std::string m_said;   // the last result said in the status line
 };
 
 } // namespace pyr

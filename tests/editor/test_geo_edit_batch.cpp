@@ -122,3 +122,41 @@ TEST_F(EditBatch, TheSearchListsWhatItFindsWithoutSaving) {
     EXPECT_EQ(Run({"--chercher", "--valeur", "y~2010"}), DialogResult::Failed);
     EXPECT_FALSE(std::filesystem::exists(dir / "a.bak"));
 }
+
+// The change of projection of the job: from the projection its options give into the one named, every
+// point at once. Lambert-93's origin (3°E, 46°30'N) stands at (700 000, 6 600 000) there and at
+// (1 700 000, 5 255 574.0521) in CC46. Undone, the GéoBase is the file it was.
+TEST_F(EditBatch, TheChangeOfProjectionConvertsEveryPointAndIsUndone) {
+    const std::string job = "GEOBASE PYRALIS\t1\n"
+                            "1001\tS1\t1.55\t-999999\n"
+                            "1006\tO\t700000\t6600000\t312.5\tXY\n"
+                            "1006\tZ\t-999999\t-999999\t12\t-\n";
+    WriteBytes(dir / "a.geo", job);
+    WriteBytes(dir / "Pyralis.ini", "[Options_Corrections]\nProjection=Lambert 93\n");
+    ASSERT_EQ(Run({"--changement-projection", "CC46"}), DialogResult::Ok) << frontEnd.AllLines();
+    EXPECT_EQ(Saved(), "GEOBASE PYRALIS\t1\n"
+                       "1001\tS1\t1.55\t-999999\n"
+                       "1006\tO\t1700000\t5255574.0521\t312.5\tXY\n"
+                       "1006\tZ\t-999999\t-999999\t12\t-\n");
+    EXPECT_NE(frontEnd.AllLines().find("1 point(s) convertis de Lambert 93 en CC46."), std::string::npos);
+
+    pyr::CGeoEditor editor;
+    editor.SetInputs({"", dir / "Pyralis.ini", "", "éditeur de GéoBases"});
+    editor.SetGeoBase(dir / "a.geo");
+    ASSERT_EQ(editor.OpenGeoBase(frontEnd), DialogResult::Ok);
+    ASSERT_TRUE(editor.ChangeProjection(frontEnd, "Lambert 93", "CC46"));
+    EXPECT_EQ(Saved(), job);
+    ASSERT_TRUE(editor.Document().Undo());
+    ASSERT_TRUE(editor.Save(frontEnd));
+    EXPECT_NE(Saved(), job);
+    EXPECT_NE(Saved().find("1700000\t5255574.0521"), std::string::npos);
+
+    // Local coordinates are not converted: refused, nothing changed.
+    WriteBytes(dir / "Pyralis.ini", "[Options_Corrections]\nProjection=Aucune\n");
+    const std::string before = Saved();
+    frontEnd.messages.clear();
+    EXPECT_EQ(Run({"--changement-projection", "CC46"}), DialogResult::Failed);
+    ASSERT_FALSE(frontEnd.messages.empty());
+    EXPECT_EQ(frontEnd.messages.back().text.find("Changement de projection impossible"), 0u);
+    EXPECT_EQ(Saved(), before);
+}
