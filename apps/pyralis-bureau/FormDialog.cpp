@@ -1,5 +1,8 @@
 #include "FormDialog.h"
 
+#include "GeoView.h"
+#include "OnDemandTableModel.h"
+
 #include <QButtonGroup>
 #include <QCheckBox>
 #include <QComboBox>
@@ -8,6 +11,7 @@
 #include <QGroupBox>
 #include <QHBoxLayout>
 #include <QHeaderView>
+#include <QItemSelectionModel>
 #include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
@@ -15,10 +19,15 @@
 #include <QPushButton>
 #include <QRadioButton>
 #include <QSignalBlocker>
+#include <QStyle>
 #include <QTabWidget>
+#include <QTableView>
 #include <QTimer>
 #include <QTreeWidget>
 #include <QVBoxLayout>
+#include <algorithm>
+#include <set>
+#include <utility>
 
 namespace pyr::bureau {
 
@@ -57,6 +66,74 @@ void SetRows(QTreeWidget* table, const std::vector<std::string>& items,
     table->addTopLevelItems(rows);
     for (int column = 0; column < table->columnCount(); ++column)
         table->resizeColumnToContents(column);
+}
+
+// A drawing's least size, in pixels: room for a few stations and their names.
+constexpr int kDrawingWidth = 360;
+constexpr int kDrawingHeight = 240;
+// A list on demand sizes its columns on this many lines, not on its million.
+constexpr int kRowsMeasured = 50;
+
+// The lines selected, as runs of consecutive ranks (first, last): a million lines selected are one run,
+// and the view's selection compares with the form's without listing either.
+using Runs = std::vector<std::pair<int, int>>;
+
+Runs Merged(Runs runs) {
+    std::sort(runs.begin(), runs.end());
+    Runs merged;
+    for (const auto& [first, last] : runs) {
+        if (!merged.empty() && first <= merged.back().second + 1)
+            merged.back().second = std::max(merged.back().second, last);
+        else
+            merged.emplace_back(first, last);
+    }
+    return merged;
+}
+
+Runs RunsOf(const std::vector<int>& ranks) {
+    Runs runs;
+    for (int rank : ranks) {
+        if (rank < 0) continue;
+        if (!runs.empty() && rank == runs.back().second + 1)
+            runs.back().second = rank;
+        else
+            runs.emplace_back(rank, rank);
+    }
+    return std::is_sorted(ranks.begin(), ranks.end()) ? runs : Merged(std::move(runs));
+}
+
+// The rows a view has selected; its ranges may touch or overlap, after a line added with Ctrl.
+Runs SelectedRuns(const QItemSelectionModel& model) {
+    Runs runs;
+    for (const QItemSelectionRange& range : model.selection())
+        if (!range.parent().isValid()) runs.emplace_back(range.top(), range.bottom());
+    return Merged(std::move(runs));
+}
+
+std::vector<int> RanksOf(const Runs& runs) {
+    std::vector<int> ranks;
+    for (const auto& [first, last] : runs)
+        for (int rank = first; rank <= last; ++rank)
+            ranks.push_back(rank);
+    return ranks;
+}
+
+// Widens the columns of a table on demand to their headings and the first lines, never narrows them: the
+// columns do not jump as the lines change. The last column takes what remains.
+void FitColumns(QTableView& table) {
+    const QAbstractItemModel& lines = *table.model();
+    const QFontMetrics metrics(table.font());
+    const int rows = std::min(lines.rowCount(), kRowsMeasured);
+    // The room a cell's text takes in the view: its margins and the focus frame's.
+    const int margins =
+        2 * (table.style()->pixelMetric(QStyle::PM_FocusFrameHMargin, nullptr, &table) + 1) + 6;
+    for (int column = 0; column + 1 < lines.columnCount(); ++column) {
+        int wanted = table.horizontalHeader()->sectionSizeHint(column);
+        for (int row = 0; row < rows; ++row)
+            wanted = std::max(wanted, metrics.horizontalAdvance(lines.index(row, column).data().toString()) +
+                                          margins);
+        if (wanted > table.columnWidth(column)) table.setColumnWidth(column, wanted);
+    }
 }
 
 } // namespace
@@ -122,9 +199,36 @@ void FormDialog::Build() {
     for (const ui::Control& control : controls) {
         QWidget* widget = Make(control);
         m_byId[control.id] = m_controls.size();
-        m_controls.push_back({control, widget, {}, {}});
+        m_controls.push_back({control, widget, {}, {}, {}});
         Place(control, widget);
     }
+    // A list on demand and a drawing take the room the dialog gains, with the groups that hold them.
+    std::set<QGridLayout*> stretched;
+    bool bodyStretches = false, pagesStretch = false;
+    for (const Shown& shown : m_controls) {
+        const ui::Control* control = &shown.control;
+        const bool stretches = control->kind == ControlKind::Drawing ||
+                               (control->kind == ControlKind::List && control->onDemand);
+        while (stretches && control->parent != ui::kButtonRow) {
+            QGridLayout* parentGrid = GridOf(control->parent);
+            parentGrid->setRowStretch(control->row, 1);
+            parentGrid->setColumnStretch(control->column, 1);
+            stretched.insert(parentGrid);
+            const auto holder = m_byId.find(control->parent);
+            if (control->parent == 0 || holder == m_byId.end()) {
+                bodyStretches = true;
+                break;
+            }
+            control = &m_controls[holder->second].control;
+            if (control->kind == ControlKind::Page) {
+                pagesStretch = true;
+                break;
+            }
+        }
+    }
+    if (bodyStretches) layout->setStretchFactor(body, 1);
+    if (pagesStretch) layout->setStretchFactor(m_pages, 1);
+
     for (Shown& shown : m_controls) {
         if (shown.control.kind == ControlKind::Label && shown.control.buddy != 0)
             if (QWidget* buddy = Widget(shown.control.buddy)) {
@@ -137,9 +241,9 @@ void FormDialog::Build() {
             }
         Connect(shown);
     }
-    // Nothing stretched into empty space: the grids keep their rows together at the top.
+    // Nothing else stretched into empty space: the grids keep their rows together at the top.
     for (const auto& [parent, parentGrid] : m_grids)
-        parentGrid->setRowStretch(parentGrid->rowCount(), 1);
+        if (!stretched.contains(parentGrid)) parentGrid->setRowStretch(parentGrid->rowCount(), 1);
     if (body->layout()->isEmpty()) body->hide();
 }
 
@@ -181,7 +285,36 @@ QWidget* FormDialog::Make(const ui::Control& control) {
         break;
     }
     case ControlKind::List:
-        if (!control.columns.empty()) {
+        if (control.onDemand) {
+            // No widget and no stored height per line: the view asks the model for the lines it draws,
+            // and finds a line's place by its rank alone.
+            auto* table = new QTableView;
+            QStringList headings;
+            for (const std::string& column : control.columns)
+                headings << Text(column);
+            if (headings.isEmpty()) {
+                headings << QString();
+                table->horizontalHeader()->hide();
+            }
+            table->setModel(new OnDemandTableModel(m_form, control.id, headings, table));
+            table->setSelectionBehavior(QAbstractItemView::SelectRows);
+            table->setSelectionMode(control.multiple ? QAbstractItemView::ExtendedSelection
+                                                     : QAbstractItemView::SingleSelection);
+            table->setShowGrid(false);
+            table->setAlternatingRowColors(true);
+            table->setWordWrap(false);
+            table->setCornerButtonEnabled(false);
+            table->setHorizontalScrollMode(QAbstractItemView::ScrollPerPixel);
+            QHeaderView* rows = table->verticalHeader();
+            rows->setSectionResizeMode(QHeaderView::Fixed);
+            rows->setDefaultSectionSize(QFontMetrics(table->font()).height() + 4);
+            rows->hide();
+            QHeaderView* columns = table->horizontalHeader();
+            columns->setDefaultAlignment(Qt::AlignLeft | Qt::AlignVCenter);
+            columns->setHighlightSections(false);
+            columns->setStretchLastSection(true);
+            widget = table;
+        } else if (!control.columns.empty()) {
             auto* table = new QTreeWidget;
             QStringList headings;
             for (const std::string& column : control.columns)
@@ -193,10 +326,12 @@ QWidget* FormDialog::Make(const ui::Control& control) {
             table->setRootIsDecorated(false);
             table->setUniformRowHeights(true);
             table->setAlternatingRowColors(true);
+            if (control.multiple) table->setSelectionMode(QAbstractItemView::ExtendedSelection);
             widget = table;
         } else {
             auto* list = new QListWidget;
             list->setUniformItemSizes(true);
+            if (control.multiple) list->setSelectionMode(QAbstractItemView::ExtendedSelection);
             widget = list;
         }
         break;
@@ -230,9 +365,13 @@ QWidget* FormDialog::Make(const ui::Control& control) {
         widget = page;
         break;
     }
-    case ControlKind::Drawing:
-        widget = new QWidget;
+    case ControlKind::Drawing: {
+        auto* view = new GeoView;
+        view->setMinimumSize(kDrawingWidth, kDrawingHeight);
+        view->setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Expanding);
+        widget = view;
         break;
+    }
     }
     widget->setObjectName(control.name.empty() ? QString("c%1").arg(control.id) : Text(control.name));
     if (control.width > 0) widget->setMinimumWidth(CharactersWide(widget, control.width));
@@ -291,18 +430,40 @@ void FormDialog::Connect(Shown& shown) {
         break;
     }
     case ControlKind::List:
-        if (auto* table = qobject_cast<QTreeWidget*>(widget)) {
-            connect(table, &QTreeWidget::currentItemChanged, this, [this, id, table](QTreeWidgetItem* item) {
-                if (!m_refreshing) Act(id, {EventKind::Select, table->indexOfTopLevelItem(item), false, {}});
+        if (shown.control.multiple) {
+            // Each change of the lines selected sends them all, the current line as the rank.
+            auto* view = static_cast<QAbstractItemView*>(widget);
+            connect(view->selectionModel(), &QItemSelectionModel::selectionChanged, this, [this, id, view] {
+                if (m_refreshing) return;
+                std::vector<int> ranks = RanksOf(SelectedRuns(*view->selectionModel()));
+                Act(id, {EventKind::Select, view->currentIndex().row(), false, {}, std::move(ranks)});
             });
+        }
+        if (auto* table = qobject_cast<QTableView*>(widget)) {
+            if (!shown.control.multiple)
+                connect(table->selectionModel(), &QItemSelectionModel::currentRowChanged, this,
+                        [this, id](const QModelIndex& current) {
+                            if (!m_refreshing) Act(id, {EventKind::Select, current.row(), false, {}});
+                        });
+            connect(table, &QTableView::doubleClicked, this, [this, id](const QModelIndex& index) {
+                Act(id, {EventKind::Activate, index.row(), false, {}});
+            });
+        } else if (auto* table = qobject_cast<QTreeWidget*>(widget)) {
+            if (!shown.control.multiple)
+                connect(table, &QTreeWidget::currentItemChanged, this,
+                        [this, id, table](QTreeWidgetItem* item) {
+                            if (!m_refreshing)
+                                Act(id, {EventKind::Select, table->indexOfTopLevelItem(item), false, {}});
+                        });
             connect(table, &QTreeWidget::itemDoubleClicked, this, [this, id, table](QTreeWidgetItem* item) {
                 Act(id, {EventKind::Activate, table->indexOfTopLevelItem(item), false, {}});
             });
         } else {
             auto* list = static_cast<QListWidget*>(widget);
-            connect(list, &QListWidget::currentRowChanged, this, [this, id](int rank) {
-                if (!m_refreshing) Act(id, {EventKind::Select, rank, false, {}});
-            });
+            if (!shown.control.multiple)
+                connect(list, &QListWidget::currentRowChanged, this, [this, id](int rank) {
+                    if (!m_refreshing) Act(id, {EventKind::Select, rank, false, {}});
+                });
             connect(list, &QListWidget::itemDoubleClicked, this, [this, id, list](QListWidgetItem* item) {
                 Act(id, {EventKind::Activate, list->row(item), false, {}});
             });
@@ -322,6 +483,15 @@ void FormDialog::Connect(Shown& shown) {
     case ControlKind::Button:
         connect(static_cast<QPushButton*>(widget), &QPushButton::clicked, this, [this, id] {
             Act(id, {EventKind::Click, -1, false, {}});
+        });
+        break;
+    case ControlKind::Drawing:
+        // A click on nothing chooses nothing.
+        connect(static_cast<GeoView*>(widget), &GeoView::ElementPicked, this, [this, id](int element) {
+            if (m_refreshing) return;
+            std::vector<int> ranks;
+            if (element >= 0) ranks.push_back(element);
+            Act(id, {EventKind::Select, element, false, {}, std::move(ranks)});
         });
         break;
     default:
@@ -414,13 +584,20 @@ void FormDialog::Show(Shown& shown, const ui::ControlState& state) {
     case ControlKind::Group:
         if (!state.text.empty()) static_cast<QGroupBox*>(widget)->setTitle(text);
         break;
+    case ControlKind::List:
+        if (control.onDemand)
+            ShowOnDemand(shown, state);
+        else
+            ShowLines(shown, state);
+        break;
     case ControlKind::Combo:
     case ControlKind::EditCombo:
-    case ControlKind::List:
     case ControlKind::CheckList:
         ShowLines(shown, state);
         break;
     case ControlKind::Drawing:
+        ShowDrawing(shown, state);
+        break;
     case ControlKind::Page:
         break;
     }
@@ -462,8 +639,62 @@ void FormDialog::ShowLines(Shown& shown, const ui::ControlState& state) {
         if (list->currentRow() != state.current) list->setCurrentRow(state.current);
         if (state.current < 0) list->clearSelection();
     }
+    if (shown.control.multiple)
+        if (auto* view = qobject_cast<QAbstractItemView*>(shown.widget))
+            ShowSelection(*view, state.selection);
     shown.items = state.items;
     shown.tips = state.tips;
+}
+
+void FormDialog::ShowSelection(QAbstractItemView& view, const std::vector<int>& ranks) {
+    QItemSelectionModel& model = *view.selectionModel();
+    const QAbstractItemModel& lines = *model.model();
+    const int rows = lines.rowCount();
+    Runs wanted = RunsOf(ranks);
+    // Lines beyond the list's end are not there to select.
+    while (!wanted.empty() && wanted.back().first >= rows)
+        wanted.pop_back();
+    if (!wanted.empty()) wanted.back().second = std::min(wanted.back().second, rows - 1);
+    if (wanted == SelectedRuns(model)) return;
+    QItemSelection selection;
+    for (const auto& [first, last] : wanted)
+        selection.select(lines.index(first, 0), lines.index(last, 0));
+    model.select(selection, QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
+}
+
+void FormDialog::ShowOnDemand(Shown& shown, const ui::ControlState& state) {
+    auto& table = static_cast<QTableView&>(*shown.widget);
+    auto& lines = static_cast<OnDemandTableModel&>(*table.model());
+    if (lines.Update(state.revision)) FitColumns(table);
+    QItemSelectionModel& selection = *table.selectionModel();
+    const bool multiple = shown.control.multiple;
+    const int current = state.current < lines.rowCount() ? state.current : -1;
+    // The current line set by the form is brought into view; one the person chose is there already.
+    if (table.currentIndex().row() != current) {
+        if (current < 0) {
+            selection.clearCurrentIndex();
+            if (!multiple) selection.clearSelection();
+        } else {
+            const QModelIndex index = lines.index(current, 0);
+            selection.setCurrentIndex(index, multiple ? QItemSelectionModel::NoUpdate
+                                                      : QItemSelectionModel::ClearAndSelect |
+                                                            QItemSelectionModel::Rows);
+            table.scrollTo(index);
+        }
+    }
+    if (multiple) ShowSelection(table, state.selection);
+}
+
+void FormDialog::ShowDrawing(Shown& shown, const ui::ControlState& state) {
+    auto& view = static_cast<GeoView&>(*shown.widget);
+    if (shown.revision != state.revision) {
+        shown.revision = state.revision;
+        if (const GeoScene* scene = m_form.Scene(shown.control.id))
+            view.ShowScene(*scene);
+        else
+            view.Clear();
+    }
+    view.SetSelectedElements(state.selection);
 }
 
 } // namespace pyr::bureau

@@ -4,9 +4,11 @@
 
 #include <QDialog>
 #include <map>
+#include <optional>
 #include <string>
 #include <vector>
 
+class QAbstractItemView;
 class QButtonGroup;
 class QHBoxLayout;
 class QGridLayout;
@@ -18,6 +20,10 @@ namespace pyr::bureau {
 // a sheet, the closing buttons in a row at its foot. It shows the controls' states again after every
 // action and every change notice of the model, and sends the person's actions to the form; the form
 // decides when it closes.
+//
+// A list on demand is a table view over a model that asks the form for the lines it draws; it and a
+// drawing take the room that the dialog gains when it is enlarged, where other dialogs keep their
+// controls together at the top.
 class FormDialog : public QDialog {
     Q_OBJECT
 public:
@@ -41,6 +47,7 @@ private:
         QWidget* widget = nullptr;
         std::vector<std::string> items; // the lines shown, to rebuild a list only when they change
         std::vector<std::string> tips;
+        std::optional<long> revision; // a list on demand, a drawing: the revision shown
     };
 
     void Build();
@@ -49,6 +56,10 @@ private:
     void Place(const ui::Control& control, QWidget* widget);
     void Show(Shown& shown, const ui::ControlState& state);
     void ShowLines(Shown& shown, const ui::ControlState& state);
+    void ShowOnDemand(Shown& shown, const ui::ControlState& state);
+    void ShowDrawing(Shown& shown, const ui::ControlState& state);
+    void ShowSelection(QAbstractItemView& view, const std::vector<int>& ranks);
+    void Stretch(const ui::Control& control);
     void Act(int id, const ui::Event& event);
     QGridLayout* GridOf(int parent);
 

@@ -33,6 +33,9 @@ const QColor kStationFill(220, 52, 44);
 const QColor kStationLine(110, 16, 12);
 const QColor kLabel(30, 30, 30);
 const QColor kHighlight(230, 0, 120);
+// What a dialog selected: its points and stations ringed, its sightings drawn over the others, in a colour
+// that no layer uses.
+const QColor kSelected(0, 150, 200);
 const QColor kLabelVeil(252, 251, 246, 200);
 
 // Sizes in pixels.
@@ -40,9 +43,11 @@ constexpr double kCross = 3.0;    // half the arms of a computed point's cross
 constexpr double kCircle = 3.5;   // radius of a known point's circle
 constexpr double kTriangle = 6.0; // half the side of a station's triangle
 constexpr double kTraverseWidth = 3.0;
-constexpr double kMargin = 24.0;    // around the scene when all of it is shown
-constexpr double kPickPixels = 6.0; // how near the cursor a point must be to be picked
-constexpr double kDragPixels = 3.0; // a press that moves less is a click
+constexpr double kSelectedWidth = 2.5; // a selected sighting
+constexpr double kSelectedRing = 7.0;  // radius of the ring round a selected point or station
+constexpr double kMargin = 24.0;       // around the scene when all of it is shown
+constexpr double kPickPixels = 6.0;    // how near the cursor a point must be to be picked
+constexpr double kDragPixels = 3.0;    // a press that moves less is a click
 // Below this many pixels of the view for each symbol, symbols would cover each other: points are drawn
 // as dots and stations as small squares.
 constexpr double kPixelsPerPoint = 120.0;
@@ -210,13 +215,73 @@ bool GeoView::Show(const std::string& geoBasePath) {
 void GeoView::ShowCarnet(const CCarnet& carnet) {
     m_scene.Build(carnet);
     m_highlight = {};
+    m_shown = true;
+    MarkSelected();
     FitAll();
+}
+
+void GeoView::ShowScene(const GeoScene& scene) {
+    // After an edit the scene is nearly the same: the person's zoom and place stay, unless nothing of the
+    // new scene would be seen through them.
+    const GroundRect seen = TransformFor(size()).Window(0.0);
+    const bool keep = m_shown && !m_fitted && !m_scene.IsEmpty() && scene.Extent().Intersects(seen);
+    m_scene = scene;
+    m_highlight = {};
+    m_shown = true;
+    MarkSelected();
+    if (keep)
+        ViewChanged();
+    else
+        FitAll();
 }
 
 void GeoView::Clear() {
     m_scene.Clear();
     m_highlight = {};
+    m_shown = false;
+    MarkSelected();
     FitAll();
+}
+
+void GeoView::SetSelectedElements(std::vector<int> elements) {
+    if (!std::is_sorted(elements.begin(), elements.end())) std::sort(elements.begin(), elements.end());
+    elements.erase(std::unique(elements.begin(), elements.end()), elements.end());
+    elements.erase(elements.begin(), std::lower_bound(elements.begin(), elements.end(), 0));
+    if (elements == m_selected.elements) return;
+    m_selected.elements = std::move(elements);
+    MarkSelected();
+    ViewChanged();
+}
+
+void GeoView::MarkSelected() {
+    Selected& selected = m_selected;
+    selected.points.clear();
+    selected.stations.clear();
+    selected.sightings.clear();
+    selected.pointFlags.clear();
+    selected.stationFlags.clear();
+    selected.sightingFlags.clear();
+    if (selected.elements.empty()) return;
+    auto chosen = [&](int element) {
+        return std::binary_search(selected.elements.begin(), selected.elements.end(), element);
+    };
+    // One pass over each list of the scene, in its order: the lists come out increasing.
+    auto mark = [&](const auto& items, std::vector<int>& list, std::vector<std::uint8_t>& flags, auto test) {
+        flags.assign(items.size(), 0);
+        for (std::size_t index = 0; index < items.size(); ++index)
+            if (test(items[index])) {
+                flags[index] = 1;
+                list.push_back(static_cast<int>(index));
+            }
+    };
+    mark(m_scene.Points(), selected.points, selected.pointFlags,
+         [&](const ScenePoint& point) { return chosen(point.element); });
+    mark(m_scene.Stations(), selected.stations, selected.stationFlags,
+         [&](const SceneStation& station) { return chosen(station.element); });
+    mark(m_scene.Sightings(), selected.sightings, selected.sightingFlags, [&](const SceneSighting& sighting) {
+        return selected.stationFlags[static_cast<std::size_t>(sighting.station)] ||
+               selected.pointFlags[static_cast<std::size_t>(sighting.target)] || chosen(sighting.element);
+    });
 }
 
 void GeoView::FitAll() {
@@ -315,8 +380,10 @@ void GeoView::RenderTo(QPainter& painter, const QSize& size) const {
         painter.fillRect(QRect(QPoint(0, 0), size), kBackground);
         PaintSegments(painter);
     }
+    DrawSelectedSightings(painter, transform);
     if (!pointsDense) PaintPoints(painter);
     if (!stationsDense) PaintStations(painter);
+    DrawSelectedMarks(painter, transform);
     DrawLabels(painter, transform);
     DrawHighlight(painter, transform);
     DrawScaleBar(painter, size);
@@ -514,6 +581,60 @@ void GeoView::DrawHighlight(QPainter& painter, const Transform& transform) const
     painter.drawEllipse(at, 10.0, 10.0);
 }
 
+namespace {
+
+// Calls `draw` for each item both selected and seen, going through the shorter of the two lists.
+template <class Draw>
+void ForEachSelectedSeen(const std::vector<int>& selected, const std::vector<std::uint8_t>& flags,
+                         const std::vector<int>& seen, Draw&& draw) {
+    if (selected.size() <= seen.size()) {
+        for (int id : selected)
+            draw(id);
+    } else {
+        for (int id : seen)
+            if (flags[static_cast<std::size_t>(id)]) draw(id);
+    }
+}
+
+} // namespace
+
+void GeoView::DrawSelectedSightings(QPainter& painter, const Transform& transform) const {
+    if (m_selected.sightings.empty()) return;
+    const QRectF bounds = transform.Bounds(kSelectedWidth + 1);
+    m_selectedLines.clear();
+    ForEachSelectedSeen(m_selected.sightings, m_selected.sightingFlags, m_selection.sightings, [&](int id) {
+        const SceneSighting& sighting = m_scene.Sightings()[static_cast<std::size_t>(id)];
+        const SceneStation& from = m_scene.Stations()[static_cast<std::size_t>(sighting.station)];
+        const ScenePoint& to = m_scene.Points()[static_cast<std::size_t>(sighting.target)];
+        QPointF a = transform(from.x, from.y), b = transform(to.x, to.y);
+        if (ClipSegment(bounds, a, b)) m_selectedLines.emplace_back(a, b);
+    });
+    painter.setRenderHint(QPainter::Antialiasing, true);
+    painter.setPen(Cosmetic(kSelected, kSelectedWidth));
+    painter.drawLines(m_selectedLines.data(), static_cast<int>(m_selectedLines.size()));
+}
+
+void GeoView::DrawSelectedMarks(QPainter& painter, const Transform& transform) const {
+    if (m_selected.points.empty() && m_selected.stations.empty()) return;
+    const QRectF bounds = transform.Bounds(kSelectedRing + 2);
+    painter.setRenderHint(QPainter::Antialiasing, true);
+    painter.setPen(Cosmetic(kSelected, 2.0));
+    painter.setBrush(Qt::NoBrush);
+    auto ring = [&](double x, double y, double radius) {
+        const QPointF at = transform(x, y);
+        if (bounds.contains(at)) painter.drawEllipse(at, radius, radius);
+    };
+    ForEachSelectedSeen(m_selected.points, m_selected.pointFlags, m_selection.points, [&](int id) {
+        const ScenePoint& point = m_scene.Points()[static_cast<std::size_t>(id)];
+        ring(point.x, point.y, kSelectedRing);
+    });
+    // Round the station's triangle.
+    ForEachSelectedSeen(m_selected.stations, m_selected.stationFlags, m_selection.stations, [&](int id) {
+        const SceneStation& station = m_scene.Stations()[static_cast<std::size_t>(id)];
+        ring(station.x, station.y, kTriangle + 4);
+    });
+}
+
 void GeoView::DrawScaleBar(QPainter& painter, const QSize& size) const {
     // About a tenth of the width, in the lower left corner.
     const double wanted = std::clamp(size.width() / 8.0, 40.0, 160.0);
@@ -603,6 +724,12 @@ void GeoView::mouseReleaseEvent(QMouseEvent* event) {
         m_highlight = m_pressHit;
         ViewChanged();
         if (m_pressHit) emit Picked(QString::fromStdString(m_pressHit.description));
+        int element = -1;
+        if (m_pressHit.kind == SceneHit::Kind::Station)
+            element = m_scene.Stations()[static_cast<std::size_t>(m_pressHit.index)].element;
+        else if (m_pressHit.kind == SceneHit::Kind::Point)
+            element = m_scene.Points()[static_cast<std::size_t>(m_pressHit.index)].element;
+        emit ElementPicked(element);
     }
     m_pressButton = Qt::NoButton;
     m_panning = false;

@@ -24,6 +24,10 @@ namespace pyr::bureau {
 // in an image and redrawn only when the view changes; the names appear once few enough points are seen
 // for them to be read. The wheel zooms about the cursor, the middle button or a left drag from an empty
 // place pans, a click on a point or a station says what it is.
+//
+// Elements of the GéoBase may be shown selected (a dialog's choice): their points and stations ringed,
+// and in the same colour the sightings that concern them: those of a selected set-up, those selected
+// themselves, those aimed at a selected point.
 class GeoView : public QWidget {
     Q_OBJECT
 public:
@@ -34,6 +38,10 @@ public:
     // front end) and shows all of it. False, and the view left empty, when it cannot be read.
     bool Show(const std::string& geoBasePath);
     void ShowCarnet(const CCarnet& carnet);
+    // Shows a copy of a scene built elsewhere. The first scene is shown whole; a scene shown again after an
+    // edit keeps the view the person chose, unless the view was showing everything, which it goes on
+    // doing.
+    void ShowScene(const GeoScene& scene);
     void Clear();
     const GeoScene& Scene() const { return m_scene; }
 
@@ -55,9 +63,19 @@ public:
     // shown, the benchmarks' drawing, the screenshots.
     void RenderTo(QPainter& painter, const QSize& size) const;
 
+    // The elements shown selected (indices of elements of the GéoBase), kept across the scenes shown.
+    void SetSelectedElements(std::vector<int> elements);
+    const std::vector<int>& SelectedElements() const { return m_selected.elements; }
+    // What they select in the scene: points, stations and sightings (indices into its lists), increasing.
+    const std::vector<int>& SelectedPoints() const { return m_selected.points; }
+    const std::vector<int>& SelectedStations() const { return m_selected.stations; }
+    const std::vector<int>& SelectedSightings() const { return m_selected.sightings; }
+
 signals:
     // A click on a point or a station: its description, as the status bar and the text window show it.
     void Picked(const QString& description);
+    // The same click: the element of the point or the station picked, -1 for a click on nothing.
+    void ElementPicked(int element);
     // The ground coordinates under the cursor (metres).
     void CursorMoved(double x, double y);
 
@@ -84,6 +102,9 @@ private:
     void PaintStations(QPainter& painter) const;
     void DrawLabels(QPainter& painter, const Transform& transform) const;
     void DrawHighlight(QPainter& painter, const Transform& transform) const;
+    void MarkSelected();
+    void DrawSelectedSightings(QPainter& painter, const Transform& transform) const;
+    void DrawSelectedMarks(QPainter& painter, const Transform& transform) const;
     void DrawScaleBar(QPainter& painter, const QSize& size) const;
 
     GeoScene m_scene;
@@ -93,6 +114,16 @@ private:
     // The view shows all of the scene, as FitAll left it: a new size fits it again.
     bool m_fitted = true;
     SceneHit m_highlight;
+    bool m_shown = false; // a scene was shown: the next one keeps the view
+
+    // The elements selected, and what of the scene they select: the lists, and a flag per item of the
+    // scene to test what is seen against.
+    struct Selected {
+        std::vector<int> elements;
+        std::vector<int> points, stations, sightings;
+        std::vector<std::uint8_t> pointFlags, stationFlags, sightingFlags;
+    };
+    Selected m_selected;
 
     // The last drawing, shown again while nothing changes.
     QImage m_cache;
@@ -112,6 +143,7 @@ private:
     mutable std::vector<QLineF> m_measures;
     mutable std::vector<QLineF> m_legLines;
     mutable std::vector<QLineF> m_crosses;
+    mutable std::vector<QLineF> m_selectedLines;
     mutable std::vector<QPointF> m_computed;
     mutable std::vector<QPointF> m_known;
     mutable std::vector<QPointF> m_stationMarks;

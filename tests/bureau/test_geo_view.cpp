@@ -143,4 +143,82 @@ TEST_F(GeoViewTest, AGeoBaseThatCannotBeReadLeavesTheViewEmpty) {
     EXPECT_NE(frontEnd.messages.back().text.find("absent.geo"), std::string::npos);
 }
 
+// A scene shown again after an edit keeps the person's view; the first one, and one whose view showed
+// everything, are shown whole.
+TEST_F(GeoViewTest, AnEditedSceneKeepsTheViewTheFirstIsShownWhole) {
+    ASSERT_TRUE(view.Show(dir / "job.geo"));
+    const pyr::GeoScene scene = view.Scene();
+    GeoView other;
+    other.resize(400, 300);
+    other.ShowScene(scene);
+    EXPECT_NEAR(other.Scale(), kFitScale, 1e-9);
+    other.SetView(1090.0, 2040.0, 10.0);
+    other.ShowScene(scene);
+    EXPECT_DOUBLE_EQ(other.Scale(), 10.0);
+    EXPECT_DOUBLE_EQ(other.CentreX(), 1090.0);
+    // A view that no longer sees anything of the scene shows it whole again.
+    other.SetView(5000.0, 5000.0, 10.0);
+    other.ShowScene(scene);
+    EXPECT_NEAR(other.Scale(), kFitScale, 1e-9);
+    other.Clear();
+    other.SetView(1090.0, 2040.0, 10.0);
+    other.ShowScene(scene);
+    EXPECT_NEAR(other.Scale(), kFitScale, 1e-9);
+}
+
+// The elements of the job: 0 A1, 1 S1, 2 P1, 3 the station, 4 its reference to A1, 5 its measure to P1.
+TEST_F(GeoViewTest, TheSelectedElementsAndTheirSightingsAreDrawnApart) {
+    ASSERT_TRUE(view.Show(dir / "job.geo"));
+    // The pixel of the measure to P1 at its middle that is least red: orange when not selected.
+    auto leastRed = [&](const QImage& image) {
+        const QPoint middle = view.ToScreen(1075, 2065).toPoint();
+        QColor found(255, 255, 255);
+        for (int dx = -1; dx <= 1; ++dx)
+            for (int dy = -1; dy <= 1; ++dy)
+                if (image.pixelColor(middle + QPoint(dx, dy)).red() < found.red())
+                    found = image.pixelColor(middle + QPoint(dx, dy));
+        return found;
+    };
+    EXPECT_GT(leastRed(Rendered()).red(), 180);
+
+    // The station: both its sightings.
+    view.SetSelectedElements({3});
+    EXPECT_EQ(view.SelectedStations(), (std::vector<int>{0}));
+    EXPECT_EQ(view.SelectedSightings().size(), 2u);
+    const QColor selected = leastRed(Rendered());
+    EXPECT_LT(selected.red(), 80);
+    EXPECT_GT(selected.blue(), 150);
+    // The sighting of A1 alone; then P1, and the sighting aimed at it.
+    view.SetSelectedElements({4});
+    ASSERT_EQ(view.SelectedSightings().size(), 1u);
+    EXPECT_TRUE(view.Scene().Sightings()[static_cast<std::size_t>(view.SelectedSightings()[0])].reference);
+    EXPECT_GT(leastRed(Rendered()).red(), 180);
+    view.SetSelectedElements({2, 2, -1, 99});
+    EXPECT_EQ(view.SelectedElements(), (std::vector<int>{2, 99}));
+    ASSERT_EQ(view.SelectedPoints().size(), 1u);
+    EXPECT_EQ(view.Scene().Points()[static_cast<std::size_t>(view.SelectedPoints()[0])].name, "P1");
+    EXPECT_LT(leastRed(Rendered()).red(), 80);
+    EXPECT_TRUE(view.SelectedStations().empty());
+    // Kept across the scenes shown, and found again in the new one.
+    view.ShowScene(pyr::GeoScene(view.Scene()));
+    EXPECT_EQ(view.SelectedPoints().size(), 1u);
+    view.SetSelectedElements({});
+    EXPECT_TRUE(view.SelectedSightings().empty());
+}
+
+TEST_F(GeoViewTest, AClickGivesTheElementOfWhatIsPicked) {
+    ASSERT_TRUE(view.Show(dir / "job.geo"));
+    view.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&view));
+    QSignalSpy picked(&view, &GeoView::ElementPicked);
+    // The station wins over the point it stands on.
+    QTest::mouseClick(&view, Qt::LeftButton, {}, view.ToScreen(1100, 2050).toPoint());
+    QTest::mouseClick(&view, Qt::LeftButton, {}, view.ToScreen(1000, 2000).toPoint());
+    QTest::mouseClick(&view, Qt::LeftButton, {}, QPoint(200, 150));
+    ASSERT_EQ(picked.count(), 3);
+    EXPECT_EQ(picked[0][0].toInt(), 3);
+    EXPECT_EQ(picked[1][0].toInt(), 0);
+    EXPECT_EQ(picked[2][0].toInt(), -1);
+}
+
 } // namespace
