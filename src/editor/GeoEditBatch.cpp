@@ -49,6 +49,8 @@ constexpr const char* kValueHelp = "la valeur cherchée : CHAMP=NOMBRE, CHAMP<NO
 constexpr const char* kValueForm =
     "--valeur : « %s » n'est pas de la forme CHAMP=NOMBRE, CHAMP<NOMBRE ou CHAMP>NOMBRE.";
 constexpr const char* kFound = "%d élément(s) trouvé(s).";
+constexpr const char* kDuplicatesHelp =
+    "cherche les points doubles (tolérance et code des options de l'éditeur) ; le listing va dans LISTING";
 constexpr const char* kProjectionHelp =
     "convertit les points de la projection du chantier (options, corrections) dans la projection NOM";
 constexpr const char* kProjectionFromHelp = "la projection de départ, au lieu de celle des options";
@@ -174,6 +176,10 @@ void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
             return std::string();
         },
         true);
+    options.OptionalValue("points-doubles", "LISTING", kDuplicatesHelp, [&batch](const std::string& value) {
+        batch.duplicates = value;
+        return std::string();
+    });
     options.Value("changement-projection", "NOM", kProjectionHelp, [&batch](const std::string& value) {
         batch.projection = value;
         return std::string();
@@ -203,6 +209,7 @@ ui::DialogResult CGeoEditor::RunBatchEdits(CPyrTxtWnd& txt, ui::FrontEnd& frontE
         refused |= !Renumber(frontEnd, request);
     }
     if (batch.remove && !refused) refused |= !RemovePoints(frontEnd, *batch.remove);
+    if (batch.duplicates && !refused) refused |= FindDuplicates(frontEnd, false, *batch.duplicates) < 0;
     if (!Document().Modified()) {
         if (batch.Edits()) txt.Print("%s", msg::kNoChange);
     } else if (!Save(frontEnd)) {

@@ -4,6 +4,7 @@
 #include "core/Files.h"
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
+#include "editor/DuplicatePoints.h"
 #include "fieldbook/ExportTexts.h"
 #include "fieldbook/FieldBookConverter.h"
 #include "fieldbook/FieldBookTexts.h"
@@ -35,6 +36,8 @@ constexpr const char* kRenamed = "Station <%s> renommée <%s> : %d élément(s) 
 constexpr const char* kNoPointRemoved = "Aucun point de la sélection dans la GéoBase.";
 constexpr const char* kLabelProjection = "Changement de projection de %s en %s";
 constexpr const char* kProjected = "%d point(s) convertis de %s en %s.";
+constexpr const char* kLabelDuplicates = "Codage des points doubles en %s";
+constexpr const char* kDuplicatesCoded = "%d point(s) double(s) codé(s) %s.";
 constexpr const char* kPointsRemoved = "%d point(s) supprimé(s) ; les visées sur ces points sont gardées.";
 
 // The code table the editor holds for a GéoBase: the one it goes with, else the job's table of the
@@ -337,6 +340,46 @@ int CGeoEditor::SearchNext(ui::FrontEnd& frontEnd, const SearchCriteria& criteri
     return 1;
 }
 
+// ---------------------------------------------------------------- duplicate points
+
+int CGeoEditor::FindDuplicates(ui::FrontEnd& frontEnd, bool askListing, const std::string& listing) {
+    if (m_current < 0) return -1;
+    const std::string paramPath = Inputs().paramPath;
+    std::string text;
+    ReadParamString(paramPath, kSectionEditor, "TolerancePointDouble", "0.05", text);
+    double tolerance = 0.0;
+    if (!ParseTypedNumber(Trimmed(text), tolerance) || !IsValidDuplicateTolerance(tolerance)) {
+        frontEnd.MessageBox(msg::kDuplicateToleranceRefused, ui::kCaption, ui::kIconWarning);
+        return -1;
+    }
+    const DuplicatePoints found = FindDuplicatePoints(Carnet(), tolerance);
+    CPyrTxtWnd txt(frontEnd);
+    txt.PrintText(DuplicatePointsSummary(found));
+    std::vector<int> points;
+    points.reserve(2 * (found.pairs.size() + found.conflicts.size()));
+    for (const auto* list : {&found.pairs, &found.conflicts})
+        for (const DuplicatePair& pair : *list)
+            points.insert(points.end(), {pair.first, pair.second});
+
+    std::string code;
+    ReadParamString(paramPath, kSectionEditor, "CodePointDouble", "", code);
+    ElementReplacements coded = CodeDuplicates(Carnet(), found, code);
+    if (!coded.empty()) {
+        const int count = static_cast<int>(coded.size());
+        Document().Replace(Sprintf(kLabelDuplicates, code.c_str()), std::move(coded));
+        txt.Print(kDuplicatesCoded, count, code.c_str());
+    }
+    Document().Select(std::move(points));
+
+    if (!found.pairs.empty() || !found.conflicts.empty()) {
+        ListingRequest request = DuplicatePointsListing(paramPath, Carnet(), found);
+        request.ask = askListing && listing.empty();
+        request.path = listing;
+        if (askListing || !listing.empty()) WriteComputationListing(frontEnd, request);
+    }
+    return static_cast<int>(found.pairs.size());
+}
+
 // ---------------------------------------------------------------- the dialogs of the menus
 
 std::string CGeoEditor::JobProjection() const {
@@ -452,6 +495,13 @@ ui::DialogResult CGeoEditor::ReadFieldBook(const Reading& reading, CPyrTxtWnd& t
     if (!asWindow) // a window lists them
         for (int i = former; i < Carnet().GetSize(); ++i)
             txt.PrintText(EditorLine(Carnet(), i));
+    // The options may ask for the duplicate points after every reading: a point surveyed again under
+    // another name is best seen while the field is fresh.
+    int lookForDuplicates = 0;
+    ReadParamInt(paramPath, kSectionEditor, "PointsDoubles", 0, 0, 1, lookForDuplicates);
+    if (lookForDuplicates == 1 && FindDuplicates(frontEnd, asWindow) > 0 && Document().Modified() &&
+        !SaveAfterDialog(txt, frontEnd))
+        return ui::DialogResult::Failed;
     return ui::DialogResult::Ok;
 }
 

@@ -116,6 +116,12 @@ public:
     bool ChangeProjection(ui::FrontEnd& frontEnd, const std::string& to, std::string from = {});
     // The projection the job's options give.
     std::string JobProjection() const;
+    // The duplicate points of the current GéoBase within the tolerance of the options
+    // ("TolerancePointDouble"): said in the text window, their points selected, the later point of each
+    // couple given the code of the options ("CodePointDouble") as one edit, and their listing ("*.ptd")
+    // offered as the listings' options say, or written to `listing` when it is named. The number of
+    // couples; -1 when the tolerance of the options is not one (said why).
+    int FindDuplicates(ui::FrontEnd& frontEnd, bool askListing, const std::string& listing = {});
 
 private:
     struct Reading {
@@ -130,10 +136,11 @@ private:
         std::optional<std::string> remove;
         std::optional<SearchCriteria> search;
         SearchCriteria criteria;               // --code, --genre, --valeur: given before or after --chercher
-        std::optional<std::string> projection; // --projection, and its --projection-depart
+        std::optional<std::string> projection; // --changement-projection, and its --projection-depart
+        std::optional<std::string> duplicates; // --points-doubles [LISTING]
         std::string projectionFrom;
 
-        bool Edits() const { return !renames.empty() || renumber || remove; }
+        bool Edits() const { return !renames.empty() || renumber || remove || duplicates; }
     };
 
     // The GéoBase named, else the one the person chooses; nothing when none is.

@@ -30,6 +30,7 @@ constexpr const char* kUndone = "Annulé : %s.";
 constexpr const char* kRedone = "Rétabli : %s.";
 constexpr const char* kBadOffset = "Le décalage « %s » n'est pas un nombre entier.";
 constexpr const char* kAllKinds = "(tous)";
+constexpr const char* kDuplicatesFound = "%d couple(s) de points doubles.";
 
 // A menu entry as a line of a list: "Carnet &Wild, Leica" gives "Carnet Wild, Leica".
 std::string WithoutAccelerator(std::string_view entry) {
@@ -187,6 +188,8 @@ std::vector<ui::Control> CGeoEditorForm::Controls() const {
                            .Buddy(kFormat));
     controls.push_back(Ctl(kFormat, ControlKind::Combo, "format").In(kMenuGroup).At(1, 1));
     controls.push_back(Ctl(kRead, ControlKind::Button, "lecture", "&Lecture").In(kMenuGroup).At(1, 2));
+    controls.push_back(
+        Ctl(kDuplicates, ControlKind::Button, "pointsDoubles", "Points dou&bles").In(kMenuGroup).At(3, 0));
     controls.push_back(Ctl(kProjectionLabel, ControlKind::Label, "projectionLabel", "Pro&jection d'arrivée :")
                            .In(kMenuGroup)
                            .At(2, 0)
@@ -409,6 +412,7 @@ ui::ControlState CGeoEditorForm::State(int id) const {
         state.current = m_projection;
         break;
     case kChangeProjection:
+    case kDuplicates:
         state.enabled = open;
         break;
     case kStatus:
@@ -604,6 +608,11 @@ void CGeoEditorForm::Act(ui::FrontEnd& frontEnd, int id, const ui::Event& event)
             event.rank < static_cast<int>(OfferedProjections().size()))
             m_projection = event.rank;
         break;
+    case kDuplicates: {
+        const int found = m_editor.FindDuplicates(frontEnd, true);
+        if (found >= 0) m_said = Sprintf(kDuplicatesFound, found);
+        break;
+    }
     case kChangeProjection:
         m_editor.ChangeProjection(frontEnd,
                                   OfferedProjections()[static_cast<std::size_t>(m_projection)].name);

@@ -78,6 +78,7 @@ public:
         kProjectionLabel,
         kProjection,
         kChangeProjection,
+        kDuplicates,
         kElements, // the tables, one per view, the view shown the only one seen
     };
 

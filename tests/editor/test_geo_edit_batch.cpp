@@ -160,3 +160,36 @@ TEST_F(EditBatch, TheChangeOfProjectionConvertsEveryPointAndIsUndone) {
     EXPECT_EQ(frontEnd.messages.back().text.find("Changement de projection impossible"), 0u);
     EXPECT_EQ(Saved(), before);
 }
+
+// The same corner surveyed twice, 3 cm apart (0.018 m east, 0.024 m north), under 101 and 201: a couple
+// within the 5 cm of the options, the later point coded as they ask, the listing written where named.
+TEST_F(EditBatch, TheDuplicatePointsAreListedAndTheLaterOneCoded) {
+    WriteBytes(dir / "a.geo", "GEOBASE PYRALIS\t1\n"
+                              "1006\t101\t1000\t2000\t-999999\t-\n"
+                              "1006\t102\t1010\t2030\t-999999\t-\n"
+                              "1006\t201\t1000.018\t2000.024\t-999999\t-\n");
+    WriteBytes(dir / "Pyralis.ini", "[Options_Editeur]\nTolerancePointDouble=0.05\nCodePointDouble=DBL\n");
+    ASSERT_EQ(Run({"--points-doubles", dir / "doubles.ptd"}), DialogResult::Ok) << frontEnd.AllLines();
+    EXPECT_EQ(Saved(), "GEOBASE PYRALIS\t1\n"
+                       "1006\t101\t1000\t2000\t-999999\t-\n"
+                       "1006\t102\t1010\t2030\t-999999\t-\n"
+                       "1006\t201\t1000.018\t2000.024\t-999999\t-\tDBL\n");
+    EXPECT_NE(frontEnd.AllLines().find("1 couple(s) de points doubles à moins de 0.0500 m."),
+              std::string::npos)
+        << frontEnd.AllLines();
+    const std::string listing = ReadBytes(dir / "doubles.ptd");
+    EXPECT_NE(listing.find("Recherche des points doubles"), std::string::npos);
+    EXPECT_NE(listing.find("0.0300"), std::string::npos) << listing; // the distance of the couple
+
+    // Searched again: the couple is found, already coded, and nothing is saved.
+    std::filesystem::remove(dir / "a.bak");
+    ASSERT_EQ(Run({"--points-doubles"}), DialogResult::Ok);
+    EXPECT_FALSE(std::filesystem::exists(dir / "a.bak"));
+    // A tolerance that is not one is refused.
+    WriteBytes(dir / "Pyralis.ini", "[Options_Editeur]\nTolerancePointDouble=beaucoup\n");
+    frontEnd.messages.clear();
+    EXPECT_EQ(Run({"--points-doubles"}), DialogResult::Failed);
+    ASSERT_FALSE(frontEnd.messages.empty());
+    EXPECT_EQ(frontEnd.messages.front().text,
+              "La tolérance des points doubles doit être un nombre compris entre 0 et 100 m.");
+}
