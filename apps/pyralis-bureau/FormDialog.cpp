@@ -199,7 +199,7 @@ void FormDialog::Build() {
     for (const ui::Control& control : controls) {
         QWidget* widget = Make(control);
         m_byId[control.id] = m_controls.size();
-        m_controls.push_back({control, widget, {}, {}, {}});
+        m_controls.push_back({control, widget, {}, {}, {}, -1});
         Place(control, widget);
     }
     // A list on demand and a drawing take the room the dialog gains, with the groups that hold them.
@@ -669,19 +669,25 @@ void FormDialog::ShowOnDemand(Shown& shown, const ui::ControlState& state) {
     QItemSelectionModel& selection = *table.selectionModel();
     const bool multiple = shown.control.multiple;
     const int current = state.current < lines.rowCount() ? state.current : -1;
-    // The current line set by the form is brought into view; one the person chose is there already.
+    // A new current line from the form is brought into view; one the person chose is there already, and
+    // the same one shown again after new lines leaves the person's scrolling alone.
     if (table.currentIndex().row() != current) {
         if (current < 0) {
             selection.clearCurrentIndex();
             if (!multiple) selection.clearSelection();
         } else {
-            const QModelIndex index = lines.index(current, 0);
-            selection.setCurrentIndex(index, multiple ? QItemSelectionModel::NoUpdate
-                                                      : QItemSelectionModel::ClearAndSelect |
-                                                            QItemSelectionModel::Rows);
-            table.scrollTo(index);
+            // The view scrolls to its current line by itself, unless told not to.
+            const bool scroll = current != shown.current;
+            table.setAutoScroll(scroll);
+            selection.setCurrentIndex(lines.index(current, 0),
+                                      multiple
+                                          ? QItemSelectionModel::NoUpdate
+                                          : QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
+            table.setAutoScroll(true);
+            if (scroll) table.scrollTo(lines.index(current, 0));
         }
     }
+    shown.current = current;
     if (multiple) ShowSelection(table, state.selection);
 }
 

@@ -47,7 +47,8 @@ private:
         QWidget* widget = nullptr;
         std::vector<std::string> items; // the lines shown, to rebuild a list only when they change
         std::vector<std::string> tips;
-        std::optional<long> revision; // a list on demand, a drawing: the revision shown
+        std::optional<long> revision; // a drawing: the revision shown
+        int current = -1;             // a list on demand: the form's current line, last shown
     };
 
     void Build();

@@ -239,6 +239,14 @@ TEST_F(OnDemandDialog, TheFormsSelectionIsShownWithoutBeingSentBack) {
     Paint();
     EXPECT_TRUE(table->viewport()->rect().contains(RowCentre(500'001)));
     EXPECT_LE(form.asked, asked + 100);
+    // New lines with the same current one: the person's scrolling stays.
+    table->scrollToTop();
+    ++form.linesRevision;
+    form.model.Change();
+    QCoreApplication::processEvents();
+    EXPECT_EQ(table->currentIndex().row(), 500'001);
+    EXPECT_EQ(SelectedRows(), form.selection);
+    EXPECT_EQ(table->verticalScrollBar()->value(), 0);
 
     // The form clears it.
     form.selection.clear();
