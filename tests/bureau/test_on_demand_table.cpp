@@ -16,6 +16,7 @@
 #include <QScrollBar>
 #include <QTableView>
 #include <QTest>
+#include <QTreeWidget>
 #include <gtest/gtest.h>
 #include <memory>
 #include <numeric>
@@ -304,6 +305,48 @@ TEST_F(OnDemandDialog, TheDrawingSendsTheElementClickedAndShowsTheFormsSelection
     form.model.Change();
     QCoreApplication::processEvents();
     EXPECT_TRUE(view->Scene().IsEmpty());
+}
+
+// A list whose lines are in its state may be of several lines too: the same selection both ways, kept
+// when the lines are given again.
+TEST(SeveralLinesOfAList, AreSelectedBothWays) {
+    struct Few : LinesForm {
+        std::vector<Control> Controls() const override {
+            return {{.id = kLines,
+                     .kind = ControlKind::List,
+                     .name = "peu",
+                     .columns = {"Point", "Z"},
+                     .multiple = true}};
+        }
+        ControlState State(int id) const override {
+            ControlState state = LinesForm::State(id);
+            state.items = {"A\t1.5", "B\t2.5", "C\t3.5", "D\t4.5"};
+            return state;
+        }
+    } form;
+    ScriptedFrontEnd frontEnd;
+    form.selection = {1, 3};
+    FormDialog dialog(form, frontEnd);
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&dialog));
+    auto* list = dialog.findChild<QTreeWidget*>("peu");
+    ASSERT_TRUE(list);
+    auto selected = [&] {
+        std::vector<int> rows;
+        for (int row = 0; row < list->topLevelItemCount(); ++row)
+            if (list->topLevelItem(row)->isSelected()) rows.push_back(row);
+        return rows;
+    };
+    EXPECT_EQ(selected(), (std::vector<int>{1, 3}));
+    EXPECT_TRUE(form.events.empty());
+    QTest::mouseClick(list->viewport(), Qt::LeftButton, Qt::ControlModifier,
+                      list->visualItemRect(list->topLevelItem(0)).center());
+    ASSERT_FALSE(form.events.empty());
+    EXPECT_EQ(form.events.back().second.rank, 0);
+    EXPECT_EQ(form.events.back().second.ranks, (std::vector<int>{0, 1, 3}));
+    form.model.Change();
+    QCoreApplication::processEvents();
+    EXPECT_EQ(selected(), (std::vector<int>{0, 1, 3}));
 }
 
 // The table and the drawing take the room the dialog gains; the buttons stay at its foot.
