@@ -31,7 +31,6 @@ int OnDemandTableModel::columnCount(const QModelIndex& parent) const {
 const OnDemandTableModel::Line& OnDemandTableModel::LineAt(int rank) const {
     Line& line = m_lines[static_cast<std::size_t>(rank % kKept)];
     if (line.rank == rank) return line;
-    ++m_rowsAsked;
     line.rank = rank;
     line.cells = QString::fromStdString(m_form.OnDemandRow(m_id, rank)).split('\t');
     line.numbers.assign(static_cast<std::size_t>(line.cells.size()), false);

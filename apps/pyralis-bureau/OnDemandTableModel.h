@@ -20,8 +20,6 @@ public:
     // Takes the list's revision: when it differs from the one shown, the number of lines is asked again,
     // the lines kept are forgotten and the view is told to start again. True when it did.
     bool Update(long revision);
-    // The number of lines asked of the form since the model was made: what the tests bound.
-    long RowsAsked() const { return m_rowsAsked; }
 
     int rowCount(const QModelIndex& parent = QModelIndex()) const override;
     int columnCount(const QModelIndex& parent = QModelIndex()) const override;
@@ -46,7 +44,6 @@ private:
     // push each other out.
     static constexpr int kKept = 256;
     mutable std::array<Line, kKept> m_lines;
-    mutable long m_rowsAsked = 0;
 };
 
 } // namespace pyr::bureau
