@@ -21,9 +21,12 @@ namespace {
 // Cells narrower than this (m) would only multiply them: a tolerance of 0 searches coincident points in
 // cells of 1 mm.
 constexpr double kMinCellMetre = 0.001;
-// Cells are a little wider than the tolerance, so that two points within it, whatever the rounding of
-// their coordinates divided by the cell's width, always fall into the same or neighbouring cells.
-constexpr double kCellMargin = 1.01;
+// Cells are twice as wide as the tolerance: a point reaches into the next column (or row) of cells only
+// from the half of its cell beside it, so that most points look into four cells, not nine.
+constexpr double kCellsPerTolerance = 2.0;
+// The cells a point looks into cover its reach and this part of a cell more on each side, so that no
+// rounding of a coordinate divided by the cell's width leaves a point within reach outside them.
+constexpr double kReachMargin = 0.01;
 // Cell numbers are kept within this: a coordinate that no survey holds (beyond 10^15 m) shares the
 // border cell, which changes how many points are compared, never which couples are found.
 constexpr double kMaxCellNumber = 4e18;
@@ -55,42 +58,40 @@ std::uint64_t CellHash(std::int64_t cx, std::int64_t cy) {
     return h;
 }
 
-// The occupied cells in an open-addressed table, each the head of the chain of its points (linked
-// through `next`, in the order of the points).
+// The occupied cells in an open-addressed table of the first point of each (the cell's numbers are
+// those of that point); the points of a cell are chained through `next`, in their order.
 class CellGrid {
 public:
     explicit CellGrid(const std::vector<GridPoint>& points) : m_points(points), m_next(points.size(), -1) {
         const std::size_t slots = std::bit_ceil(std::max<std::size_t>(16, points.size() * 2));
         m_mask = slots - 1;
-        m_heads.assign(slots, -1);
-        m_tails.assign(slots, -1);
-        for (int p = 0; p < static_cast<int>(points.size()); ++p) {
-            const std::size_t slot = Slot(points[p].cx, points[p].cy);
-            if (m_heads[slot] < 0)
-                m_heads[slot] = p;
-            else
-                m_next[m_tails[slot]] = p;
-            m_tails[slot] = p;
+        m_first.assign(slots, -1);
+        // From the last point to the first, each put at the head of its cell's chain.
+        for (int p = static_cast<int>(points.size()) - 1; p >= 0; --p) {
+            int& first = m_first[Slot(points[p].cx, points[p].cy)];
+            m_next[p] = first;
+            first = p;
         }
     }
 
     // The first point of that cell, -1 when it is empty; then Next.
-    int First(std::int64_t cx, std::int64_t cy) const { return m_heads[Slot(cx, cy)]; }
+    int First(std::int64_t cx, std::int64_t cy) const { return m_first[Slot(cx, cy)]; }
     int Next(int p) const { return m_next[p]; }
 
 private:
     // The slot of that cell: its own, or the empty one where it would go.
     std::size_t Slot(std::int64_t cx, std::int64_t cy) const {
         for (std::size_t slot = CellHash(cx, cy) & m_mask;; slot = (slot + 1) & m_mask) {
-            const int head = m_heads[slot];
-            if (head < 0 || (m_points[head].cx == cx && m_points[head].cy == cy)) return slot;
+            const int first = m_first[slot];
+            if (first < 0) return slot;
+            const GridPoint& point = m_points[static_cast<std::size_t>(first)];
+            if (point.cx == cx && point.cy == cy) return slot;
         }
     }
 
     const std::vector<GridPoint>& m_points;
     std::vector<int> m_next;
-    std::vector<int> m_heads;
-    std::vector<int> m_tails;
+    std::vector<int> m_first; // by slot, -1 for an empty one
     std::size_t m_mask = 0;
 };
 
@@ -145,12 +146,14 @@ DuplicatePoints FindDuplicatePoints(const CCarnet& carnet, double toleranceMetre
     DuplicatePoints results;
     results.tolerance = toleranceMetre;
     const double reach = toleranceMetre + kDuplicateDistanceSlack;
-    const double width = std::max(toleranceMetre, kMinCellMetre) * kCellMargin;
+    const double width = std::max(toleranceMetre, kMinCellMetre) * kCellsPerTolerance;
+    const double probe = reach + kReachMargin * width;
 
     // The first planimetric point of each identifier; the later ones of the same identifier set apart
     // when they stand elsewhere.
     std::vector<int> firstOf(static_cast<std::size_t>(carnet.NameCount()), -1); // by name rank
     std::vector<GridPoint> points;
+    points.reserve(static_cast<std::size_t>(carnet.GetSize())); // untouched room costs no memory
     for (int i = 0; i < carnet.GetSize(); ++i) {
         if (carnet.GetType(i) != kKindPoint) continue;
         const auto* point = carnet.As<CPointGen>(i);
@@ -170,17 +173,19 @@ DuplicatePoints FindDuplicatePoints(const CCarnet& carnet, double toleranceMetre
     }
     results.examined = static_cast<int>(points.size());
 
-    // Each point with the later ones of its cell and the eight around it, in the order of the points,
-    // so that the couples come sorted by their first element and the search may stop at the limit.
+    // Each point with the later ones of the cells its reach touches, in the order of the points, so that
+    // the couples come sorted by their first element and the search may stop at the limit.
     const CellGrid grid(points);
     const double reach2 = reach * reach;
     std::vector<DuplicatePair> found;
     for (int p = 0; p < static_cast<int>(points.size()); ++p) {
         const GridPoint& a = points[static_cast<std::size_t>(p)];
         found.clear();
-        for (std::int64_t dx = -1; dx <= 1; ++dx)
-            for (std::int64_t dy = -1; dy <= 1; ++dy)
-                for (int q = grid.First(a.cx + dx, a.cy + dy); q >= 0; q = grid.Next(q)) {
+        const std::int64_t xFrom = CellNumber(a.x - probe, width), xTo = CellNumber(a.x + probe, width);
+        const std::int64_t yFrom = CellNumber(a.y - probe, width), yTo = CellNumber(a.y + probe, width);
+        for (std::int64_t cx = xFrom; cx <= xTo; ++cx)
+            for (std::int64_t cy = yFrom; cy <= yTo; ++cy)
+                for (int q = grid.First(cx, cy); q >= 0; q = grid.Next(q)) {
                     if (q <= p) continue;
                     const GridPoint& b = points[static_cast<std::size_t>(q)];
                     const double ex = b.x - a.x, ey = b.y - a.y;

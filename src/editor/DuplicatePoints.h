@@ -17,9 +17,9 @@
 // again within the tolerance, it is the same point and is not listed. Points without an identifier are
 // not looked at: they cannot be named in a listing.
 //
-// The search is linear in the size of the GéoBase: the points fall into a hash grid of square cells at
-// least as wide as the tolerance, and each is compared only with the points of its cell and of the eight
-// around it.
+// The search is linear in the size of the GéoBase: the points fall into a hash grid of square cells wider
+// than the tolerance, and each is compared only with the points of the cells within its reach: its own
+// and, near a border, those beside it (at most the eight around it).
 namespace pyr {
 
 class CCarnet;
