@@ -59,39 +59,51 @@ std::uint64_t CellHash(std::int64_t cx, std::int64_t cy) {
 }
 
 // The occupied cells in an open-addressed table of the first point of each (the cell's numbers are
-// those of that point); the points of a cell are chained through `next`, in their order.
+// those of that point); the points of a cell are chained through `next`, in their order. Each slot keeps
+// the high half of its cell's hash, so that a search passing over other cells' slots seldom reads their
+// points.
 class CellGrid {
 public:
     explicit CellGrid(const std::vector<GridPoint>& points) : m_points(points), m_next(points.size(), -1) {
         const std::size_t slots = std::bit_ceil(std::max<std::size_t>(16, points.size() * 2));
         m_mask = slots - 1;
-        m_first.assign(slots, -1);
+        m_slots.assign(slots, Slot{});
         // From the last point to the first, each put at the head of its cell's chain.
         for (int p = static_cast<int>(points.size()) - 1; p >= 0; --p) {
-            int& first = m_first[Slot(points[p].cx, points[p].cy)];
-            m_next[p] = first;
-            first = p;
+            const std::uint64_t hash = CellHash(points[p].cx, points[p].cy);
+            Slot& slot = m_slots[Find(points[p].cx, points[p].cy, hash)];
+            m_next[p] = slot.first;
+            slot = {p, static_cast<std::uint32_t>(hash >> 32)};
         }
     }
 
     // The first point of that cell, -1 when it is empty; then Next.
-    int First(std::int64_t cx, std::int64_t cy) const { return m_first[Slot(cx, cy)]; }
+    int First(std::int64_t cx, std::int64_t cy) const {
+        return m_slots[Find(cx, cy, CellHash(cx, cy))].first;
+    }
     int Next(int p) const { return m_next[p]; }
 
 private:
+    struct Slot {
+        int first = -1; // -1: an empty slot
+        std::uint32_t tag = 0;
+    };
+
     // The slot of that cell: its own, or the empty one where it would go.
-    std::size_t Slot(std::int64_t cx, std::int64_t cy) const {
-        for (std::size_t slot = CellHash(cx, cy) & m_mask;; slot = (slot + 1) & m_mask) {
-            const int first = m_first[slot];
-            if (first < 0) return slot;
-            const GridPoint& point = m_points[static_cast<std::size_t>(first)];
-            if (point.cx == cx && point.cy == cy) return slot;
+    std::size_t Find(std::int64_t cx, std::int64_t cy, std::uint64_t hash) const {
+        const auto tag = static_cast<std::uint32_t>(hash >> 32);
+        for (std::size_t index = hash & m_mask;; index = (index + 1) & m_mask) {
+            const Slot& slot = m_slots[index];
+            if (slot.first < 0) return index;
+            if (slot.tag != tag) continue;
+            const GridPoint& point = m_points[static_cast<std::size_t>(slot.first)];
+            if (point.cx == cx && point.cy == cy) return index;
         }
     }
 
     const std::vector<GridPoint>& m_points;
     std::vector<int> m_next;
-    std::vector<int> m_first; // by slot, -1 for an empty one
+    std::vector<Slot> m_slots;
     std::size_t m_mask = 0;
 };
 
