@@ -71,22 +71,6 @@ std::optional<int> KindNamed(std::string_view text) {
     return std::nullopt;
 }
 
-// "z>100.5", "X=651200", "di<5".
-std::optional<ValueCriterion> ValueNamed(std::string_view text) {
-    const std::size_t at = text.find_first_of("=<>");
-    if (at == std::string_view::npos || at == 0) return std::nullopt;
-    std::string name(Trimmed(text.substr(0, at)));
-    for (char& c : name)
-        c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-    const std::optional<FieldKey> key = FieldKeyFromName(name);
-    double value = 0.0;
-    if (!key || !ParseTypedNumber(text.substr(at + 1), value)) return std::nullopt;
-    const CompareOp op = text[at] == '='   ? CompareOp::Equal
-                         : text[at] == '<' ? CompareOp::Less
-                                           : CompareOp::Greater;
-    return ValueCriterion{*key, op, value};
-}
-
 } // namespace
 
 void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
@@ -189,7 +173,7 @@ void CGeoEditor::DeclareOptions(ui::DialogOptions& options) {
         return std::string();
     });
     options.Value("valeur", "CHAMP=NOMBRE", kValueHelp, [&batch](const std::string& value) {
-        const std::optional<ValueCriterion> criterion = ValueNamed(value);
+        const std::optional<ValueCriterion> criterion = ParseValueCriterion(value);
         if (!criterion) return Sprintf(kValueForm, value.c_str());
         batch.criteria.value = criterion;
         return std::string();

@@ -433,23 +433,7 @@ SearchCriteria CGeoEditorForm::Criteria() const {
     criteria.identifiers = m_searchIds;
     if (!m_searchCode.empty()) criteria.code = m_searchCode;
     if (m_searchKind > 0) criteria.kinds.push_back(kSearchKinds[m_searchKind - 1]);
-    if (!m_searchValue.empty()) {
-        // "Z > 102.35": a field, a comparison, a number.
-        const std::size_t at = m_searchValue.find_first_of("=<>");
-        if (at != std::string::npos) {
-            std::string name(Trimmed(std::string_view(m_searchValue).substr(0, at)));
-            for (char& c : name)
-                c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-            double value = 0.0;
-            const std::optional<FieldKey> key = FieldKeyFromName(name);
-            if (key && ParseTypedNumber(Trimmed(std::string_view(m_searchValue).substr(at + 1)), value))
-                criteria.value = ValueCriterion{*key,
-                                                m_searchValue[at] == '='   ? CompareOp::Equal
-                                                : m_searchValue[at] == '<' ? CompareOp::Less
-                                                                           : CompareOp::Greater,
-                                                value};
-        }
-    }
+    if (!m_searchValue.empty()) criteria.value = ParseValueCriterion(m_searchValue);
     return criteria;
 }
 

@@ -8,9 +8,25 @@
 
 #include <algorithm>
 #include <array>
+#include <cctype>
 #include <cstdint>
 
 namespace pyr {
+
+std::optional<ValueCriterion> ParseValueCriterion(std::string_view text) {
+    const std::size_t at = text.find_first_of("=<>");
+    if (at == std::string_view::npos || at == 0) return std::nullopt;
+    std::string name(Trimmed(text.substr(0, at)));
+    for (char& c : name)
+        c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+    const std::optional<FieldKey> key = FieldKeyFromName(name);
+    double value = 0.0;
+    if (!key || !ParseTypedNumber(Trimmed(text.substr(at + 1)), value)) return std::nullopt;
+    const CompareOp op = text[at] == '='   ? CompareOp::Equal
+                         : text[at] == '<' ? CompareOp::Less
+                                           : CompareOp::Greater;
+    return ValueCriterion{*key, op, value};
+}
 
 namespace {
 

@@ -5,6 +5,7 @@
 
 #include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 // The editor's search of a GéoBase: the elements of an identifier or a selection of identifiers, of a
@@ -31,6 +32,10 @@ struct SearchCriteria {
     std::vector<int> kinds;
     std::optional<ValueCriterion> value;
 };
+
+// A value criterion as a person writes it: a field's key name, a comparison and a number ("z>100.5",
+// "X = 651 200,25", "di<5"); nothing when the text is not one.
+std::optional<ValueCriterion> ParseValueCriterion(std::string_view text);
 
 // Why the criteria cannot be searched (an incorrect selection, with its faulty item), in French; empty
 // when they can. Search and FindNext find nothing for such criteria.
