@@ -115,6 +115,25 @@ void BM_EditorRedrawsItsSceneAfterAnEdit(benchmark::State& state) {
 }
 BENCHMARK(BM_EditorRedrawsItsSceneAfterAnEdit)->Unit(benchmark::kMillisecond);
 
+// A sighting's distance changed, then the change undone, the drawing asked for as the window does: what it
+// shows did not change, so it is not made again.
+void BM_EditorUndoesASightingsEditWithItsDrawing(benchmark::State& state) {
+    OpenWindow& window = Window();
+    const int sighting = window.editor.Carnet().Find(kKindMesure, "");
+    benchmark::DoNotOptimize(window.form->Scene(CGeoEditorForm::kDrawing));
+    for (auto _ : state) {
+        state.PauseTiming();
+        window.editor.Document().Select({sighting});
+        window.form->Act(window.frontEnd, CGeoEditorForm::kFieldEdit0 + 4,
+                         {ui::EventKind::Text, -1, false, "123.4567"});
+        state.ResumeTiming();
+        window.form->Act(window.frontEnd, CGeoEditorForm::kUndo, {});
+        window.ShowAgain(sighting);
+        benchmark::DoNotOptimize(window.form->Scene(CGeoEditorForm::kDrawing));
+    }
+}
+BENCHMARK(BM_EditorUndoesASightingsEditWithItsDrawing)->Unit(benchmark::kMillisecond);
+
 } // namespace
 
 } // namespace pyr::bench

@@ -45,6 +45,9 @@ struct Edit {
     std::string label; // what the editor's "Annuler" names: "Renumérotation de 12 points"
     std::vector<EditStep> steps;
     long serial = 0; // tells a saved state from another one
+    // Whether it changes what the drawing of the GéoBase shows: a sighting's readings or a code do not,
+    // a point moved or any element inserted or removed (the drawing names elements by index) does.
+    bool drawn = true;
 };
 
 class EditHistory {
@@ -55,6 +58,9 @@ public:
     bool CanRedo() const { return !m_undone.empty(); }
     const std::string& UndoLabel() const;
     const std::string& RedoLabel() const;
+    // Whether the edit the next undo (redo) takes back (makes again) changes the drawing.
+    bool UndoChangesDrawing() const { return !m_done.empty() && m_done.back().drawn; }
+    bool RedoChangesDrawing() const { return !m_undone.empty() && m_undone.back().drawn; }
     // False, with the edit dropped from the history, when the store did not take it back.
     bool Undo(CCarnet& carnet);
     bool Redo(CCarnet& carnet);

@@ -16,6 +16,30 @@ constexpr const char* kLabelRemove = "Suppression de %d élément(s)";
 constexpr const char* kLabelMove = "Déplacement de l'élément # %d";
 constexpr const char* kLabelDisable = "Désactivation de l'élément # %d";
 constexpr const char* kLabelEnable = "Réactivation de l'élément # %d";
+// Whether the drawing shows `before` and `after`, two states of an element of that kind, differently:
+// a point's place, height and invariance, a set-up's height and V0 (its description), the identifiers
+// that tie sightings to their points, a traverse's stations.
+bool DrawnDifferently(const CElement& before, const CElement& after, int kind) {
+    if (before.mat() != after.mat())
+        return IsSightingKind(kind) || kind == kKindPoint || kind == kKindStation || kind == kKindChemin;
+    switch (kind) {
+    case kKindPoint: {
+        const auto& a = static_cast<const CPointGen&>(before);
+        const auto& b = static_cast<const CPointGen&>(after);
+        return a.x() != b.x() || a.y() != b.y() || a.z() != b.z() || a.invariantXY() != b.invariantXY();
+    }
+    case kKindStation: {
+        const auto& a = static_cast<const CStation&>(before);
+        const auto& b = static_cast<const CStation&>(after);
+        return a.hi() != b.hi() || a.v0() != b.v0();
+    }
+    case kKindChemin:
+        return true;
+    default:
+        return false;
+    }
+}
+
 } // namespace
 
 bool CGeoDocument::Open(ui::FrontEnd& frontEnd, const std::string& path) {
@@ -27,6 +51,7 @@ bool CGeoDocument::Open(ui::FrontEnd& frontEnd, const std::string& path) {
     m_selection.clear();
     m_history.Clear();
     m_savedState = m_history.State();
+    ++m_drawingRevision;
     Notify(kPartElements | kPartSelection | kPartHistory | kPartFile);
     return true;
 }
@@ -70,6 +95,8 @@ void CGeoDocument::Select(std::vector<int> indices) {
 }
 
 void CGeoDocument::Recorded(Edit edit, bool structural) {
+    if (structural) edit.drawn = true;
+    if (edit.drawn) ++m_drawingRevision;
     m_history.Record(std::move(edit));
     int parts = kPartElements | kPartHistory;
     if (structural && !m_selection.empty()) {
@@ -86,9 +113,11 @@ bool CGeoDocument::Replace(std::string label, ElementReplacements replacements) 
             !ElementFitsKind(*r.element, m_carnet.GetType(r.index)))
             return false;
     if (replacements.empty()) return false;
-    Edit edit{label.empty() ? kLabelReplace : std::move(label), {}, 0};
+    Edit edit{label.empty() ? kLabelReplace : std::move(label), {}, 0, false};
     edit.steps.reserve(replacements.size());
     for (ElementReplacement& r : replacements) {
+        edit.drawn =
+            edit.drawn || DrawnDifferently(*m_carnet.GetAt(r.index), *r.element, m_carnet.GetType(r.index));
         m_carnet.ExchangeAt(r.index, r.element);
         edit.steps.push_back(EditStep::Exchanged(r.index, std::move(r.element)));
     }
@@ -100,7 +129,7 @@ bool CGeoDocument::Insert(int index, std::unique_ptr<CElement> element, int kind
     if (index < 0 || index > m_carnet.GetSize()) return false;
     const int at = m_carnet.InsertAt(index, std::move(element), kind);
     if (at < 0) return false;
-    Edit edit{Sprintf(kLabelInsert, at + 1), {}, 0};
+    Edit edit{Sprintf(kLabelInsert, at + 1), {}, 0, true};
     edit.steps.push_back(EditStep::Inserted(at));
     Recorded(std::move(edit), true);
     return true;
@@ -112,7 +141,7 @@ bool CGeoDocument::Remove(const std::vector<int>& indices) {
     sorted.erase(std::unique(sorted.begin(), sorted.end()), sorted.end());
     if (sorted.empty() || !m_carnet.IsValidIndex(sorted.front()) || !m_carnet.IsValidIndex(sorted.back()))
         return false;
-    Edit edit{Sprintf(kLabelRemove, static_cast<int>(sorted.size())), {}, 0};
+    Edit edit{Sprintf(kLabelRemove, static_cast<int>(sorted.size())), {}, 0, true};
     edit.steps.reserve(sorted.size());
     // From the last one, so that the indices of those still to remove stand.
     for (auto index = sorted.rbegin(); index != sorted.rend(); ++index) {
@@ -132,7 +161,7 @@ bool CGeoDocument::Move(int from, int to) {
     std::unique_ptr<CElement> copy = m_carnet.copyElement(from);
     std::unique_ptr<CElement> element = m_carnet.TakeAt(from, kind);
     m_carnet.InsertAt(to, std::move(element), kind);
-    Edit edit{Sprintf(kLabelMove, from + 1), {}, 0};
+    Edit edit{Sprintf(kLabelMove, from + 1), {}, 0, true};
     edit.steps.push_back(EditStep::Removed(from, std::move(copy), kind));
     edit.steps.push_back(EditStep::Inserted(to));
     Recorded(std::move(edit), true);
@@ -148,9 +177,12 @@ bool CGeoDocument::Toggle(ui::FrontEnd& frontEnd, int index, bool disable) {
                                  : m_carnet.changeCommentIntoObject(&txt, index);
     if (!changed) return false;
     // The element of one kind removed, the one of the other kind inserted in its place.
-    Edit edit{Sprintf(disable ? kLabelDisable : kLabelEnable, index + 1), {}, 0};
+    Edit edit{Sprintf(disable ? kLabelDisable : kLabelEnable, index + 1), {}, 0, true};
     edit.steps.push_back(EditStep::Removed(index, std::move(before), kind));
     edit.steps.push_back(EditStep::Inserted(index));
+    edit.drawn = kind != kKindComment ? IsSightingKind(kind) || kind == kKindPoint || kind == kKindStation ||
+                                            kind == kKindChemin
+                                      : true;
     Recorded(std::move(edit), false);
     return true;
 }
@@ -165,7 +197,7 @@ bool CGeoDocument::Enable(ui::FrontEnd& frontEnd, int index) {
 
 void CGeoDocument::RecordChanges(std::string label, ElementChanges changes) {
     if (changes.empty()) return;
-    Edit edit{std::move(label), {}, 0};
+    Edit edit{std::move(label), {}, 0, true};
     edit.steps.reserve(changes.size());
     for (ElementChange& change : changes)
         edit.steps.push_back(EditStep::Exchanged(change.index, std::move(change.other)));
@@ -174,6 +206,7 @@ void CGeoDocument::RecordChanges(std::string label, ElementChanges changes) {
 
 void CGeoDocument::ForgetHistory() {
     m_history.Clear();
+    ++m_drawingRevision;
     m_savedState = -1;
     m_selection.clear();
     Notify(kPartElements | kPartHistory | kPartSelection);
@@ -181,6 +214,7 @@ void CGeoDocument::ForgetHistory() {
 
 bool CGeoDocument::Undo() {
     if (!m_history.CanUndo()) return false;
+    if (m_history.UndoChangesDrawing()) ++m_drawingRevision;
     const bool undone = m_history.Undo(m_carnet);
     // The indices of a selection no longer name the same elements after an insertion or a removal.
     m_selection.clear();
@@ -190,6 +224,7 @@ bool CGeoDocument::Undo() {
 
 bool CGeoDocument::Redo() {
     if (!m_history.CanRedo()) return false;
+    if (m_history.RedoChangesDrawing()) ++m_drawingRevision;
     const bool redone = m_history.Redo(m_carnet);
     m_selection.clear();
     Notify(kPartElements | kPartHistory | kPartSelection);

@@ -41,6 +41,9 @@ public:
     bool CanClose(ui::FrontEnd& frontEnd);
     const std::string& Path() const { return m_path; }
     bool Modified() const { return m_history.State() != m_savedState; }
+    // Changes whenever what the drawing of the GéoBase shows may have changed: the drawing of a million
+    // elements is not made again for a sighting's distance or a code.
+    long DrawingRevision() const { return m_drawingRevision; }
     const CCarnet& Carnet() const { return m_carnet; }
     // The GéoBase for a dialog that changes it in place (the change of frame, the reading of a field
     // book): what it changed comes back through RecordChanges, or the history is cleared.
@@ -89,6 +92,7 @@ private:
     std::vector<int> m_selection;
     EditHistory m_history;
     long m_savedState = 0;
+    long m_drawingRevision = 0;
 };
 
 } // namespace pyr

@@ -57,6 +57,8 @@ CGeoEditorForm::CGeoEditorForm(CGeoEditor& editor)
     m_listener = m_editor.Listen([this](int parts) {
         if (parts & (CGeoEditor::kPartGeoBase | CGeoEditor::kPartDocuments | CGeoEditor::kPartFile))
             ElementsChanged();
+        // Another GéoBase is drawn, even if it took the place in memory of one closed.
+        if (parts & CGeoEditor::kPartDocuments) m_drawnDocument = nullptr;
     });
 }
 
@@ -258,11 +260,21 @@ std::string CGeoEditorForm::OnDemandRow(int id, int rank) const {
     return ViewRow(m_editor.Carnet(), EditorViews()[static_cast<std::size_t>(view)], index);
 }
 
+long CGeoEditorForm::DrawingRevision() const {
+    const CGeoDocument& document = m_editor.Document();
+    if (&document != m_drawnDocument || document.DrawingRevision() != m_drawnDocumentRevision) {
+        m_drawnDocument = &document;
+        m_drawnDocumentRevision = document.DrawingRevision();
+        ++m_drawingRevision;
+    }
+    return m_drawingRevision;
+}
+
 const GeoScene* CGeoEditorForm::Scene(int id) const {
     if (id != kDrawing) return nullptr;
-    if (m_sceneRevision != m_revision) {
+    if (m_sceneRevision != DrawingRevision()) {
         m_scene.Build(m_editor.Carnet());
-        m_sceneRevision = m_revision;
+        m_sceneRevision = m_drawingRevision;
     }
     return &m_scene;
 }
@@ -343,7 +355,7 @@ ui::ControlState CGeoEditorForm::State(int id) const {
         state.current = m_view;
         break;
     case kDrawing:
-        state.revision = m_revision;
+        state.revision = DrawingRevision();
         state.selection = document.Selection();
         break;
     case kElementGroup:

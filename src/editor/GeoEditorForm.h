@@ -115,8 +115,14 @@ private:
     // By view, the indices of its elements, made again when the revision changed.
     mutable std::vector<std::vector<int>> m_indices;
     mutable std::vector<long> m_indicesRevision;
+    // The drawing's revision: changes when another GéoBase is shown, or when the one shown changed what
+    // it draws; the scene is made again only then.
+    long DrawingRevision() const;
     mutable GeoScene m_scene;
     mutable long m_sceneRevision = 0;
+    mutable long m_drawingRevision = 1;
+    mutable const CGeoDocument* m_drawnDocument = nullptr;
+    mutable long m_drawnDocumentRevision = -1;
     // What the search and the renumbering fields hold.
     std::string m_searchIds, m_searchCode, m_searchValue;
     int m_searchKind = 0;

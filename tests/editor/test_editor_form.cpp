@@ -207,6 +207,38 @@ TEST_F(EditorForm, EveryEditIsUndoneAndRedoneToTheSameBytes) {
     EXPECT_EQ(ReadBytes(dir / "job.geo"), edited);
 }
 
+// The drawing of a million elements is made again only when what it shows changed: not for a sighting's
+// distance or a comment, but for a point moved, an element removed, and their undoing.
+TEST_F(EditorForm, TheDrawingIsMadeAgainOnlyWhenWhatItShowsChanged) {
+    const auto revision = [this] { return form->State(CGeoEditorForm::kDrawing).revision; };
+    const pyr::GeoScene* scene = form->Scene(CGeoEditorForm::kDrawing);
+    ASSERT_NE(scene, nullptr);
+    long seen = revision();
+
+    Act(CGeoEditorForm::TableOf(0), Select({2})); // the sighting of A1
+    Act(CGeoEditorForm::kFieldEdit0 + 4, Typed("260.5"));
+    Act(CGeoEditorForm::TableOf(0), Select({0})); // the comment
+    Act(CGeoEditorForm::kFieldEdit0, Typed("Levé du 3 mars"));
+    Act(CGeoEditorForm::kUndo);
+    EXPECT_EQ(revision(), seen);
+
+    Act(CGeoEditorForm::TableOf(0), Select({4})); // the point A1 moved
+    Act(CGeoEditorForm::kFieldEdit0 + 1, Typed("651060"));
+    EXPECT_NE(revision(), seen);
+    seen = revision();
+    EXPECT_EQ(form->Scene(CGeoEditorForm::kDrawing)->Points()[0].x, 651060.0);
+    Act(CGeoEditorForm::kUndo);
+    EXPECT_NE(revision(), seen);
+    seen = revision();
+    EXPECT_EQ(form->Scene(CGeoEditorForm::kDrawing)->Points()[0].x, 651050.118);
+    Act(CGeoEditorForm::kUndo); // the sighting's distance: not drawn
+    EXPECT_EQ(revision(), seen);
+    Act(CGeoEditorForm::TableOf(0), Select({0}));
+    Act(CGeoEditorForm::kRemove); // every element after it changes its number
+    EXPECT_NE(revision(), seen);
+    EXPECT_EQ(form->Scene(CGeoEditorForm::kDrawing)->Points()[0].element, 3);
+}
+
 // A value the GéoBase cannot hold is refused with the reason its validation gives, and nothing changes.
 TEST_F(EditorForm, AnInvalidFieldIsRefusedWithItsMessageAndChangesNothing) {
     Act(CGeoEditorForm::TableOf(0), Select({2}));
