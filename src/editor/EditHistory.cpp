@@ -16,6 +16,21 @@ EditStep EditStep::Removed(int index, std::unique_ptr<CElement> element, int kin
     return EditStep(Op::Remove, index, std::move(element), kind);
 }
 
+EditStep EditStep::RemovedMany(std::vector<CCarnet::Taken> taken) {
+    EditStep step(Op::RemoveMany, -1, nullptr, 0);
+    step.m_indices.reserve(taken.size());
+    for (const CCarnet::Taken& each : taken)
+        step.m_indices.push_back(each.index);
+    step.m_taken = std::move(taken);
+    return step;
+}
+
+bool EditStep::TakeManyOut(CCarnet& carnet) {
+    if (m_indices.empty() || !carnet.IsValidIndex(m_indices.back())) return false;
+    m_taken = carnet.TakeMany(m_indices);
+    return true;
+}
+
 bool EditStep::PutBack(CCarnet& carnet) {
     if (!m_element || m_index > carnet.GetSize()) return false;
     if (carnet.InsertAt(m_index, std::move(m_element), m_kind) < 0) return false;
@@ -33,6 +48,8 @@ bool EditStep::Undo(CCarnet& carnet) {
         return Exchange(carnet);
     case Op::Insert:
         return TakeOut(carnet);
+    case Op::RemoveMany:
+        return carnet.PutBackMany(m_taken);
     case Op::Remove:
         break;
     }
@@ -45,6 +62,8 @@ bool EditStep::Redo(CCarnet& carnet) {
         return Exchange(carnet);
     case Op::Insert:
         return PutBack(carnet);
+    case Op::RemoveMany:
+        return TakeManyOut(carnet);
     case Op::Remove:
         break;
     }

@@ -21,6 +21,8 @@ public:
     static EditStep Inserted(int index);
     // The element `element` of kind `kind` was removed from `index`.
     static EditStep Removed(int index, std::unique_ptr<CElement> element, int kind);
+    // Several elements were removed together (CCarnet::TakeMany).
+    static EditStep RemovedMany(std::vector<CCarnet::Taken> taken);
 
     // Takes the step back, then makes it again: false, and nothing changed, when the store no longer
     // holds what the step expects (it was changed behind the history's back).
@@ -28,17 +30,20 @@ public:
     bool Redo(CCarnet& carnet);
 
 private:
-    enum class Op { Exchange, Insert, Remove };
+    enum class Op { Exchange, Insert, Remove, RemoveMany };
     EditStep(Op op, int index, std::unique_ptr<CElement> element, int kind)
         : m_op(op), m_index(index), m_kind(kind), m_element(std::move(element)) {}
     bool Exchange(CCarnet& carnet) { return carnet.ExchangeAt(m_index, m_element); }
     bool PutBack(CCarnet& carnet);
     bool TakeOut(CCarnet& carnet);
+    bool TakeManyOut(CCarnet& carnet);
 
     Op m_op;
     int m_index;
     int m_kind = 0;
     std::unique_ptr<CElement> m_element; // held while it is not in the store
+    std::vector<CCarnet::Taken> m_taken; // the same for several elements
+    std::vector<int> m_indices;          // theirs, to take them out again
 };
 
 struct Edit {

@@ -142,12 +142,12 @@ bool CGeoDocument::Remove(const std::vector<int>& indices) {
     if (sorted.empty() || !m_carnet.IsValidIndex(sorted.front()) || !m_carnet.IsValidIndex(sorted.back()))
         return false;
     Edit edit{Sprintf(kLabelRemove, static_cast<int>(sorted.size())), {}, 0, true};
-    edit.steps.reserve(sorted.size());
-    // From the last one, so that the indices of those still to remove stand.
-    for (auto index = sorted.rbegin(); index != sorted.rend(); ++index) {
+    if (sorted.size() == 1) { // the store's index follows one removal without being built again
         int kind = 0;
-        std::unique_ptr<CElement> element = m_carnet.TakeAt(*index, kind);
-        edit.steps.push_back(EditStep::Removed(*index, std::move(element), kind));
+        std::unique_ptr<CElement> element = m_carnet.TakeAt(sorted.front(), kind);
+        edit.steps.push_back(EditStep::Removed(sorted.front(), std::move(element), kind));
+    } else {
+        edit.steps.push_back(EditStep::RemovedMany(m_carnet.TakeMany(sorted)));
     }
     Recorded(std::move(edit), true);
     return true;

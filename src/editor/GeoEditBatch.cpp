@@ -9,7 +9,6 @@
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
-#include <cctype>
 #include <charconv>
 
 namespace pyr {
@@ -212,7 +211,7 @@ ui::DialogResult CGeoEditor::Run(ui::FrontEnd& frontEnd) {
         auto fresh = std::make_unique<CGeoDocument>();
         fresh->Store().SetPathName(*path);
         Adopt(std::move(fresh));
-    } else if (!Load(*path, txt, frontEnd)) {
+    } else if (!Load(*path, frontEnd)) {
         return ui::DialogResult::Failed;
     }
 

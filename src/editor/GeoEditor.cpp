@@ -143,8 +143,7 @@ std::optional<std::string> CGeoEditor::ChosenGeoBase(ui::FrontEnd& frontEnd) con
     return path;
 }
 
-bool CGeoEditor::Load(const std::string& path, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd) {
-    (void)txt;
+bool CGeoEditor::Load(const std::string& path, ui::FrontEnd& frontEnd) {
     auto document = std::make_unique<CGeoDocument>();
     if (!document->Open(frontEnd, path)) return false;
     // The next command opens the last GéoBase: never a file that is not one.
@@ -164,8 +163,7 @@ bool CGeoEditor::Load(const std::string& path, CPyrTxtWnd& txt, ui::FrontEnd& fr
 ui::DialogResult CGeoEditor::OpenGeoBase(ui::FrontEnd& frontEnd) {
     const std::optional<std::string> path = ChosenGeoBase(frontEnd);
     if (!path) return ui::DialogResult::Cancel;
-    CPyrTxtWnd txt(frontEnd);
-    return Load(*path, txt, frontEnd) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+    return Load(*path, frontEnd) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
 }
 
 ui::DialogResult CGeoEditor::OpenAnother(ui::FrontEnd& frontEnd) {
@@ -178,8 +176,7 @@ ui::DialogResult CGeoEditor::OpenAnother(ui::FrontEnd& frontEnd) {
             SetCurrentDocument(rank); // its edits are kept: it is not read again
             return ui::DialogResult::Ok;
         }
-    CPyrTxtWnd txt(frontEnd);
-    return Load(*chosen, txt, frontEnd) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
+    return Load(*chosen, frontEnd) ? ui::DialogResult::Ok : ui::DialogResult::Failed;
 }
 
 bool CGeoEditor::Save(ui::FrontEnd& frontEnd) {

@@ -147,7 +147,7 @@ private:
     std::optional<std::string> ChosenGeoBase(ui::FrontEnd& frontEnd) const;
     // Opens that GéoBase as the current one (read again when it is open) and records it as the last one
     // used, unless it is no GéoBase.
-    bool Load(const std::string& path, CPyrTxtWnd& txt, ui::FrontEnd& frontEnd);
+    bool Load(const std::string& path, ui::FrontEnd& frontEnd);
     // A new document, current, listened to.
     CGeoDocument& Adopt(std::unique_ptr<CGeoDocument> document);
     // Saves the current GéoBase after a dialog changed it, the former file backed up.

@@ -9,7 +9,6 @@
 #include "ui/FrontEnd.h"
 
 #include <algorithm>
-#include <cctype>
 #include <charconv>
 #include <filesystem>
 

@@ -118,6 +118,55 @@ std::unique_ptr<CElement> CCarnet::TakeAt(int index, int& kind) {
     return element;
 }
 
+std::vector<CCarnet::Taken> CCarnet::TakeMany(const std::vector<int>& indices) {
+    std::vector<Taken> taken;
+    taken.reserve(indices.size());
+    std::size_t kept = 0;
+    std::size_t next = 0; // the next index to take
+    for (std::size_t i = 0; i < m_elements.size(); ++i) {
+        if (next < indices.size() && static_cast<std::size_t>(indices[next]) == i) {
+            m_elements[i]->m_inStore = false;
+            taken.push_back({indices[next++], m_kinds[i], std::move(m_elements[i])});
+            continue;
+        }
+        if (kept != i) {
+            m_elements[kept] = std::move(m_elements[i]);
+            m_kinds[kept] = m_kinds[i];
+        }
+        ++kept;
+    }
+    m_elements.resize(kept);
+    m_kinds.resize(kept);
+    Changed();
+    return taken;
+}
+
+bool CCarnet::PutBackMany(std::vector<Taken>& taken) {
+    const std::size_t total = m_elements.size() + taken.size();
+    for (std::size_t k = 0; k < taken.size(); ++k)
+        if (!taken[k].element || static_cast<std::size_t>(taken[k].index) >= total ||
+            (k > 0 && taken[k].index <= taken[k - 1].index))
+            return false;
+    std::vector<std::unique_ptr<CElement>> elements(total);
+    std::vector<int> kinds(total);
+    std::size_t from = 0, next = 0;
+    for (std::size_t i = 0; i < total; ++i) {
+        if (next < taken.size() && static_cast<std::size_t>(taken[next].index) == i) {
+            taken[next].element->m_inStore = true;
+            elements[i] = std::move(taken[next].element);
+            kinds[i] = taken[next++].kind;
+        } else {
+            elements[i] = std::move(m_elements[from]);
+            kinds[i] = m_kinds[from++];
+        }
+    }
+    m_elements = std::move(elements);
+    m_kinds = std::move(kinds);
+    taken.clear();
+    Changed();
+    return true;
+}
+
 void CCarnet::RemoveRange(int first, int last) {
     first = std::max(first, 0);
     last = std::min(last, GetSize());

@@ -56,6 +56,19 @@ public:
     // Removes the element at that index and hands it over with its kind (an edit that may be undone keeps
     // it); null, and nothing changed, outside the store.
     std::unique_ptr<CElement> TakeAt(int index, int& kind);
+    // Elements taken out of the store together, each with its kind and the index it had.
+    struct Taken {
+        int index = -1;
+        int kind = 0;
+        std::unique_ptr<CElement> element;
+    };
+    // Removes the elements at those indices (increasing, each once, inside the store) in one pass over
+    // the store, and hands them over: removing a hundred thousand elements found by a search must not
+    // move the million others a hundred thousand times.
+    std::vector<Taken> TakeMany(const std::vector<int>& indices);
+    // Puts elements taken by TakeMany back at their indices, in one pass. False, and nothing changed, when
+    // they cannot stand there (an index beyond the store once the others are back).
+    bool PutBackMany(std::vector<Taken>& taken);
     // Removes the elements of [first, last).
     void RemoveRange(int first, int last);
     void RemoveAll();
