@@ -3,6 +3,7 @@
 // What the benchmarks of the field-book readers share: the random numbers of their generated books, the
 // book written once to a temporary folder, and the conversion measured as a reading command does it (the
 // file read and converted, the new GéoBase written beside it, its size checked).
+#include "FieldBookGenerator.h"
 #include "MemoryUse.h"
 #include "fieldbook/FieldBookReader.h"
 
@@ -17,19 +18,7 @@ namespace pyr::bench {
 
 inline constexpr int kMillionLines = 1'000'000;
 
-// The same numbers on every machine and every run, so that two runs measure the same field book.
-class BookRandom {
-public:
-    explicit BookRandom(std::uint64_t seed) : m_state(seed) {}
-    // A whole number in [0, range).
-    long long Next(long long range) {
-        m_state = m_state * 6364136223846793005ULL + 1442695040888963407ULL;
-        return static_cast<long long>((m_state >> 33) % static_cast<std::uint64_t>(range));
-    }
-
-private:
-    std::uint64_t m_state;
-};
+using books::BookRandom;
 
 // A generated field book in a temporary folder of its own, with the path of the GéoBase made from it.
 class GeneratedFieldBook {
