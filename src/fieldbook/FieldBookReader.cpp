@@ -1,5 +1,6 @@
 #include "fieldbook/FieldBookReader.h"
 
+#include "core/FileLines.h"
 #include "core/Files.h"
 #include "core/Lines.h"
 #include "core/Strings.h"
@@ -62,45 +63,84 @@ std::string CFieldBookReader::OpenFailure(const std::string& path, int code) con
 }
 
 bool CFieldBookReader::Read(const std::string& path, CCarnet& result) {
-    std::string bytes;
-    if (!ReadWholeFile(path, bytes)) {
+    // The book is read by chunks, never whole: its lines become elements as they come.
+    FileLines file;
+    const int before = result.GetSize();
+    bool read = file.Open(path);
+    if (read) {
+        m_path = path;
+        // Started at the first line, so that a book found to be in Windows-1252 within its first
+        // megabytes (where the accents of a header lie) says so before the creation is announced.
+        bool started = false;
+        read = file.ForEach(
+            [&](const FileLines::Line& line) {
+                if (!started) Start(result);
+                started = true;
+                ReadOne(line.text, line.number, line.unterminated && !TrimmedOfControls(line.text).empty(),
+                        line.end, file.Size());
+            },
+            [&] {
+                if (m_txt) m_txt->Print(fb::kReadAsWindows1252, m_path.c_str());
+            });
+        if (read && !started) Start(result);
+        // A book that cannot be read to its end adds nothing.
+        if (!read) {
+            const int code = errno;
+            m_result = nullptr;
+            result.RemoveRange(before, result.GetSize());
+            errno = code;
+        } else {
+            Finish(result);
+        }
+    }
+    if (!read) {
         const int code = errno;
         ui::FrontEnd& frontEnd = m_parent ? *m_parent : ui::ApplicationFrontEnd();
         frontEnd.MessageBox(OpenFailure(path, code), ui::kCaption, ui::kIconWarning);
         return false;
     }
-    m_path = path;
-    ReadText(bytes, result);
     return true;
 }
 
 void CFieldBookReader::ReadText(std::string_view bytes, CCarnet& result) {
     if (bytes.starts_with("\xEF\xBB\xBF")) bytes.remove_prefix(3);
     // Valid UTF-8 is read where it lies: a million-line field book is not copied once more.
-    if (IsValidUtf8(bytes)) return Run(bytes, result);
-    if (!m_path.empty() && m_txt) m_txt->Print(fb::kReadAsWindows1252, m_path.c_str());
-    Run(Windows1252ToUtf8(bytes), result);
+    std::string converted;
+    if (!IsValidUtf8(bytes)) {
+        if (!m_path.empty() && m_txt) m_txt->Print(fb::kReadAsWindows1252, m_path.c_str());
+        converted = Windows1252ToUtf8(bytes);
+        bytes = converted;
+    }
+    Start(result);
+    ForEachLine(bytes, [&](std::string_view line, int number) {
+        ReadOne(line, number, IsCutLastLine(bytes, line),
+                static_cast<std::size_t>(line.data() - bytes.data()) + line.size(), bytes.size());
+    });
+    Finish(result);
 }
 
-void CFieldBookReader::Run(std::string_view text, CCarnet& result) {
+void CFieldBookReader::Start(CCarnet& result) {
     m_result = &result;
     if (m_announced) Print(fb::kCreating);
     m_start = m_lastProgress = std::chrono::steady_clock::now();
     BeginReading();
     if (Choices().writeInstrument) AddInstrument();
-    ForEachLine(text, [&](std::string_view line, int number) {
-        if (IsCutLastLine(text, line)) LineError(fb::kCutLastLine, number);
-        ReadLine(line, number);
-        if (number % kProgressStride == 0)
-            ShowProgress(number, static_cast<std::size_t>(line.data() - text.data()) + line.size(),
-                         text.size());
-    });
+}
+
+void CFieldBookReader::ReadOne(std::string_view line, int number, bool cut, std::uint64_t offset,
+                               std::uint64_t size) {
+    if (cut) LineError(fb::kCutLastLine, number);
+    ReadLine(line, number);
+    if (number % kProgressStride == 0) ShowProgress(number, offset, size);
+}
+
+void CFieldBookReader::Finish(CCarnet& result) {
     EndReading();
     if (m_announced && m_txt) m_txt->Print(fb::kFinished, result.GetSize());
     m_result = nullptr;
 }
 
-void CFieldBookReader::ShowProgress(int number, std::size_t offset, std::size_t size) {
+void CFieldBookReader::ShowProgress(int number, std::uint64_t offset, std::uint64_t size) {
     const auto now = std::chrono::steady_clock::now();
     if (!m_txt || now - m_start < kProgressDelay || now - m_lastProgress < kProgressDelay) return;
     m_lastProgress = now;

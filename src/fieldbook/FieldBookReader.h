@@ -4,6 +4,7 @@
 #include "settings/OptionInstruments.h"
 
 #include <chrono>
+#include <cstdint>
 #include <memory>
 #include <string>
 #include <string_view>
@@ -147,9 +148,13 @@ protected:
     const std::string& Path() const { return m_path; }
 
 private:
-    void Run(std::string_view text, CCarnet& result);
+    // The steps of a reading: before the first line, each line (`cut` when it is a last line that the
+    // transfer seems to have cut; `offset` where it ends in the book of `size` bytes), after the last.
+    void Start(CCarnet& result);
+    void ReadOne(std::string_view line, int number, bool cut, std::uint64_t offset, std::uint64_t size);
+    void Finish(CCarnet& result);
     void AddInstrument();
-    void ShowProgress(int number, std::size_t offset, std::size_t size);
+    void ShowProgress(int number, std::uint64_t offset, std::uint64_t size);
 
     const ReadingChoices* m_choices = nullptr;
     const CTableCode* m_table = nullptr;
