@@ -8,6 +8,7 @@
 #include "geobase/Carnet.h"
 
 #include <cmath>
+#include <limits>
 
 namespace pyr {
 
@@ -39,13 +40,15 @@ void CheckReference(const StationPlace& station, const V0Reference& ref, double 
 }
 
 // The sightings of a kind (or of both kinds, for 0) of the station that aim at points with known planimetry.
-std::vector<int> SightingsOfKnownPoints(const CCarnet& carnet, int stationIndex, int kind) {
+std::vector<int> SightingsOfKnownPoints(PointPlaces& places, int stationIndex, int kind) {
+    const CCarnet& carnet = places.Carnet();
     std::vector<int> sightings;
     int end = carnet.Find(kKindStation, "", stationIndex + 1);
     if (end < 0) end = carnet.GetSize();
+    double x, y, z;
     for (int i = stationIndex + 1; i < end; ++i) {
         const int found = carnet.GetType(i);
-        if (IsSightingKind(found) && (kind == 0 || found == kind) && carnet.hasXY(carnet.GetAt(i)->mat()))
+        if (IsSightingKind(found) && (kind == 0 || found == kind) && places.Of(i, x, y, z))
             sightings.push_back(i);
     }
     return sightings;
@@ -53,17 +56,46 @@ std::vector<int> SightingsOfKnownPoints(const CCarnet& carnet, int stationIndex,
 
 } // namespace
 
+PointPlaces::PointPlaces(const CCarnet& carnet, bool remember) : m_carnet(carnet) {
+    if (remember)
+        m_places.assign(static_cast<std::size_t>(carnet.NameCount()),
+                        {std::numeric_limits<double>::quiet_NaN(), kUndefined, kUndefined});
+}
+
+bool PointPlaces::Of(int index, double& x, double& y, double& z) {
+    // The element leads to its point's elements through its identifier's rank, its name never searched.
+    const int rank = m_places.empty() ? -1 : m_carnet.NameRank(index);
+    if (rank < 0) return PointPlaceOf(m_carnet, index, x, y, z);
+    Place& place = m_places[static_cast<std::size_t>(rank)];
+    if (std::isnan(place.x)) PointPlaceOf(m_carnet, index, place.x, place.y, place.z);
+    x = place.x, y = place.y, z = place.z;
+    return IsKnown(x);
+}
+
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex) {
-    return SightingsOfKnownPoints(carnet, stationIndex, 0);
+    PointPlaces places(carnet, false);
+    return SightingsOfKnownPoints(places, stationIndex, 0);
+}
+
+std::vector<int> DefaultReferences(PointPlaces& places, int stationIndex) {
+    std::vector<int> references = SightingsOfKnownPoints(places, stationIndex, kKindReference);
+    return references.empty() ? SightingsOfKnownPoints(places, stationIndex, 0) : references;
 }
 
 std::vector<int> DefaultReferences(const CCarnet& carnet, int stationIndex) {
-    std::vector<int> references = SightingsOfKnownPoints(carnet, stationIndex, kKindReference);
-    return references.empty() ? OfferedReferences(carnet, stationIndex) : references;
+    PointPlaces places(carnet, false);
+    return DefaultReferences(places, stationIndex);
 }
 
 V0Reference PrepareReference(const CCarnet& carnet, const StationPlace& station, int sighting,
                              const V0Settings& settings, std::vector<std::string>& warnings) {
+    PointPlaces places(carnet, false);
+    return PrepareReference(places, station, sighting, settings, warnings);
+}
+
+V0Reference PrepareReference(PointPlaces& places, const StationPlace& station, int sighting,
+                             const V0Settings& settings, std::vector<std::string>& warnings) {
+    const CCarnet& carnet = places.Carnet();
     V0Reference ref;
     ref.index = sighting;
     const auto* visee = carnet.As<CVisee>(sighting);
@@ -72,7 +104,7 @@ V0Reference PrepareReference(const CCarnet& carnet, const StationPlace& station,
         return ref;
     }
     ref.mat = visee->mat();
-    if (!PointPlace(carnet, ref.mat, ref.x, ref.y, ref.z) || !station.HasPlace()) {
+    if (!places.Of(sighting, ref.x, ref.y, ref.z) || !station.HasPlace()) {
         ref.valid = false;
         return ref;
     }
@@ -162,15 +194,21 @@ void SolveV0(V0Result& result, const V0Settings& settings) {
     result.computed = true;
 }
 
-V0Result ComputeStationV0(const CCarnet& carnet, const StationPlace& station,
-                          const std::vector<int>& sightings, const V0Settings& settings) {
+V0Result ComputeStationV0(PointPlaces& places, const StationPlace& station, const std::vector<int>& sightings,
+                          const V0Settings& settings) {
     V0Result result;
     result.station = station;
     result.references.reserve(sightings.size());
     for (int sighting : sightings)
-        result.references.push_back(PrepareReference(carnet, station, sighting, settings, result.warnings));
+        result.references.push_back(PrepareReference(places, station, sighting, settings, result.warnings));
     SolveV0(result, settings);
     return result;
+}
+
+V0Result ComputeStationV0(const CCarnet& carnet, const StationPlace& station,
+                          const std::vector<int>& sightings, const V0Settings& settings) {
+    PointPlaces places(carnet, false);
+    return ComputeStationV0(places, station, sightings, settings);
 }
 
 double RoundV0(double v0) {

@@ -58,17 +58,40 @@ struct V0Result {
     bool written = false;              // written into the GéoBase's station
 };
 
+// The places of the points that sightings name, as PointPlaceOf gives them. Orienting every station of a
+// job reads each reference point once, and not again for each station that sights it: with `remember`,
+// each place found is kept in a table of the GéoBase's identifiers (made for the computation of many
+// stations, since it is as long as the identifiers are many). Valid while the GéoBase does not change.
+class PointPlaces {
+public:
+    PointPlaces(const CCarnet& carnet, bool remember);
+
+    const CCarnet& Carnet() const { return m_carnet; }
+    // The place of the point that the element at `index` names; false when its planimetry is unknown.
+    bool Of(int index, double& x, double& y, double& z);
+
+private:
+    struct Place {
+        double x, y, z; // x is NaN until the place is looked up
+    };
+    const CCarnet& m_carnet;
+    std::vector<Place> m_places; // by the rank of the identifier; empty when nothing is kept
+};
+
 // The sightings of a station occurrence that can orient it: its references and measured sightings of
 // points whose planimetry is known, in GéoBase order.
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex);
 // Those chosen at first among them: the reference sightings (1002), or all when there is none.
 std::vector<int> DefaultReferences(const CCarnet& carnet, int stationIndex);
+std::vector<int> DefaultReferences(PointPlaces& places, int stationIndex);
 
 // The partial orientation of one sighting from the station: the sighting turned to face left, reduced
 // for its eccentric offsets, its horizontal distance corrected for scale and checked, with the
 // reference's coordinates, against the tolerances of distances and height differences. The warnings of
 // those checks are appended to `warnings`; the reference stays in the computation all the same.
 V0Reference PrepareReference(const CCarnet& carnet, const StationPlace& station, int sighting,
+                             const V0Settings& settings, std::vector<std::string>& warnings);
+V0Reference PrepareReference(PointPlaces& places, const StationPlace& station, int sighting,
                              const V0Settings& settings, std::vector<std::string>& warnings);
 
 // The mean of the valid references of `result`, dropping the worst out of tolerance one at a time
@@ -78,6 +101,8 @@ void SolveV0(V0Result& result, const V0Settings& settings);
 // The whole computation of a station from the chosen sightings.
 V0Result ComputeStationV0(const CCarnet& carnet, const StationPlace& station,
                           const std::vector<int>& sightings, const V0Settings& settings);
+V0Result ComputeStationV0(PointPlaces& places, const StationPlace& station, const std::vector<int>& sightings,
+                          const V0Settings& settings);
 
 // A V0 brought into [0, 400) and rounded to 6 decimals; a full turn is 0.
 double RoundV0(double v0);

@@ -201,11 +201,16 @@ void CCalculV0Sta::Show(const V0Result& result) {
 
 // A station computed again replaces its earlier result, in its place.
 void CCalculV0Sta::Keep(V0Result result) {
-    const auto [at, added] = m_resultOf.try_emplace(result.station.index, m_results.size());
-    if (added)
-        m_results.push_back(std::move(result));
-    else
-        m_results[at->second] = std::move(result);
+    const auto at = static_cast<std::size_t>(result.station.index);
+    if (at >= m_resultOf.size())
+        m_resultOf.resize(std::max(at + 1, static_cast<std::size_t>(Carnet().GetSize())), -1);
+    int& rank = m_resultOf[at];
+    if (rank >= 0) {
+        m_results[static_cast<std::size_t>(rank)] = std::move(result);
+        return;
+    }
+    rank = static_cast<int>(m_results.size());
+    m_results.push_back(std::move(result));
 }
 
 bool CCalculV0Sta::CalculateStation() {
@@ -243,6 +248,8 @@ int CCalculV0Sta::CalculateList() {
     CPyrTxtWnd txt(*m_frontEnd);
     int computed = 0, named = 0;
     m_notComputable = 0;
+    // Stations rest on the same control points: each one's place is looked up once for them all.
+    PointPlaces places(Carnet(), true);
     for (int i = Carnet().Find(kKindStation, ""); i >= 0; i = Carnet().Find(kKindStation, "", i + 1)) {
         if (selection && !selection->Contains(Carnet().GetAt(i)->mat())) continue;
         ++named;
@@ -253,7 +260,7 @@ int CCalculV0Sta::CalculateList() {
                       Sprintf(v0::kMsgStationWithoutCoordinates, station.name.c_str()).c_str());
             continue;
         }
-        V0Result result = ComputeStationV0(Carnet(), station, DefaultReferences(Carnet(), i), m_settings);
+        V0Result result = ComputeStationV0(places, station, DefaultReferences(places, i), m_settings);
         // One station without references does not stop the others: it is counted and named.
         for (const std::string& warning : result.warnings)
             if (warning != v0::kMsgNoValidReference)
@@ -301,8 +308,9 @@ bool CCalculV0Sta::EnterV0(double v0) {
 }
 
 const V0Result* CCalculV0Sta::StationResult() const {
-    const auto found = m_resultOf.find(m_station.index);
-    return found == m_resultOf.end() ? nullptr : &m_results[found->second];
+    const auto at = static_cast<std::size_t>(m_station.index);
+    if (m_station.index < 0 || at >= m_resultOf.size() || m_resultOf[at] < 0) return nullptr;
+    return &m_results[static_cast<std::size_t>(m_resultOf[at])];
 }
 
 double CCalculV0Sta::V0() const {

@@ -135,7 +135,7 @@ private:
     std::string m_list;
 
     std::vector<V0Result> m_results;
-    std::unordered_map<int, std::size_t> m_resultOf; // station index to its result
+    std::vector<int> m_resultOf; // of each station element (by its index), its result's rank, -1 for none
     int m_notComputable = 0;
 };
 
