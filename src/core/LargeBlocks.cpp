@@ -1,5 +1,6 @@
 #include "core/LargeBlocks.h"
 
+#include <cerrno>
 #include <cstdlib>
 #include <new>
 #include <sys/mman.h>
@@ -16,6 +17,17 @@ void* AllocateHugePageBlock(std::size_t bytes) {
     return block;
 }
 
+void PopulateBlock(void* block, std::size_t bytes) {
+#ifdef MADV_POPULATE_WRITE
+    const int saved = errno;
+    madvise(block, bytes, MADV_POPULATE_WRITE);
+    errno = saved;
+#else
+    (void)block;
+    (void)bytes;
+#endif
+}
+
 namespace {
 
 class HugePageResource final : public std::pmr::memory_resource {
@@ -29,7 +41,9 @@ class HugePageResource final : public std::pmr::memory_resource {
         else
             ::operator delete(memory, bytes, std::align_val_t(alignment));
     }
-    bool do_is_equal(const std::pmr::memory_resource& other) const noexcept override { return this == &other; }
+    bool do_is_equal(const std::pmr::memory_resource& other) const noexcept override {
+        return this == &other;
+    }
 };
 
 } // namespace

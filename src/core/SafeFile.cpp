@@ -175,6 +175,38 @@ bool SafeFileWriter::Write(std::string_view bytes) {
     return true;
 }
 
+bool SafeFileWriter::WriteThrough(std::string_view bytes) {
+    if (!m_file || m_error != 0) return false;
+    const int fd = fileno(m_file);
+    if (!m_through) {
+        if (std::fflush(m_file) != 0) return Fail(errno);
+        const off_t position = lseek(fd, 0, SEEK_CUR);
+        if (position < 0) return Fail(errno);
+        m_position = m_sent = position;
+        m_through = true;
+    }
+    while (!bytes.empty()) {
+        const ssize_t n = write(fd, bytes.data(), bytes.size());
+        if (n < 0 && errno == EINTR) continue;
+        if (n < 0) return Fail(errno);
+        if (n == 0) return Fail(EIO);
+        bytes.remove_prefix(static_cast<size_t>(n));
+        m_position += n;
+    }
+#ifdef SYNC_FILE_RANGE_WRITE
+    // A few megabytes at a time: the disk works while the next ones are made. Only a start: Commit's
+    // fsync is what makes them safe, and a system that cannot do it loses nothing.
+    constexpr long long kWriteBackStep = 4 << 20;
+    if (m_position - m_sent >= kWriteBackStep) {
+        const int saved = errno;
+        sync_file_range(fd, m_sent, m_position - m_sent, SYNC_FILE_RANGE_WRITE);
+        errno = saved;
+        m_sent = m_position;
+    }
+#endif
+    return true;
+}
+
 bool SafeFileWriter::Commit() {
     if (!m_file) return Fail(EIO);
     const int fd = fileno(m_file);

@@ -45,6 +45,10 @@ public:
     std::FILE* File() { return m_file; }
     // Writes bytes; false (and Error() set) on failure. Later writes then do nothing.
     bool Write(std::string_view bytes);
+    // The same for the large pieces of a big file: written straight to the file, past the stream's buffer
+    // (flushed first), and the system is asked to start putting them on the disk at once, so that the
+    // sync of Commit waits only for the last of them.
+    bool WriteThrough(std::string_view bytes);
     // Flushes, syncs, gives the rights, renames over the target and syncs the folder. False on failure:
     // the target is untouched and Error() says why.
     bool Commit();
@@ -72,6 +76,10 @@ private:
     unsigned m_gid = 0;
     int m_slot = -1;
     int m_error = 0;
+    // For WriteThrough: the position in the file, the data before m_sent on its way to the disk.
+    bool m_through = false;
+    long long m_position = 0;
+    long long m_sent = 0;
 };
 
 // Replaces the file's contents with `bytes`. Returns 0 or the errno of the failure.

@@ -6,15 +6,23 @@
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
 #include "geobase/Carnet.h"
+#include "geobase/ElementPool.h"
 #include "geobase/GeoBaseMessages.h"
 #include "geobase/GeoFile.h"
 #include "ui/FrontEnd.h"
 #include "ui/PyrTxtWnd.h"
 
 #include <algorithm>
+#include <atomic>
 #include <cerrno>
+#include <condition_variable>
 #include <cstdio>
+#include <cstring>
 #include <fcntl.h>
+#include <functional>
+#include <mutex>
+#include <system_error>
+#include <thread>
 #include <unistd.h>
 
 namespace pyr {
@@ -42,7 +50,174 @@ bool OpensWithHeader(const std::string& path) {
     return GeoHeaderVersion(head.substr(0, head.find_first_of("\r\n"))) != 0;
 }
 
-constexpr size_t kWriteChunk = 1 << 20;
+// A store is written a run of elements at a time: about 400 KB of text for a run, small enough that
+// formatting the next runs overlaps writing this one, large enough that a write costs little.
+constexpr size_t kRunElements = 8192;
+// Stores from this many runs are formatted by two threads.
+constexpr size_t kRunsForTwoThreads = 4;
+
+using ElementArray = std::vector<std::unique_ptr<CElement>>;
+
+// The text of a run of elements, lines ended, kept from run to run.
+class RunText {
+public:
+    std::string_view View() const { return {m_bytes.data(), m_size}; }
+
+    void Format(const ElementArray& elements, const std::vector<int>& kinds, size_t first, size_t last,
+                bool header) {
+        m_size = 0;
+        if (header) {
+            const std::string line = GeoHeaderLine();
+            Reserve(line.size() + 1);
+            std::memcpy(m_bytes.data(), line.data(), line.size());
+            m_size = line.size();
+            m_bytes[m_size++] = '\n';
+        }
+        for (size_t i = first; i < last; ++i) {
+            const CElement& element = *elements[i];
+            Reserve(ElementLineBound(element, kinds[i]));
+            char* end = WriteElementLine(m_bytes.data() + m_size, element, kinds[i]);
+            *end++ = '\n';
+            m_size = static_cast<size_t>(end - m_bytes.data());
+        }
+    }
+
+private:
+    // Room for `bytes` more.
+    void Reserve(size_t bytes) {
+        if (m_bytes.size() - m_size >= bytes) return;
+        // About 48 bytes a line: a run seldom grows past its first size.
+        m_bytes.resize(std::max({m_bytes.size() * 2, m_size + bytes, kRunElements * 64}));
+    }
+
+    std::string m_bytes;
+    size_t m_size = 0;
+};
+
+// Writes the runs of a store in order: two threads format runs, and whichever finishes the run next in
+// line writes it and those ready after it, while the other goes on formatting. A thread takes a buffer
+// before it takes a run, so that the run next in line always has one: no wait can close on itself.
+class TwoThreadWriter {
+public:
+    TwoThreadWriter(const ElementArray& elements, const std::vector<int>& kinds, bool header,
+                    const std::function<bool(std::string_view)>& write)
+        : m_elements(elements), m_kinds(kinds), m_header(header), m_write(write),
+          m_runs((elements.size() + kRunElements - 1) / kRunElements), m_ready(m_runs, nullptr) {
+        for (auto& buffer : m_buffers)
+            m_free.push_back(&buffer);
+    }
+
+    bool Run() {
+        std::thread helper;
+        try {
+            helper = std::thread([this] { Work(); });
+        } catch (const std::system_error&) {
+            // No second thread: this one does it all.
+        }
+        Work();
+        if (helper.joinable()) helper.join();
+        return !m_failed && m_written == m_runs;
+    }
+    // The errno of a failure that was not the writing's own (memory), 0 when none.
+    int Failure() const { return m_failure; }
+
+private:
+    void Work() {
+        try {
+            while (true) {
+                RunText* text = TakeBuffer();
+                if (!text) return;
+                const size_t run = m_next.fetch_add(1);
+                if (run >= m_runs) {
+                    GiveBack(text);
+                    return;
+                }
+                const size_t first = run * kRunElements;
+                text->Format(m_elements, m_kinds, first, std::min(first + kRunElements, m_elements.size()),
+                             m_header && run == 0);
+                Ready(run, text);
+            }
+        } catch (const std::bad_alloc&) {
+            std::lock_guard lock(m_mutex);
+            m_failed = true;
+            m_failure = ENOMEM;
+            m_changed.notify_all();
+        }
+    }
+
+    RunText* TakeBuffer() {
+        std::unique_lock lock(m_mutex);
+        m_changed.wait(lock, [this] { return m_failed || !m_free.empty(); });
+        if (m_failed) return nullptr;
+        RunText* text = m_free.back();
+        m_free.pop_back();
+        return text;
+    }
+
+    void GiveBack(RunText* text) {
+        std::lock_guard lock(m_mutex);
+        m_free.push_back(text);
+        m_changed.notify_all();
+    }
+
+    // The run is formatted: written now if it is next in line and no thread is writing, else left to the
+    // thread that writes.
+    void Ready(size_t run, RunText* text) {
+        std::unique_lock lock(m_mutex);
+        m_ready[run] = text;
+        if (m_writing) return;
+        m_writing = true;
+        while (!m_failed && m_written < m_runs && m_ready[m_written]) {
+            RunText* next = m_ready[m_written];
+            lock.unlock();
+            const bool written = m_write(next->View());
+            lock.lock();
+            if (!written) m_failed = true;
+            m_ready[m_written] = nullptr;
+            ++m_written;
+            m_free.push_back(next);
+            m_changed.notify_all();
+        }
+        m_writing = false;
+    }
+
+    const ElementArray& m_elements;
+    const std::vector<int>& m_kinds;
+    const bool m_header;
+    const std::function<bool(std::string_view)>& m_write;
+    const size_t m_runs;
+
+    std::atomic<size_t> m_next{0};
+    std::mutex m_mutex;
+    std::condition_variable m_changed;
+    RunText m_buffers[4];
+    std::vector<RunText*> m_free;
+    std::vector<RunText*> m_ready;
+    size_t m_written = 0;
+    bool m_writing = false;
+    bool m_failed = false;
+    int m_failure = 0;
+};
+
+// Writes the text of a store through `write`, by two threads for a big store.
+bool WriteStore(const ElementArray& elements, const std::vector<int>& kinds, bool header,
+                const std::function<bool(std::string_view)>& write, int& failure) {
+    failure = 0;
+    const size_t runs = (elements.size() + kRunElements - 1) / kRunElements;
+    if (runs >= kRunsForTwoThreads && std::thread::hardware_concurrency() >= 2) {
+        TwoThreadWriter writer(elements, kinds, header, write);
+        const bool written = writer.Run();
+        failure = writer.Failure();
+        return written;
+    }
+    RunText text;
+    for (size_t first = 0; first < elements.size() || (first == 0 && header); first += kRunElements) {
+        text.Format(elements, kinds, first, std::min(first + kRunElements, elements.size()),
+                    header && first == 0);
+        if (!write(text.View())) return false;
+    }
+    return true;
+}
 
 } // namespace
 
@@ -72,6 +247,10 @@ int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& c
     const size_t lineCount = static_cast<size_t>(std::count(text.begin(), text.end(), '\n')) + 1;
     m_elements.reserve(lineCount);
     m_kinds.reserve(lineCount);
+    // The memory of the elements made ready while the lines are read: most elements take a little more
+    // than this, so that what is made ready is used.
+    constexpr size_t kElementBytes = 128;
+    ElementPool::Preparation preparation(lineCount * kElementBytes);
 
     bool lenient = false;
     std::string error;
@@ -108,23 +287,15 @@ int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& c
 
 bool CCarnet::Write(std::FILE* file, bool withHeader) const {
     if (!file) return false;
-    std::string buffer;
-    // About 64 bytes a line: a small store does not need a whole chunk.
-    buffer.reserve(std::min(kWriteChunk, 64 * m_elements.size()) + 4096);
-    if (withHeader) {
-        buffer += GeoHeaderLine();
-        buffer += '\n';
-    }
-    for (size_t i = 0; i < m_elements.size(); ++i) {
-        AppendElementLine(buffer, *m_elements[i], m_kinds[i]);
-        buffer += '\n';
-        if (buffer.size() >= kWriteChunk) {
-            if (std::fwrite(buffer.data(), 1, buffer.size(), file) != buffer.size()) return false;
-            buffer.clear();
-        }
-    }
-    if (!buffer.empty() && std::fwrite(buffer.data(), 1, buffer.size(), file) != buffer.size()) return false;
-    return std::ferror(file) == 0;
+    int failure = 0;
+    const bool written = WriteStore(
+        m_elements, m_kinds, withHeader,
+        [file](std::string_view bytes) {
+            return std::fwrite(bytes.data(), 1, bytes.size(), file) == bytes.size();
+        },
+        failure);
+    if (failure != 0) errno = failure;
+    return written && std::ferror(file) == 0;
 }
 
 bool CCarnet::IsForeignFile(const std::string& path) const {
@@ -146,16 +317,20 @@ int CCarnet::Save(const std::string& path, ui::FrontEnd* parent, bool report) {
     std::string failure = SaveRefusal(path);
     if (failure.empty()) {
         SafeFileWriter writer(path);
-        errno = 0;
-        const bool written = Write(writer.File(), true);
         int code = 0;
         if (!writer.File()) {
             code = writer.Error();
-        } else if (!written) {
-            code = errno != 0 ? errno : EIO;
-            writer.Abandon();
-        } else if (!writer.Commit()) {
-            code = writer.Error();
+        } else {
+            int failure = 0;
+            const bool written = WriteStore(
+                m_elements, m_kinds, true,
+                [&writer](std::string_view bytes) { return writer.WriteThrough(bytes); }, failure);
+            if (!written) {
+                code = writer.Error() != 0 ? writer.Error() : failure != 0 ? failure : EIO;
+                writer.Abandon();
+            } else if (!writer.Commit()) {
+                code = writer.Error();
+            }
         }
         if (code != 0)
             failure = Sprintf(msg::kSaveFailedReason, SystemErrorText(code).c_str()) +

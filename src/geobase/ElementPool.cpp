@@ -2,6 +2,7 @@
 
 #include <cstdlib>
 #include <new>
+#include <system_error>
 
 #if defined(__SANITIZE_ADDRESS__)
 #define PYR_ELEMENT_POOL 0
@@ -17,8 +18,45 @@
 namespace pyr {
 
 SlotAllocator::~SlotAllocator() {
+    m_stopPreparing = true;
+    FinishPreparing();
     for (void* block : m_blocks)
         std::free(block);
+    for (void* block : m_prepared)
+        std::free(block);
+}
+
+void SlotAllocator::Prepare(std::size_t bytes) {
+    FinishPreparing();
+    std::vector<void*> blocks;
+    {
+        std::lock_guard lock(m_mutex);
+        const std::size_t have = static_cast<std::size_t>(m_end - m_next) + m_prepared.size() * kBlockBytes;
+        if (bytes <= have) return;
+        const std::size_t count = (bytes - have + kBlockBytes - 1) / kBlockBytes;
+        for (std::size_t i = 0; i < count; ++i)
+            blocks.push_back(AllocateHugePageBlock(kBlockBytes));
+        // Taken from the back: the first block to fill is the last one.
+        m_prepared.insert(m_prepared.begin(), blocks.rbegin(), blocks.rend());
+    }
+    m_stopPreparing = false;
+    try {
+        m_preparing =
+            std::thread([this, blocks = std::move(blocks)]() mutable { PrepareBlocks(std::move(blocks)); });
+    } catch (const std::system_error&) {
+        // No second thread: the pages come as they are touched.
+    }
+}
+
+void SlotAllocator::PrepareBlocks(std::vector<void*> blocks) {
+    for (void* block : blocks) {
+        if (m_stopPreparing) return;
+        PopulateBlock(block, kBlockBytes);
+    }
+}
+
+void SlotAllocator::FinishPreparing() {
+    if (m_preparing.joinable()) m_preparing.join();
 }
 
 void* SlotAllocator::Allocate(std::size_t size) {
@@ -31,7 +69,13 @@ void* SlotAllocator::Allocate(std::size_t size) {
     }
     const std::size_t bytes = slot * kGrain;
     if (static_cast<std::size_t>(m_end - m_next) < bytes) {
-        void* block = AllocateHugePageBlock(kBlockBytes);
+        void* block = nullptr;
+        if (!m_prepared.empty()) {
+            block = m_prepared.back();
+            m_prepared.pop_back();
+        } else {
+            block = AllocateHugePageBlock(kBlockBytes);
+        }
         // The few bytes left at the end of the previous block are given up.
         m_next = static_cast<char*>(block);
         m_end = m_next + kBlockBytes;
@@ -67,6 +111,14 @@ SlotAllocator& Elements() {
 
 void* ElementPool::Allocate(std::size_t size) {
     return PYR_ELEMENT_POOL ? Elements().Allocate(size) : ::operator new(size);
+}
+
+ElementPool::Preparation::Preparation(std::size_t bytes) {
+    if (PYR_ELEMENT_POOL) Elements().Prepare(bytes);
+}
+
+ElementPool::Preparation::~Preparation() {
+    if (PYR_ELEMENT_POOL) Elements().FinishPreparing();
 }
 
 void ElementPool::Free(void* memory, std::size_t size) noexcept {

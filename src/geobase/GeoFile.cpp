@@ -26,15 +26,19 @@ bool NeedsEscape(char c) {
 // Texts may hold anything: a backslash, a tabulation and the line ends are escaped. A GéoBase is UTF-8
 // whatever a text brings (a field book read byte for byte, an instrument header cut in the middle of a
 // letter): a text that is not valid UTF-8 is written as its Windows-1252 reading, the one the loader gives
-// a file that is not UTF-8, so that the file reads back as it was written.
-void AppendEscaped(std::string& out, std::string_view text) {
-    // Most texts are plain ASCII (identifiers, codes): written at once.
+// a file that is not UTF-8, so that the file reads back as it was written. At most three bytes are
+// written for each byte of the text (a Windows-1252 letter in UTF-8; an escape takes two).
+char* WriteEscaped(char* out, std::string_view text) {
+    // Most texts are plain ASCII (identifiers, codes): copied as they are checked.
     size_t plain = 0;
-    while (plain < text.size() && static_cast<unsigned char>(text[plain]) < 0x80 && !NeedsEscape(text[plain]))
-        ++plain;
-    out.append(text.substr(0, plain));
+    for (; plain < text.size(); ++plain) {
+        const char c = text[plain];
+        if (static_cast<unsigned char>(c) >= 0x80 || NeedsEscape(c)) break;
+        out[plain] = c;
+    }
+    out += plain;
     text.remove_prefix(plain);
-    if (text.empty()) return;
+    if (text.empty()) return out;
 
     std::string converted;
     if (!IsValidUtf8(text)) {
@@ -44,21 +48,26 @@ void AppendEscaped(std::string& out, std::string_view text) {
     for (char c : text) {
         switch (c) {
         case '\\':
-            out += "\\\\";
+            *out++ = '\\';
+            *out++ = '\\';
             break;
         case '\t':
-            out += "\\t";
+            *out++ = '\\';
+            *out++ = 't';
             break;
         case '\n':
-            out += "\\n";
+            *out++ = '\\';
+            *out++ = 'n';
             break;
         case '\r':
-            out += "\\r";
+            *out++ = '\\';
+            *out++ = 'r';
             break;
         default:
-            out += c;
+            *out++ = c;
         }
     }
+    return out;
 }
 
 std::string Unescaped(std::string_view field) {
@@ -79,26 +88,24 @@ std::string Unescaped(std::string_view field) {
     return text;
 }
 
-// The fields of one element, in the order of the layout.
+// The fields of one element, in the order of the layout, written at a cursor that has room for them
+// (see LineBound).
 class LineWriter {
 public:
-    explicit LineWriter(std::string& out) : m_out(out) {}
-    void Kind(int kind) {
-        char buffer[16];
-        auto result = std::to_chars(buffer, buffer + sizeof buffer, kind);
-        m_out.append(buffer, result.ptr);
-    }
+    explicit LineWriter(char* out) : m_out(out) {}
+    char* End() const { return m_out; }
+    void Kind(int kind) { m_out = std::to_chars(m_out, m_out + kIntegerRoom, kind).ptr; }
     void Text(std::string_view text) {
-        m_out += kSeparator;
-        AppendEscaped(m_out, text);
+        *m_out++ = kSeparator;
+        m_out = WriteEscaped(m_out, text);
     }
     void Number(double value) {
-        m_out += kSeparator;
-        AppendShortest(m_out, value);
+        *m_out++ = kSeparator;
+        m_out = WriteShortest(m_out, value);
     }
     void Integer(long long value) {
-        m_out += kSeparator;
-        m_out += std::to_string(value);
+        *m_out++ = kSeparator;
+        m_out = std::to_chars(m_out, m_out + kIntegerRoom, value).ptr;
     }
     // The code and the parameters close most lines; empty ones at the end are left out.
     void CodeAndParameters(const CElement& element) {
@@ -110,8 +117,28 @@ public:
         }
     }
 
+    static constexpr size_t kIntegerRoom = 24;
+
 private:
-    std::string& m_out;
+    char* m_out;
+};
+
+// Room enough for the fields of a line: a separator and three bytes a byte of each text, a separator and
+// kShortestRoom for each number.
+class LineBound {
+public:
+    void Text(std::string_view text) { m_bytes += 1 + 3 * text.size(); }
+    void Numbers(size_t count) { m_bytes += count * (1 + kShortestRoom); }
+    void Integer() { m_bytes += 1 + LineWriter::kIntegerRoom; }
+    void Common(const CElement& element) {
+        Text(element.mat());
+        Text(element.sym());
+        Text(element.par());
+    }
+    size_t Bytes() const { return m_bytes; }
+
+private:
+    size_t m_bytes = LineWriter::kIntegerRoom + 1; // the kind, and the end of the line
 };
 
 std::string_view InvariantFlag(const CPointGen& point) {
@@ -125,16 +152,16 @@ public:
     LineReader(std::string_view line, std::vector<std::string_view>& fields, std::string& error)
         : m_fields(fields), m_error(error) {
         m_fields.clear();
-        size_t start = 0;
-        while (true) {
-            size_t end = line.find(kSeparator, start);
-            if (end == std::string_view::npos) {
-                m_fields.push_back(line.substr(start));
-                break;
+        // Fields are short: a plain loop over the bytes beats a search call for each.
+        const char* start = line.data();
+        const char* const end = start + line.size();
+        for (const char* c = start; c != end; ++c) {
+            if (*c == kSeparator) {
+                m_fields.emplace_back(start, static_cast<size_t>(c - start));
+                start = c + 1;
             }
-            m_fields.push_back(line.substr(start, end - start));
-            start = end + 1;
         }
+        m_fields.emplace_back(start, static_cast<size_t>(end - start));
     }
 
     size_t Count() const { return m_fields.size(); }
@@ -152,6 +179,7 @@ public:
     double Number() {
         std::string_view field = Raw();
         double value = 0;
+        if (ReadDecimalQuick(field, value)) return value;
         auto [ptr, ec] = std::from_chars(field.data(), field.data() + field.size(), value);
         if (field.empty() || ec != std::errc() || ptr != field.data() + field.size() || !std::isfinite(value))
             Fail(Sprintf(msg::kBadNumber, std::string(field).c_str()));
@@ -221,7 +249,7 @@ GeoFileCensus TakeGeoFileCensus(std::string_view text) {
     return census;
 }
 
-void AppendElementLine(std::string& out, const CElement& element, int kind) {
+char* WriteElementLine(char* out, const CElement& element, int kind) {
     LineWriter w(out);
     w.Kind(kind);
     if (kind == kKindComment) {
@@ -281,6 +309,47 @@ void AppendElementLine(std::string& out, const CElement& element, int kind) {
         if (!command.mat().empty() || !command.sym().empty()) w.Text(command.mat());
         if (!command.sym().empty()) w.Text(command.sym());
     }
+    return w.End();
+}
+
+size_t ElementLineBound(const CElement& element, int kind) {
+    LineBound bound;
+    if (kind == kKindComment) {
+        bound.Text(static_cast<const CComment&>(element).text());
+    } else if (kind == kKindStation) {
+        bound.Common(element);
+        bound.Numbers(2);
+    } else if (IsSightingKind(kind)) {
+        bound.Common(element);
+        bound.Numbers(4);
+    } else if (IsLevellingKind(kind)) {
+        bound.Common(element);
+        bound.Numbers(2);
+    } else if (kind == kKindPoint) {
+        bound.Common(element);
+        bound.Numbers(3);
+        bound.Text("XYZ");
+    } else if (kind == kKindChemin) {
+        const auto& traverse = static_cast<const CChemin&>(element);
+        bound.Common(element);
+        bound.Integer();
+        bound.Integer();
+        for (const auto& station : traverse.stations())
+            bound.Text(station);
+    } else if (kind == kKindAppareil) {
+        bound.Common(element);
+        bound.Numbers(6);
+    } else {
+        bound.Common(element);
+        bound.Text(static_cast<const CCommande&>(element).word());
+    }
+    return bound.Bytes();
+}
+
+void AppendElementLine(std::string& out, const CElement& element, int kind) {
+    const size_t size = out.size();
+    out.resize(size + ElementLineBound(element, kind));
+    out.resize(static_cast<size_t>(WriteElementLine(out.data() + size, element, kind) - out.data()));
 }
 
 std::string ElementLine(const CElement& element, int kind) {

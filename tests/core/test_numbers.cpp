@@ -2,11 +2,13 @@
 #include "core/Undefined.h"
 
 #include <bit>
+#include <charconv>
 #include <clocale>
 #include <cmath>
 #include <cstdint>
 #include <gtest/gtest.h>
 #include <random>
+#include <string>
 
 using namespace pyr;
 
@@ -117,6 +119,139 @@ TEST(Numbers, RoundingIsBitForBitThatOfTheTextOnCoordinatesHalvesAndLimits) {
         }
     }
     EXPECT_EQ(check.differing, 0) << "of " << check.checked;
+}
+
+namespace {
+
+// Compares the shortest text of a value with to_chars's and the quick reading of a text with from_chars's,
+// byte for byte and bit for bit; counts what the quick ways took on themselves.
+struct ShortestCheck {
+    long long checked = 0;
+    long long quick = 0;
+    int differing = 0;
+
+    void Fail(const std::string& what) {
+        if (++differing <= 10) ADD_FAILURE() << what;
+    }
+    void Write(double value) {
+        ++checked;
+        char expected[kShortestRoom];
+        char written[kShortestRoom];
+        char* expectedEnd =
+            std::to_chars(expected, expected + sizeof expected, value, std::chars_format::fixed).ptr;
+        char* writtenEnd = WriteShortest(written, value);
+        quick += detail::WriteShortestQuick(written, value) != nullptr;
+        const std::string want(expected, expectedEnd);
+        if (std::string(written, writtenEnd) != want)
+            Fail("written " + std::string(written, writtenEnd) + " instead of " + want);
+        Read(want);
+    }
+    void Read(const std::string& text) {
+        double expected = 0;
+        const auto [end, error] = std::from_chars(text.data(), text.data() + text.size(), expected);
+        double read = 0;
+        if (!ReadDecimalQuick(text, read)) return;
+        if (error != std::errc() || end != text.data() + text.size() ||
+            std::bit_cast<std::uint64_t>(read) != std::bit_cast<std::uint64_t>(expected))
+            Fail("read " + text + " as " + FormatShortest(read));
+    }
+};
+
+} // namespace
+
+TEST(Numbers, ShortestTextIsThatOfToCharsForEveryKindOfDouble) {
+    ShortestCheck check;
+    std::mt19937_64 random(20251125);
+    std::uniform_real_distribution<double> exponent(-9.0, 17.0), unit(0.0, 1.0);
+    std::uniform_int_distribution<int> decimals(0, 17), ulps(-3, 3);
+    // Values rounded to their decimals (coordinates, angles, distances of every size and sign), their
+    // neighbours a few ulps away, and doubles of any bits (subnormals, huge values, NaN, infinities).
+    for (int i = 0; i < 600000; ++i) {
+        const double value = std::pow(10.0, exponent(random)) * (unit(random) < 0.5 ? -1.0 : 1.0);
+        const double rounded = detail::RoundThroughText(value, decimals(random));
+        double nearby = rounded;
+        for (int step = ulps(random); step != 0; step += step > 0 ? -1 : 1)
+            nearby = std::nextafter(nearby, step > 0 ? INFINITY : -INFINITY);
+        check.Write(rounded);
+        check.Write(nearby);
+        check.Write(value);
+        check.Write(std::bit_cast<double>(random()));
+    }
+    // Survey values as a job holds them: a million coordinates to the millimetre and angles to 0.1 mgon.
+    for (int i = 0; i < 1000000; ++i) {
+        check.Write(RoundToDecimals(600000.0 + 400000.0 * unit(random), 3));
+        check.Write(RoundToDecimals(-400.0 + 800.0 * unit(random), 5));
+    }
+    // Powers of ten and the doubles around them, where the count of digits changes; the limits of the
+    // quick way (1e-7, 1e15, fifteen digits); zeros and the undefined value.
+    for (int e = -330; e <= 310; ++e) {
+        double up = std::pow(10.0, e);
+        double down = up;
+        for (int step = 0; step < 20; ++step) {
+            for (double v : {up, down})
+                for (double sign : {1.0, -1.0})
+                    check.Write(sign * v);
+            up = std::nextafter(up, INFINITY);
+            down = std::nextafter(down, 0.0);
+        }
+    }
+    for (double v : {0.0,
+                     -0.0,
+                     0.1,
+                     0.2,
+                     0.1 + 0.2,
+                     1e-7,
+                     -1e-7,
+                     651234.5678,
+                     -651234.5678,
+                     kUndefined,
+                     999999999999999.0,
+                     999999999999999.9,
+                     1e15,
+                     1234567890123456.0,
+                     0x1p53,
+                     0x1p53 + 2.0,
+                     123456.78901234567,
+                     5e-324,
+                     2.2250738585072014e-308,
+                     1.7976931348623157e308,
+                     double{INFINITY},
+                     -double{INFINITY},
+                     double{NAN}})
+        check.Write(v);
+    EXPECT_EQ(check.differing, 0) << "of " << check.checked;
+    // The quick ways did take most values on themselves.
+    EXPECT_GT(check.quick * 2, check.checked);
+}
+
+TEST(Numbers, QuickReadingIsThatOfFromCharsOrStandsAside) {
+    ShortestCheck check;
+    std::mt19937_64 random(7);
+    std::uniform_int_distribution<int> length(0, 18), digit(0, 9), fraction(0, 24), sign(0, 3);
+    for (int i = 0; i < 1000000; ++i) {
+        std::string text = sign(random) == 0 ? "-" : "";
+        for (int n = length(random); n > 0; --n)
+            text += static_cast<char>('0' + digit(random));
+        if (sign(random) != 0) {
+            text += '.';
+            for (int n = fraction(random); n > 0; --n)
+                text += static_cast<char>('0' + digit(random));
+        }
+        check.Read(text);
+    }
+    EXPECT_EQ(check.differing, 0);
+    double v = 7;
+    for (const char* text : {"", "-", "+1", "1.", ".5", "-.5", "1e5", "1,5", " 1", "1 ", "0x1", "1.2.3",
+                             "0.00000000000000000000001", "1234567890123456"}) {
+        EXPECT_FALSE(ReadDecimalQuick(text, v)) << text;
+        EXPECT_EQ(v, 7);
+    }
+    EXPECT_TRUE(ReadDecimalQuick("-0", v));
+    EXPECT_TRUE(std::signbit(v) && v == 0);
+    EXPECT_TRUE(ReadDecimalQuick("000651234.567800", v));
+    EXPECT_EQ(v, 651234.5678);
+    EXPECT_TRUE(ReadDecimalQuick("-999999", v));
+    EXPECT_EQ(v, kUndefined);
 }
 
 TEST(Numbers, StrictParsingRefusesTrailingText) {

@@ -38,3 +38,25 @@ TEST(SlotAllocator, SlotsAreAlignedApartAndReusedOnceFreed) {
     slots.Free(nullptr, 144);
     EXPECT_EQ(slots.BlockCount(), 3u);
 }
+
+TEST(SlotAllocator, BlocksPreparedAheadServeTheNextObjectsAndNoneIsLost) {
+    SlotAllocator slots;
+    const std::size_t count = 3 * (SlotAllocator::kBlockBytes / 144); // three blocks, full
+    slots.Prepare(count * 144);
+    EXPECT_EQ(slots.BlockCount(), 0u); // taken ahead, in use only once needed
+    std::vector<char*> taken;
+    for (std::size_t i = 0; i < count; ++i) {
+        auto* memory = static_cast<char*>(slots.Allocate(144));
+        std::memset(memory, static_cast<int>(i & 0xFF), 144); // written while the pages are being provided
+        taken.push_back(memory);
+    }
+    slots.FinishPreparing();
+    EXPECT_EQ(slots.BlockCount(), 3u);
+    for (std::size_t i = 0; i < count; ++i)
+        ASSERT_EQ(static_cast<unsigned char>(taken[i][0]), i & 0xFF);
+    // Asking again for what is already there takes nothing more.
+    slots.Prepare(16);
+    slots.FinishPreparing();
+    slots.Allocate(144);
+    EXPECT_EQ(slots.BlockCount(), 4u);
+}

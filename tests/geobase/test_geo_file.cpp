@@ -90,6 +90,44 @@ TEST_F(GeoFile, SaveThenLoadGivesTheSameElementsAndSavingAgainTheSameBytes) {
     EXPECT_NE(bytes.find("\n1006\tA1\t0.1\t0.2\t-999999\t-\n"), std::string::npos);
 }
 
+TEST_F(GeoFile, ABigStoreIsSavedLineForLineAsEachElementWritesItself) {
+    // Enough elements for the store to be written in many runs, by two threads, with values that only
+    // the general way writes (seventeen digits, subnormal, beyond 10^15) and texts that are escaped or
+    // not UTF-8.
+    CCarnet c;
+    for (int round = 0; round < 2600; ++round) {
+        c.Append(EveryKind());
+        c.Add(
+            std::make_unique<CPointGen>("G" + std::to_string(round), 0.1 + 0.2 * round, 1e20 + round, 5e-324),
+            kKindPoint);
+        c.Add(std::make_unique<CComment>("Opérateur \xE9t\xE9 " + std::to_string(round)), kKindComment);
+    }
+    ASSERT_GT(c.GetSize(), 40000);
+    std::string expected = "GEOBASE PYRALIS\t1\n";
+    for (int i = 0; i < c.GetSize(); ++i)
+        expected += ElementLine(*c.GetAt(i), c.GetType(i)) + "\n";
+
+    ASSERT_EQ(c.Save(path), 1);
+    const std::string saved = ReadBytes(path);
+    ASSERT_EQ(saved.size(), expected.size());
+    EXPECT_TRUE(saved == expected);
+    EXPECT_NE(saved.find("\n1006\tG1\t0.30000000000000004\t100000000000000000000\t0.0000"),
+              std::string::npos);
+
+    // The same text through a stream, and after a reading, the same bytes again.
+    const std::string streamed = dir / "flux.geo";
+    std::FILE* file = std::fopen(streamed.c_str(), "wb");
+    ASSERT_NE(file, nullptr);
+    EXPECT_TRUE(c.Write(file));
+    std::fclose(file);
+    EXPECT_TRUE(ReadBytes(streamed) == expected);
+    CCarnet loaded;
+    ASSERT_EQ(loaded.Load(&txt, path), 1);
+    ASSERT_EQ(loaded.GetSize(), c.GetSize());
+    ASSERT_EQ(loaded.Save(path), 1);
+    EXPECT_TRUE(ReadBytes(path) == expected);
+}
+
 TEST_F(GeoFile, ALineThatCannotBeReadIsReportedAndKeptForTheNextSave) {
     CCarnet c = Loaded("GEOBASE PYRALIS\t1\n"
                        "1001\tS1\t1.5\t-999999\n"
