@@ -72,6 +72,24 @@ bool PointPlaces::Of(int index, double& x, double& y, double& z) {
     return IsKnown(x);
 }
 
+StationPlace PointPlaces::Station(int stationIndex) {
+    StationPlace station;
+    station.index = stationIndex;
+    station.name = m_carnet.matAt(stationIndex);
+    // Its reprise: the set-ups on the same point up to this one, among the elements of its identifier.
+    station.reprise = 0;
+    for (int i : m_carnet.SameMat(stationIndex)) {
+        if (m_carnet.GetType(i) == kKindStation) ++station.reprise;
+        if (i == stationIndex) break;
+    }
+    if (station.reprise == 0) station.reprise = 1;
+    Of(stationIndex, station.x, station.y, station.z);
+    station.hi = m_carnet.hiAt(stationIndex);
+    if (IsKnown(station.hi)) station.hi += m_carnet.findEV(stationIndex, -1);
+    station.v0 = m_carnet.v0At(stationIndex);
+    return station;
+}
+
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex) {
     PointPlaces places(carnet, false);
     return SightingsOfKnownPoints(places, stationIndex, 0);
@@ -98,7 +116,10 @@ V0Reference PrepareReference(PointPlaces& places, const StationPlace& station, i
     const CCarnet& carnet = places.Carnet();
     V0Reference ref;
     ref.index = sighting;
-    const auto* visee = carnet.As<CVisee>(sighting);
+    // The store keeps each element under the kind of its class: a sighting's kind tells it is one.
+    const auto* visee = IsSightingKind(carnet.GetType(sighting))
+                            ? static_cast<const CVisee*>(carnet.GetAt(sighting))
+                            : nullptr;
     if (!visee) {
         ref.valid = false;
         return ref;

@@ -67,6 +67,8 @@ public:
     PointPlaces(const CCarnet& carnet, bool remember);
 
     const CCarnet& Carnet() const { return m_carnet; }
+    // The station occurrence at that index, as StationPlaceAt places it.
+    StationPlace Station(int stationIndex);
     // The place of the point that the element at `index` names; false when its planimetry is unknown.
     bool Of(int index, double& x, double& y, double& z);
 

@@ -253,7 +253,7 @@ int CCalculV0Sta::CalculateList() {
     for (int i = Carnet().Find(kKindStation, ""); i >= 0; i = Carnet().Find(kKindStation, "", i + 1)) {
         if (selection && !selection->Contains(Carnet().GetAt(i)->mat())) continue;
         ++named;
-        const StationPlace station = StationPlaceAt(Carnet(), i);
+        const StationPlace station = places.Station(i);
         if (!station.HasPlace()) {
             ++m_notComputable;
             txt.Print(v0::kLineNotComputed, station.Designation().c_str(),

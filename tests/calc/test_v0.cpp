@@ -170,5 +170,60 @@ TEST(StationV0, ReferencesOfferedAndChosenAtFirst) {
     EXPECT_EQ(StationPlaceAt(carnet, s2).Designation(), "S1(2)");
 }
 
+// Orienting many stations reads each point's place once and keeps it: what it keeps must be what the
+// GéoBase says, for a station point known in parts, a station set up again, one set up off its point and
+// one without coordinates, whether the place is read the first time or found again.
+TEST(StationV0, PlacesKeptForManyStationsAreThoseOfTheGeoBase) {
+    CCarnet carnet;
+    carnet.Add(std::make_unique<CPointGen>("S1", 100.0), kKindPoint); // its height first, then its plan
+    carnet.Add(std::make_unique<CPointGen>("S1", kStation.x, kStation.y), kKindPoint);
+    AddPoint(carnet, "A", {1000.0, 2100.0, 101.0});
+    AddPoint(carnet, "B", {1200.0, 2000.0, 99.2});
+    const Place s2{1150.0, 2050.0, 98.0};
+    AddPoint(carnet, "S2", s2);
+    std::vector<int> stations{AddStation(carnet, "S1", kHi)};
+    for (const char* name : {"A", "B", "S2"})
+        AddSighting(carnet, name, kStation, kHi,
+                    name[0] == 'A'   ? Place{1000.0, 2100.0, 101.0}
+                    : name[0] == 'B' ? Place{1200.0, 2000.0, 99.2}
+                                     : s2,
+                    1.3, 50.0);
+    stations.push_back(AddStation(carnet, "S2", 1.6));
+    AddSighting(carnet, "S1", s2, 1.6, {kStation.x, kStation.y, 100.0}, 1.3, 120.0, kKindMesure);
+    AddSighting(carnet, "A", s2, 1.6, {1000.0, 2100.0, 101.0}, 1.3, 120.0, kKindMesure);
+    carnet.Add(std::make_unique<CCommande>(std::string(kExcentVer), "0.250"), kKindExcentrement);
+    stations.push_back(AddStation(carnet, "S1", 1.45, 49.9));
+    AddSighting(carnet, "B", kStation, 1.7, {1200.0, 2000.0, 99.2}, 1.3, 50.0);
+    stations.push_back(AddStation(carnet, "S9", 1.5)); // no point S9
+    AddSighting(carnet, "A", {900.0, 2000.0, 0.0}, 1.5, {1000.0, 2100.0, 101.0}, 1.3, 10.0);
+
+    V0Settings settings;
+    PointPlaces kept(carnet, true);
+    for (int pass = 0; pass < 2; ++pass)
+        for (int i : stations) {
+            SCOPED_TRACE(Sprintf("station %d, pass %d", i, pass));
+            const StationPlace expected = StationPlaceAt(carnet, i), station = kept.Station(i);
+            EXPECT_EQ(station.name, expected.name);
+            EXPECT_EQ(station.reprise, expected.reprise);
+            for (auto [value, wanted] : {std::pair{station.x, expected.x},
+                                         {station.y, expected.y},
+                                         {station.z, expected.z},
+                                         {station.hi, expected.hi},
+                                         {station.v0, expected.v0}})
+                EXPECT_EQ(value, wanted);
+            const std::vector<int> references = DefaultReferences(kept, i);
+            ASSERT_EQ(references, DefaultReferences(carnet, i));
+            const V0Result result = ComputeStationV0(kept, station, references, settings);
+            const V0Result plain = ComputeStationV0(carnet, expected, references, settings);
+            EXPECT_EQ(result.v0, plain.v0);
+            EXPECT_EQ(result.warnings, plain.warnings);
+            ASSERT_EQ(result.references.size(), plain.references.size());
+            for (std::size_t r = 0; r < plain.references.size(); ++r)
+                EXPECT_EQ(result.references[r].z, plain.references[r].z);
+        }
+    EXPECT_EQ(kept.Station(stations[2]).Designation(), "S1(2)");
+    EXPECT_FALSE(kept.Station(stations[3]).HasPlace());
+}
+
 } // namespace
 } // namespace pyr::test
