@@ -27,19 +27,6 @@ ssize_t ReadFully(int fd, char* data, std::size_t size) {
     return static_cast<ssize_t>(done);
 }
 
-// Where the first byte outside ASCII lies in [p, end), or end.
-const char* FindNonAscii(const char* p, const char* end) {
-    while (end - p >= 8) {
-        std::uint64_t word;
-        std::memcpy(&word, p, 8);
-        if ((word & 0x8080808080808080ULL) != 0) break;
-        p += 8;
-    }
-    while (p < end && static_cast<unsigned char>(*p) < 0x80)
-        ++p;
-    return p;
-}
-
 // How many bytes at the end of `bytes` begin a UTF-8 sequence that goes on beyond it (0 to 3).
 std::size_t UnfinishedSequence(std::string_view bytes) {
     for (std::size_t back = 1; back <= 3 && back <= bytes.size(); ++back) {
@@ -138,10 +125,11 @@ bool FileLines::ForEach(const std::function<void(const Line&)>& each,
             if (filled >= 3 && std::memcmp(buffer.get(), "\xEF\xBB\xBF", 3) == 0) start = scanned = 3;
         }
         if (encoding == Encoding::Ascii) {
-            const char* other = FindNonAscii(buffer.get() + scanned, buffer.get() + filled);
-            scanned = static_cast<std::size_t>(other - buffer.get());
+            const std::size_t other =
+                FindNonAscii(std::string_view(buffer.get() + scanned, filled - scanned));
+            scanned = other == std::string_view::npos ? filled : scanned + other;
             if (scanned < filled) {
-                const std::string_view rest(other, filled - scanned);
+                const std::string_view rest(buffer.get() + scanned, filled - scanned);
                 encoding = (ended ? IsValidUtf8(rest) : RestIsValidUtf8(base + filled, rest))
                                ? Encoding::Utf8
                                : Encoding::Windows1252;

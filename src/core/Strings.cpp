@@ -36,17 +36,6 @@ std::string VSprintf(const char* format, std::va_list args) {
     return text;
 }
 
-std::string_view Trimmed(std::string_view text) {
-    auto blank = [](char c) {
-        return c == ' ' || c == '\t' || c == '\n' || c == '\r' || c == '\f' || c == '\v';
-    };
-    while (!text.empty() && blank(text.front()))
-        text.remove_prefix(1);
-    while (!text.empty() && blank(text.back()))
-        text.remove_suffix(1);
-    return text;
-}
-
 std::string_view TrimmedOfControls(std::string_view text) {
     auto control = [](char c) { return static_cast<unsigned char>(c) <= ' ' || c == '\x7f'; };
     while (!text.empty() && control(text.front()))

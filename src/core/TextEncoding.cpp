@@ -98,6 +98,18 @@ std::string FileBytesToUtf8(std::string_view bytes, bool* wasWindows1252) {
     return ansi ? Windows1252ToUtf8(bytes) : std::string(bytes);
 }
 
+std::size_t FindNonAscii(std::string_view bytes) {
+    std::size_t i = 0;
+    for (; i + 8 <= bytes.size(); i += 8) {
+        std::uint64_t word;
+        std::memcpy(&word, bytes.data() + i, 8);
+        if ((word & 0x8080808080808080u) != 0) break;
+    }
+    for (; i < bytes.size(); ++i)
+        if (static_cast<unsigned char>(bytes[i]) >= 0x80) return i;
+    return std::string_view::npos;
+}
+
 std::size_t Utf8Length(std::string_view text) {
     // Every byte but the continuation bytes (10xxxxxx) starts a character; counted eight at a time, since
     // a listing measures millions of texts.
@@ -105,7 +117,10 @@ std::size_t Utf8Length(std::string_view text) {
     for (; i + 8 <= text.size(); i += 8) {
         std::uint64_t bytes = 0;
         std::memcpy(&bytes, text.data() + i, 8);
-        length -= static_cast<std::size_t>(std::popcount(bytes & ~(bytes << 1) & 0x8080808080808080u));
+        // The high bit of each continuation byte, summed by one multiplication (a bit count is a call
+        // into the runtime on processors that are not assumed to count bits).
+        const std::uint64_t continuations = (bytes & ~(bytes << 1) & 0x8080808080808080u) >> 7;
+        length -= static_cast<std::size_t>((continuations * 0x0101010101010101u) >> 56);
     }
     for (; i < text.size(); ++i)
         if ((static_cast<std::uint8_t>(text[i]) & 0xC0) == 0x80) --length;

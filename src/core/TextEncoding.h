@@ -10,6 +10,12 @@ namespace pyr {
 
 bool IsValidUtf8(std::string_view bytes);
 
+// Where the first byte outside ASCII stands in `bytes`, or npos; looked for eight bytes at a time.
+std::size_t FindNonAscii(std::string_view bytes);
+inline bool IsAscii(std::string_view bytes) {
+    return FindNonAscii(bytes) == std::string_view::npos;
+}
+
 std::string Windows1252ToUtf8(std::string_view bytes);
 
 // UTF-8 text out of a file's bytes: a leading UTF-8 byte-order mark is dropped; bytes that are not

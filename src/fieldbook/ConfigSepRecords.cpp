@@ -1,11 +1,10 @@
 #include "fieldbook/ConfigSepRecords.h"
 
 #include "core/AngleUnits.h"
-#include "core/Files.h"
+#include "core/FileLines.h"
 #include "core/Lines.h"
 #include "core/Numbers.h"
 #include "core/Strings.h"
-#include "core/TextEncoding.h"
 #include "core/Undefined.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookTexts.h"
@@ -232,19 +231,29 @@ void ImportRecords(const CParamDriver& layout, std::string_view text, CRecordFie
 }
 
 bool ImportRecordFile(const CParamDriver& layout, const std::string& carnet, CRecordFields& fields,
-                      CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent) {
-    std::string bytes;
-    if (!ReadWholeFile(carnet, bytes)) {
+                      CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent, const RecordDrain& drain) {
+    // A batch small enough to stay in the processor's caches, its elements' memory used again by the next.
+    constexpr int kBatch = 4096;
+    FileLines file;
+    const RecordLayout recordLayout = layout.Layout(); // the builder reads it to the end
+    RecordBuilder builder(recordLayout, {layout.Angles(), layout.Distances()}, fields, records, txt);
+    const bool read =
+        file.Open(carnet) && file.ForEach(
+                                 [&](const FileLines::Line& line) {
+                                     if (txt && line.unterminated && !TrimmedOfControls(line.text).empty())
+                                         txt->PrintText(Sprintf(fb::kCutLastLine, line.number));
+                                     builder.ReadLine(line.text, line.number);
+                                     if (drain && records.GetSize() >= kBatch) drain(records);
+                                 },
+                                 [&] {
+                                     if (txt) txt->Print(fb::kReadAsWindows1252, carnet.c_str());
+                                 });
+    if (!read) {
         const int code = errno;
         ui::FrontEnd& frontEnd = parent ? *parent : ui::ApplicationFrontEnd();
         frontEnd.MessageBox(CarnetOpenFailure(carnet, code), ui::kCaption, ui::kIconWarning);
         return false;
     }
-    bool windows1252 = false;
-    std::string text = FileBytesToUtf8(bytes, &windows1252);
-    std::string().swap(bytes);
-    if (windows1252 && txt) txt->Print(fb::kReadAsWindows1252, carnet.c_str());
-    ImportRecords(layout, text, fields, records, txt);
     return true;
 }
 

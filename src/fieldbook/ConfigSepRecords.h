@@ -4,6 +4,7 @@
 #include "fieldbook/ParamDriver.h"
 
 #include <cstddef>
+#include <functional>
 #include <string>
 #include <string_view>
 
@@ -60,11 +61,16 @@ void ImportRecords(const RecordLayout& layout, RecordUnits units, std::string_vi
 void ImportRecords(const CParamDriver& layout, std::string_view text, CRecordFields& fields, CCarnet& records,
                    CPyrTxtWnd* txt);
 
-// Reads the file `carnet` (UTF-8, or Windows-1252 when it is not valid UTF-8) the same way. False when it
-// cannot be read: "Impossible d'ouvrir le fichier carnet !" with the path and the reason is shown on
-// `parent` (else the application's front end) and nothing is added.
+// Takes the records imported so far and leaves `records` empty: a big field book is handed over by batches
+// as it is read, never held whole.
+using RecordDrain = std::function<void(CCarnet& records)>;
+
+// Reads the file `carnet` (UTF-8, or Windows-1252 when it is not valid UTF-8) the same way, by chunks.
+// With a `drain`, the records are handed to it every few thousand (the rest stays in `records`). False
+// when it cannot be read: "Impossible d'ouvrir le fichier carnet !" with the path and the reason is shown
+// on `parent` (else the application's front end).
 bool ImportRecordFile(const CParamDriver& layout, const std::string& carnet, CRecordFields& fields,
-                      CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent);
+                      CCarnet& records, CPyrTxtWnd* txt, ui::FrontEnd* parent, const RecordDrain& drain = {});
 
 // The import of a layout whose lines `Fields` cuts (made from the layout): CDlgConfigSep, CDlgConfigCol.
 template <class Fields>
@@ -75,9 +81,9 @@ public:
     // metres, values not given left undefined. Lines that cannot be used are reported in `txt` with their
     // number and skipped. False when the file cannot be read (the message shown on `parent`).
     static bool Import(const CParamDriver& layout, const std::string& carnet, CCarnet& records,
-                       CPyrTxtWnd* txt, ui::FrontEnd* parent) {
+                       CPyrTxtWnd* txt, ui::FrontEnd* parent, const RecordDrain& drain = {}) {
         Fields fields(layout.Layout());
-        return ImportRecordFile(layout, carnet, fields, records, txt, parent);
+        return ImportRecordFile(layout, carnet, fields, records, txt, parent, drain);
     }
     // The same from the text of a field book (UTF-8).
     static void ImportText(const CParamDriver& layout, std::string_view text, CCarnet& records,

@@ -131,7 +131,7 @@ void CLectGeodim::BeginReading() {
     m_orientedOn.clear();
     m_firstSighting = false;
     m_signalHeight = kUndefined;
-    m_known.clear();
+    m_known.Clear();
     m_labelWarned.assign(kLabelCount, false);
     m_units.clear();
     m_ppm.clear();
@@ -383,7 +383,8 @@ void CLectGeodim::WriteStation() {
 // The coordinates a station block gives after label 62: its orientation point, known.
 void CLectGeodim::WriteOrientationPoint() {
     Block& b = m_block;
-    if (IsUndefined(b.orientationEast) && IsUndefined(b.orientationNorth) && IsUndefined(b.orientationElevation))
+    if (IsUndefined(b.orientationEast) && IsUndefined(b.orientationNorth) &&
+        IsUndefined(b.orientationElevation))
         return;
     const std::string_view name = FormMatView(b.orientedOn);
     if (name.empty()) return LineMissing(b.number, fb::kDatumPoint);
@@ -458,13 +459,13 @@ bool CLectGeodim::WritePosition(bool known) {
         LineError(fb::kRefused, b.number);
         return false;
     }
-    if (known && point->hasXY()) m_known.insert(point->mat());
+    if (known && point->hasXY()) m_known.Insert(point->mat());
     return true;
 }
 
 bool CLectGeodim::IsReference(std::string_view point) const {
     if (!m_orientedOn.empty() && point == m_orientedOn) return true;
-    if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
+    if (m_known.Contains(point)) return true;
     return m_settings.MarksReference(m_firstSighting, Trimmed(m_block.code));
 }
 

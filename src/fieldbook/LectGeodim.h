@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/NameSet.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookUnits.h"
@@ -84,7 +85,7 @@ private:
     std::string m_orientedOn;      // the point its label 62 names
     bool m_firstSighting = false;
     double m_signalHeight = kUndefined; // label 6 holds until the next one
-    TextSet m_known;                    // points given with their planimetry
+    NameSet m_known;                    // points given with their planimetry
     std::vector<bool> m_labelWarned;
     std::string m_units, m_ppm, m_scale;
 };

@@ -106,7 +106,7 @@ void CLectNikon::BeginReading() {
     m_backsight.clear();
     m_onAzimuth = false;
     m_firstSighting = false;
-    m_known.clear();
+    m_known.Clear();
     m_started = m_rawStarted = m_dtmStarted = false;
 }
 
@@ -471,7 +471,7 @@ bool CLectNikon::AddPosition(std::string_view name, double first, double second,
         LineError(fb::kRefused, number);
         return false;
     }
-    if (point->hasXY()) m_known.insert(point->mat());
+    if (point->hasXY()) m_known.Insert(point->mat());
     return true;
 }
 
@@ -488,7 +488,7 @@ void CLectNikon::AddSighting(std::string_view point, bool reference, double hp, 
 // with coordinates, or as the settings say (the first sighting of each station, or a code among
 // "CodesReference").
 bool CLectNikon::IsReference(std::string_view point, std::string_view code) const {
-    if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
+    if (m_known.Contains(point)) return true;
     return m_settings.MarksReference(m_firstSighting, code);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/NameSet.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/FieldBookUnits.h"
@@ -79,7 +80,7 @@ private:
     std::string m_backsight;  // its backsight point, as the station record names it
     bool m_onAzimuth = false; // it names none but gives the azimuth and reading: its V0 is known
     bool m_firstSighting = false;
-    TextSet m_known; // points given with their planimetry
+    NameSet m_known; // points given with their planimetry
     bool m_started = false;
     bool m_rawStarted = false;
     bool m_dtmStarted = false;

@@ -3,6 +3,8 @@
 #include "core/Strings.h"
 #include "core/TextEncoding.h"
 
+#include <algorithm>
+
 namespace pyr::sdr {
 
 namespace {
@@ -84,11 +86,17 @@ std::string_view From(std::string_view line, int first) {
 }
 
 void SplitRecord(std::string_view line, const Layout& layout, Variant variant, Fields& fields) {
-    std::size_t start = Advance(line, 0, kFirstField - 1);
+    // In a line of ASCII, the most common by far, a column is a byte.
+    const bool ascii = IsAscii(line);
+    const auto advance = [&](std::size_t from, int count) {
+        return ascii ? std::min(line.size(), from + static_cast<std::size_t>(count))
+                     : Advance(line, from, count);
+    };
+    std::size_t start = advance(0, kFirstField - 1);
     for (int i = 0; i < layout.count; ++i) {
         const FieldKind kind = layout.kinds[static_cast<std::size_t>(i)];
         const std::size_t end =
-            kind == FieldKind::Text ? line.size() : Advance(line, start, Width(kind, variant, layout));
+            kind == FieldKind::Text ? line.size() : advance(start, Width(kind, variant, layout));
         fields.text[static_cast<std::size_t>(i)] = Trimmed(line.substr(start, end - start));
         start = end;
     }

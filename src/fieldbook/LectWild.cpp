@@ -13,6 +13,7 @@
 #include <cmath>
 #include <cstring>
 #include <filesystem>
+#include <limits>
 
 namespace pyr {
 
@@ -67,10 +68,11 @@ void CLectWild::BeginReading() {
     m_heightWarned = false;
     m_reflector = kUndefined;
     m_pendingCode.clear();
-    m_known.clear();
+    m_known.Clear();
     m_started = false;
     for (std::string* last : {&m_format, &m_serial, &m_type, &m_date, &m_dateTime, &m_ppm, &m_prism})
         last->clear();
+    m_ppmShown = m_prismShown = std::numeric_limits<double>::quiet_NaN();
     m_wordWarned.reset();
     m_unitWarned.reset();
 }
@@ -84,8 +86,7 @@ void CLectWild::ReadLine(std::string_view line, int number) {
         ++first;
     line.remove_prefix(first);
     if (line.empty() || line.front() == '!') return;
-    for (char control : kEndControls)
-        if (std::memchr(line.data(), control, line.size())) return;
+    if (FindControl(line, kEndControls) != std::string_view::npos) return;
 
     std::string_view bad;
     if (!gsi::SplitBlock(line, m_block, bad)) {
@@ -112,6 +113,14 @@ void CLectWild::Header(std::string& last, const char* label, std::string_view va
     AddHeaderComment(label, value);
 }
 
+// Nearly every sighting repeats the ppm and the prism constant: the same value is not written out again
+// to be found the same text.
+void CLectWild::Header(std::string& last, double& shown, const char* label, double value, const char* unit) {
+    if (value == shown && std::signbit(value) == std::signbit(shown)) return;
+    shown = value;
+    Header(last, label, FormatShortest(value) + unit);
+}
+
 void CLectWild::HeaderComments() {
     const gsi::BlockContent& c = m_content;
     if (!m_started) {
@@ -126,11 +135,11 @@ void CLectWild::HeaderComments() {
     // The time of each measurement is no header: only a block without observations gives one.
     if (!c.dateTime.empty() && !c.HasObservation())
         Header(m_dateTime, wild::kLabelDateTime, DateText(c.dateTime, true));
-    if (IsKnown(c.ppm)) Header(m_ppm, fb::kLabelPpm, FormatShortest(c.ppm) + " ppm");
-    if (IsKnown(c.ppmTotal)) Header(m_ppm, fb::kLabelPpm, FormatShortest(c.ppmTotal) + " ppm");
-    if (IsKnown(c.prismMm)) Header(m_prism, fb::kLabelPrism, FormatShortest(c.prismMm) + " mm");
+    if (IsKnown(c.ppm)) Header(m_ppm, m_ppmShown, fb::kLabelPpm, c.ppm, " ppm");
+    if (IsKnown(c.ppmTotal)) Header(m_ppm, m_ppmShown, fb::kLabelPpm, c.ppmTotal, " ppm");
+    if (IsKnown(c.prismMm)) Header(m_prism, m_prismShown, fb::kLabelPrism, c.prismMm, " mm");
     if (IsKnown(c.prismConstantMm))
-        Header(m_prism, fb::kLabelPrism, FormatShortest(RoundToDecimals(c.prismConstantMm, 1)) + " mm");
+        Header(m_prism, m_prismShown, fb::kLabelPrism, RoundToDecimals(c.prismConstantMm, 1), " mm");
 }
 
 void CLectWild::Warnings(int number) {
@@ -309,7 +318,7 @@ bool CLectWild::AddPosition(std::string_view name, double first, double second, 
         LineError(fb::kRefused, number);
         return false;
     }
-    if (known && point->hasXY()) m_known.insert(point->mat());
+    if (known && point->hasXY()) m_known.Insert(point->mat());
     return true;
 }
 
@@ -329,7 +338,7 @@ void CLectWild::CheckInstrumentHeight(double hi, int number) {
 // ---- References ------------------------------------------------------------------------------------------
 
 bool CLectWild::IsReference(std::string_view point) const {
-    if (!m_known.empty() && m_known.find(point) != m_known.end()) return true;
+    if (m_known.Contains(point)) return true;
     // The code of a sighting is the code block before it, or one of the remarks of its own block.
     if (m_settings.MarksReference(m_firstSighting, m_pendingCode)) return true;
     for (std::size_t i = 0; i < m_content.remarkCount; ++i)

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "core/NameSet.h"
 #include "core/Strings.h"
 #include "fieldbook/FieldBookReader.h"
 #include "fieldbook/LectWildBlock.h"
@@ -37,6 +38,7 @@ private:
     void ReadSettings();
     void HeaderComments();
     void Header(std::string& last, const char* label, std::string_view value);
+    void Header(std::string& last, double& shown, const char* label, double value, const char* unit);
     void Warnings(int number);
     void ReadCodeBlock(int number);
     void ReadDataBlock(int number);
@@ -68,9 +70,10 @@ private:
     bool m_heightWarned = false;   // its differing instrument heights were said
     double m_reflector = kUndefined;
     std::string m_pendingCode; // the code of the last code block, for the next sighting
-    TextSet m_known;           // points given with their planimetry
+    NameSet m_known;           // points given with their planimetry
     bool m_started = false;
     std::string m_format, m_serial, m_type, m_date, m_dateTime, m_ppm, m_prism;
+    double m_ppmShown = 0.0, m_prismShown = 0.0; // the values of m_ppm and m_prism (NaN: none yet)
     std::bitset<1000> m_wordWarned, m_unitWarned;
 };
 

@@ -214,7 +214,7 @@ void CLectZeiss::BeginReading() {
 
 void CLectZeiss::ReadLine(std::string_view line, int number) {
     if (!line.empty() && line.front() == kSTX) line.remove_prefix(1);
-    line = line.substr(0, line.find_first_of(kEndControls));
+    line = line.substr(0, FindControl(line, kEndControls));
     if (HoldForPlaces(line, number)) return;
     ReadRecordLine(line, number);
 }

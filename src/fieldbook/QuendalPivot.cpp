@@ -14,12 +14,24 @@ namespace pyr {
 
 bool CQuendalPivot::Read(const std::string& path, CCarnet& result) {
     Print(fb::kCreating);
-    CCarnet records;
-    if (!m_importer || !Driver() || !m_importer(*Driver(), path, records, TextWindow(), Parent()))
-        return false;
-
+    if (!m_importer || !Driver()) return false;
+    // The records go to the Quendal-Pc file by batches as the book is read: neither the book nor its
+    // records are ever held whole beside the GéoBase made of them.
     const std::string temporary = TemporaryBesideCarnet(path);
-    if (!CDlgConfigQdl::Export(records, temporary, "w", {}, Parent())) return false;
+    PointExportJob job;
+    job.path = temporary;
+    job.parent = Parent();
+    ExportFile pivot(job);
+    pivot.Text() = CDlgConfigQdl::Text(CCarnet(), {}, true);
+    const auto drain = [&](CCarnet& records) {
+        pivot.Text() += CDlgConfigQdl::Text(records, {}, false);
+        pivot.Flush();
+        records.RemoveAll();
+    };
+    CCarnet records;
+    if (!m_importer(*Driver(), path, records, TextWindow(), Parent(), drain)) return false;
+    drain(records);
+    if (!pivot.Commit()) return false;
 
     CQuendalReader quendal;
     quendal.SetChoices(Choices());

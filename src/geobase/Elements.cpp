@@ -16,6 +16,25 @@ void CElement::setMat(std::string mat) {
     m_mat = std::move(mat);
 }
 
+const std::string& CElement::NoText() {
+    static const std::string none;
+    return none;
+}
+
+void CElement::setSym(std::string sym) {
+    if (!m_more && sym.empty()) return;
+    if (!m_more) m_more = std::make_unique<More>();
+    m_more->sym = std::move(sym);
+    if (m_more->sym.empty() && m_more->par.empty()) m_more.reset();
+}
+
+void CElement::setPar(std::string par) {
+    if (!m_more && par.empty()) return;
+    if (!m_more) m_more = std::make_unique<More>();
+    m_more->par = std::move(par);
+    if (m_more->sym.empty() && m_more->par.empty()) m_more.reset();
+}
+
 double CVisee::dh() const {
     if (IsUndefined(m_av) || IsUndefined(m_di)) return kUndefined;
     return m_di * SinGrads(m_av);

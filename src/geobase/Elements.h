@@ -26,11 +26,11 @@ public:
     static void operator delete(void* memory, std::size_t size) noexcept { ElementPool::Free(memory, size); }
 
     const std::string& mat() const { return m_mat; }
-    const std::string& sym() const { return m_sym; }
-    const std::string& par() const { return m_par; }
+    const std::string& sym() const { return m_more ? m_more->sym : NoText(); }
+    const std::string& par() const { return m_more ? m_more->par : NoText(); }
     void setMat(std::string mat);
-    void setSym(std::string sym) { m_sym = std::move(sym); }
-    void setPar(std::string par) { m_par = std::move(par); }
+    void setSym(std::string sym);
+    void setPar(std::string par);
 
     // Counts the changes of identifier of the elements that stand in a store, so that a store's index
     // knows it must be rebuilt even when an element was renamed through a pointer.
@@ -38,22 +38,31 @@ public:
 
 protected:
     CElement() = default;
-    explicit CElement(std::string mat, std::string sym = {}) : m_mat(std::move(mat)), m_sym(std::move(sym)) {}
+    explicit CElement(std::string mat, std::string sym = {}) : m_mat(std::move(mat)) {
+        setSym(std::move(sym));
+    }
     // A copy is not in a store, whatever the original.
-    CElement(const CElement& other) : m_mat(other.m_mat), m_sym(other.m_sym), m_par(other.m_par) {}
+    CElement(const CElement& other)
+        : m_mat(other.m_mat), m_more(other.m_more ? new More(*other.m_more) : nullptr) {}
     CElement& operator=(const CElement& other) {
         setMat(other.m_mat);
-        m_sym = other.m_sym;
-        m_par = other.m_par;
+        setSym(other.sym());
+        setPar(other.par());
         return *this;
     }
 
 private:
     friend class CCarnet;
+    static const std::string& NoText();
 
+    // The code and the parameters, which most sightings of a big job have not: kept apart, so that an
+    // element without them is smaller by 56 bytes (a million sightings by 56 MB).
+    struct More {
+        std::string sym;
+        std::string par;
+    };
     std::string m_mat;
-    std::string m_sym;
-    std::string m_par;
+    std::unique_ptr<More> m_more;
     bool m_inStore = false;
     static inline std::uint64_t s_identifierChanges = 0;
 };

@@ -1,5 +1,6 @@
 #include "core/Files.h"
 #include "core/Lines.h"
+#include "core/Strings.h"
 #include "core/TextEncoding.h"
 
 #include <gtest/gtest.h>
@@ -35,6 +36,9 @@ TEST(TextEncoding, PaddingCountsCharactersNotBytes) {
     EXPECT_EQ(Utf8Length("Point levé près de l'église, côté nord \xF0\x9F\x93\x90 ÀÉÈ"), 44u);
     EXPECT_EQ(Utf8Length("1234567é"), 8u);
     EXPECT_EQ(Utf8Length(""), 0u);
+    EXPECT_EQ(FindNonAscii("abcdefghijklmnopé"), 16u);
+    EXPECT_EQ(FindNonAscii("abcé"), 3u);
+    EXPECT_TRUE(IsAscii("seulement de l'ASCII, plus de huit octets"));
     EXPECT_EQ(PadRight("Référence", 12), "Référence   ");
     EXPECT_EQ(PadRight("Station", 3), "Station");
 }
@@ -57,4 +61,12 @@ TEST(Files, ExtensionsAreReplacedInTheFileNameOnly) {
     EXPECT_EQ(ReplaceExtension("/chantiers/v1.2/job", "tmp"), "/chantiers/v1.2/job.tmp");
     EXPECT_EQ(ReplaceExtension("C:\\Releves\\job.gsi", "geo"), "C:\\Releves\\job.geo");
     EXPECT_EQ(SystemErrorText(2), "fichier ou dossier inexistant");
+}
+
+TEST(FindControl, FindsTheFirstControlOfTheSetPastOtherControlsAndBlanks) {
+    const std::string_view ends{"\x03\x04\x1a", 3};
+    EXPECT_EQ(FindControl("pas de fin de transmission\t\r\n", ends), std::string_view::npos);
+    EXPECT_EQ(FindControl("\t\t\t\t\t\t\t\t\t\ttexte\x1a", ends), 15u);
+    EXPECT_EQ(FindControl("110001+0000000000000001 \x03 suite\x04", ends), 24u);
+    EXPECT_EQ(FindControl("", ends), std::string_view::npos);
 }

@@ -392,7 +392,7 @@ TEST_F(Conversion, ADelimitedFieldBookIsReadThroughAQuendalFile) {
     WriteBytes(dir / "points.txt", "PT;P1;10;20;30\nCD;EXR 0.15\nPT;P2;11;21\n");
     // The importer hands the records, as the delimited layout would read them.
     RecordImporter importer = [&](const CParamDriver& layout, const std::string& carnet, CCarnet& records,
-                                  CPyrTxtWnd*, ui::FrontEnd*) {
+                                  CPyrTxtWnd*, ui::FrontEnd*, const RecordDrain&) {
         EXPECT_EQ(layout.Layout().typePoint, "PT");
         EXPECT_EQ(carnet, dir / "points.txt");
         records.Add(std::make_unique<CPointGen>("P1", 10.0, 20.0, 30.0), kKindPoint);
