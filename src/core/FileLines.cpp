@@ -60,9 +60,6 @@ bool FileLines::Open(const std::string& path) {
     }
     m_regular = S_ISREG(info.st_mode);
     m_size = m_regular ? static_cast<std::uint64_t>(info.st_size) : 0;
-#ifdef POSIX_FADV_SEQUENTIAL
-    if (m_regular) posix_fadvise(m_fd, 0, 0, POSIX_FADV_SEQUENTIAL);
-#endif
     return true;
 }
 

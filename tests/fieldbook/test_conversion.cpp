@@ -423,3 +423,28 @@ TEST_F(Conversion, ADelimitedFieldBookIsReadThroughAQuendalFile) {
               1);
     EXPECT_EQ(frontEnd.lines.back(), " ... terminée : 3 lignes écrites.");
 }
+
+// The records go to the Quendal-Pc file by batches as they are read: an import that stops after a batch
+// was written leaves no file behind and adds nothing to the GéoBase.
+TEST_F(Conversion, AnImportStoppedHalfwayLeavesNoQuendalFileAndAddsNothing) {
+    fs::copy_file(std::string(PYR_SOURCE_DIR) + "/data/Config/Param_Export.sep",
+                  install + "Config/Param_Export.sep");
+    WriteBytes(dir / "points.txt", "PT;P1;10;20;30\n");
+    bool drained = false;
+    RecordImporter importer = [&](const CParamDriver&, const std::string&, CCarnet& records, CPyrTxtWnd*,
+                                  ui::FrontEnd*, const RecordDrain& drain) {
+        records.Add(std::make_unique<CPointGen>("P1", 10.0, 20.0, 30.0), kKindPoint);
+        drain(records);
+        drained = records.IsEmpty() && fs::exists(dir / "points.tmp"); // the batch went to the file
+        return false; // a file that could not be read to its end
+    };
+    auto converter = Make(FieldBookFormat::Separateur);
+    converter->makeReader = [&] { return std::make_unique<CQuendalPivot>(importer); };
+    frontEnd.dialogArguments = {dir / "points.txt"};
+    CCarnet target;
+    EXPECT_NE(RunConversion(*converter, &target), DialogResult::Ok);
+    EXPECT_TRUE(drained);
+    EXPECT_TRUE(target.IsEmpty());
+    for (const auto& entry : fs::directory_iterator(dir.Root()))
+        EXPECT_EQ(entry.path().string().find(".tmp"), std::string::npos) << entry.path();
+}
