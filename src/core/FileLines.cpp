@@ -2,9 +2,11 @@
 
 #include "core/TextEncoding.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <fcntl.h>
+#include <future>
 #include <memory>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -93,49 +95,32 @@ bool FileLines::ForEach(const std::function<void(const Line&)>& each,
         return false;
     }
     enum class Encoding { Ascii, Utf8, Windows1252 } encoding = Encoding::Ascii;
-    // What cannot be read ahead (a pipe) is read whole before its lines are cut.
-    std::size_t capacity = m_regular ? m_chunkBytes : std::size_t{1} << 20;
-    std::unique_ptr<char[]> buffer(new char[capacity]);
-    std::size_t filled = 0;  // bytes in the buffer
-    std::size_t scanned = 0; // bytes of the buffer known to be ASCII
-    std::uint64_t base = 0;  // the offset in the file of the buffer's first byte
-    bool first = true, ended = false;
+    std::size_t scanned = 0; // bytes of the text known to be ASCII, from its origin
+    std::uint64_t base = 0;  // the offset in the file of the text's origin
+    bool first = true;
     std::string converted;
     Line line;
-    while (!ended) {
-        if (filled == capacity) {
-            // A line longer than the buffer, or a pipe read whole: the buffer grows.
-            std::unique_ptr<char[]> larger(new char[capacity * 2]);
-            std::memcpy(larger.get(), buffer.get(), filled);
-            buffer = std::move(larger);
-            capacity *= 2;
-        }
-        const ssize_t n = ReadFully(m_fd, buffer.get() + filled, capacity - filled);
-        if (n < 0) return false;
-        filled += static_cast<std::size_t>(n);
-        ended = filled < capacity;
-        // The byte-order mark is looked for in three whole bytes.
-        if ((!m_regular || (first && filled < 3)) && !ended) continue;
-        std::size_t start = 0;
+    // Cuts the whole lines of `text` (at `base` in the file; all of the file when `ended`), from `from`;
+    // returns how many bytes were used, the rest being the start of a line that goes on in the next chunk.
+    const auto cut = [&](std::string_view text, std::size_t from, bool ended) -> std::size_t {
         if (first) {
             first = false;
-            if (filled >= 3 && std::memcmp(buffer.get(), "\xEF\xBB\xBF", 3) == 0) start = scanned = 3;
+            if (text.starts_with("\xEF\xBB\xBF")) from = scanned = 3;
         }
         if (encoding == Encoding::Ascii) {
-            const std::size_t other =
-                FindNonAscii(std::string_view(buffer.get() + scanned, filled - scanned));
-            scanned = other == std::string_view::npos ? filled : scanned + other;
-            if (scanned < filled) {
-                const std::string_view rest(buffer.get() + scanned, filled - scanned);
-                encoding = (ended ? IsValidUtf8(rest) : RestIsValidUtf8(base + filled, rest))
+            const std::size_t other = FindNonAscii(text.substr(scanned));
+            scanned = other == std::string_view::npos ? text.size() : scanned + other;
+            if (scanned < text.size()) {
+                const std::string_view rest = text.substr(scanned);
+                encoding = (ended ? IsValidUtf8(rest) : RestIsValidUtf8(base + text.size(), rest))
                                ? Encoding::Utf8
                                : Encoding::Windows1252;
                 if (encoding == Encoding::Windows1252 && windows1252) windows1252();
             }
         }
-        // Every whole line of the buffer; a CR at its very end waits for the next byte, which may be an LF.
-        const char* const end = buffer.get() + filled;
-        const char* p = buffer.get() + start;
+        // Every whole line; a CR at the very end waits for the next byte, which may be an LF.
+        const char* const end = text.data() + text.size();
+        const char* p = text.data() + from;
         while (p < end) {
             const char* lineEnd = FindLineEnd(p, end);
             const char* next = nullptr;
@@ -156,19 +141,81 @@ bool FileLines::ForEach(const std::function<void(const Line&)>& each,
                 line.text = converted;
             }
             ++line.number;
-            line.end = base + static_cast<std::uint64_t>(next - buffer.get());
+            line.end = base + static_cast<std::uint64_t>(next - text.data());
             line.unterminated = lineEnd == end;
             each(line);
             p = next;
         }
-        // What is left, the beginning of a line, goes to the front of the buffer.
-        const auto used = static_cast<std::size_t>(p - buffer.get());
-        std::memmove(buffer.get(), p, filled - used);
-        filled -= used;
+        const auto used = static_cast<std::size_t>(p - text.data());
         scanned = scanned > used ? scanned - used : 0;
         base += used;
+        return used;
+    };
+
+    if (!m_regular) {
+        // What cannot be read ahead (a pipe) is read whole before its lines are cut.
+        std::string text;
+        char block[1 << 16];
+        for (ssize_t n; (n = ReadFully(m_fd, block, sizeof block)) != 0;) {
+            if (n < 0) return false;
+            text.append(block, static_cast<std::size_t>(n));
+        }
+        cut(text, 0, true);
+        return true;
     }
-    return true;
+
+    // Two buffers: while the lines of one are cut, the next chunk is read into the other by a second
+    // thread. Each keeps, before its chunk, room for the start of a line that the previous chunk left.
+    const std::size_t chunk = m_chunkBytes;
+    std::size_t room = std::max<std::size_t>(chunk / 16, 16); // grown for a longer line
+    std::unique_ptr<char[]> current(new char[room + chunk]);
+    std::unique_ptr<char[]> ahead(new char[room + chunk]);
+    const auto readAt = [fd = m_fd, chunk](char* into, std::uint64_t offset) -> ssize_t {
+        std::size_t done = 0;
+        while (done < chunk) {
+            const ssize_t n = pread(fd, into + done, chunk - done, static_cast<off_t>(offset + done));
+            if (n < 0 && errno == EINTR) continue;
+            if (n < 0) return -static_cast<ssize_t>(errno != 0 ? errno : EIO); // errno is the thread's own
+            if (n == 0) break;
+            done += static_cast<std::size_t>(n);
+        }
+        return static_cast<ssize_t>(done);
+    };
+    std::uint64_t offset = 0; // of the next chunk
+    std::size_t left = 0;     // bytes of a line begun, at the end of the room of `current`
+    ssize_t n = readAt(current.get() + room, offset);
+    while (true) {
+        if (n < 0) {
+            errno = static_cast<int>(-n);
+            return false;
+        }
+        offset += static_cast<std::uint64_t>(n);
+        // A short read is the end of the file (a file that grows meanwhile is read to where it was).
+        const bool ended = static_cast<std::size_t>(n) < chunk;
+        std::future<ssize_t> next;
+        if (!ended) next = std::async(std::launch::async, readAt, ahead.get() + room, offset);
+        char* const origin = current.get() + room - left;
+        const std::size_t size = left + static_cast<std::size_t>(n);
+        // The byte-order mark is looked for in three whole bytes.
+        const std::size_t used = (first && size < 3 && !ended) ? 0 : cut({origin, size}, 0, ended);
+        if (ended) return true;
+        n = next.get();
+        left = size - used;
+        if (left > room) {
+            // A line longer than the room: the buffers grow, the chunk just read going over.
+            const std::size_t wider = 2 * left;
+            std::unique_ptr<char[]> larger(new char[wider + chunk]);
+            std::memcpy(larger.get() + wider, ahead.get() + room,
+                        static_cast<std::size_t>(std::max<ssize_t>(n, 0)));
+            ahead = std::move(larger);
+            std::memcpy(ahead.get() + wider - left, origin + used, left);
+            room = wider;
+            current.reset(new char[room + chunk]);
+        } else {
+            std::memcpy(ahead.get() + room - left, origin + used, left);
+        }
+        std::swap(current, ahead);
+    }
 }
 
 } // namespace pyr

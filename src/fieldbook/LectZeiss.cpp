@@ -45,7 +45,7 @@ enum class Unit { None, Metres, Feet, Grads, Degrees, Dms, Mils, Percent, Unknow
 Unit UnitOf(std::string_view unit) {
     if (unit.empty()) return Unit::None;
     struct Name {
-        const char* word;
+        std::string_view word; // its length known when compiled: compared to every value of a line
         Unit unit;
     };
     static constexpr Name kNames[] = {{"m", Unit::Metres},  {"ft", Unit::Feet},  {"gon", Unit::Grads},
@@ -104,7 +104,7 @@ enum class Kind {
 
 Kind KindOf(std::string_view type) {
     struct Name {
-        const char* word;
+        std::string_view word; // its length known when compiled: compared to every value of a line
         Kind kind;
     };
     static constexpr Name kNames[] = {{"SD", Kind::Slope},
@@ -290,8 +290,9 @@ bool CLectZeiss::Split(std::string_view line, int number) {
         if (!cut || width == 0) return cut;
         // Counted in characters: an accented letter of a Windows-1252 field book is one column.
         const int length = static_cast<int>(Utf8Length(line));
+        if (length == width) return true;
         const int filled = static_cast<int>(Utf8Length(line.substr(0, line.find_last_not_of(' ') + 1)));
-        if (length != width && (length < width || filled > width)) CheckLength(number, line, width);
+        if (length < width || filled > width) CheckLength(number, line, width);
         return true;
     };
     bool cut = false;
@@ -341,16 +342,15 @@ bool CLectZeiss::ReadValues(int number, Values& values) {
             continue;
         }
         if (value.number.empty()) continue; // a type without its value: nothing measured
-        const std::string shown = WithUnit(value.number, value.unit);
         switch (kind) {
         case Kind::Scale:
-            Header(m_scale, fb::kLabelScale, shown);
+            Header(m_scale, fb::kLabelScale, WithUnit(value.number, value.unit));
             continue;
         case Kind::Temperature:
-            Header(m_temperature, fb::kLabelTemperature, shown);
+            Header(m_temperature, fb::kLabelTemperature, WithUnit(value.number, value.unit));
             continue;
         case Kind::Pressure:
-            Header(m_pressure, text::kLabelPressure, shown);
+            Header(m_pressure, text::kLabelPressure, WithUnit(value.number, value.unit));
             continue;
         default:
             break;

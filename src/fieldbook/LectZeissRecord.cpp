@@ -26,10 +26,7 @@ constexpr std::size_t kRecBlocks[] = {36, 51, 66};
 // an accented letter takes two bytes, and no field may end in the middle of one.
 class Line {
 public:
-    explicit Line(std::string_view text) : m_text(text) {
-        for (char c : text)
-            if (static_cast<unsigned char>(c) >= 0x80) m_ascii = false;
-    }
+    explicit Line(std::string_view text) : m_text(text), m_ascii(IsAscii(text)) {}
     std::size_t Size() const { return m_ascii ? m_text.size() : Utf8Length(m_text); }
     // The part from column `first` (from 0), `count` characters at most, cut where the line ends.
     std::string_view Columns(std::size_t first, std::size_t count) const {
@@ -54,7 +51,7 @@ private:
         return at;
     }
     std::string_view m_text;
-    bool m_ascii = true;
+    bool m_ascii;
 };
 
 std::string_view Columns(std::string_view line, std::size_t first, std::size_t count) {

@@ -9,6 +9,7 @@
 #include <cerrno>
 #include <gtest/gtest.h>
 #include <string>
+#include <unistd.h>
 #include <vector>
 
 using namespace pyr;
@@ -93,6 +94,21 @@ TEST(FileLines, EveryChunkSizeGivesTheLinesOfTheWholeText) {
             EXPECT_EQ(read.windows1252, whole.windows1252);
         }
     }
+}
+
+TEST(FileLines, APipeIsReadWholeAndCutTheSameWay) {
+    const std::string text = "COMMENTAIRE;Lev\xE9\r\nPOINT;1;2;3\rfin";
+    int ends[2];
+    ASSERT_EQ(pipe(ends), 0);
+    ASSERT_EQ(write(ends[1], text.data(), text.size()), static_cast<ssize_t>(text.size()));
+    close(ends[1]);
+    const Seen read = ReadByChunks("/proc/self/fd/" + std::to_string(ends[0]), 4);
+    close(ends[0]);
+    const Seen whole = ReadWhole(text);
+    EXPECT_EQ(read.lines, whole.lines);
+    EXPECT_EQ(read.ends, whole.ends);
+    EXPECT_TRUE(read.unterminated);
+    EXPECT_EQ(read.windows1252, 1);
 }
 
 TEST(FileLines, AFolderOrAMissingFileIsNotOpened) {
