@@ -24,13 +24,16 @@ std::string AngleText(double grads) {
     return FormatFixed(grads, CStation::DeciAng());
 }
 
-void CheckReference(const StationPlace& station, const V0Reference& ref, double zenith, double hp,
+// The sighting's sine and cosine of its zenith angle serve both the height difference and its tolerance.
+void CheckReference(const StationPlace& station, const V0Reference& ref, const ReducedSighting& sighting,
                     const V0Settings& settings, std::vector<std::string>& warnings) {
     const double dh = ref.measuredDistance;
-    if (IsKnown(station.z) && IsKnown(ref.z) && IsKnown(station.hi) && IsKnown(hp)) {
+    if (IsKnown(station.z) && IsKnown(ref.z) && IsKnown(station.hi) && IsKnown(sighting.hp)) {
         const double computed = ref.z - station.z;
-        const double measured = TrigonometricHeightDifference(dh, zenith, station.hi, hp);
-        if (std::fabs(computed - measured) > settings.tolerances.HeightDifference(dh, zenith, kHeightTermsV0))
+        const double measured =
+            TrigonometricHeightDifference(dh, sighting.sinAv, sighting.cosAv, station.hi, sighting.hp);
+        if (std::fabs(computed - measured) >
+            settings.tolerances.HeightDifference(dh, sighting.sinAv, sighting.cosAv, kHeightTermsV0))
             warnings.push_back(Sprintf(v0::kMsgHeightOutOfTolerance, ref.mat.c_str(), computed, measured,
                                        computed - measured));
     }
@@ -73,21 +76,9 @@ bool PointPlaces::Of(int index, double& x, double& y, double& z) {
 }
 
 StationPlace PointPlaces::Station(int stationIndex) {
-    StationPlace station;
-    station.index = stationIndex;
-    station.name = m_carnet.matAt(stationIndex);
-    // Its reprise: the set-ups on the same point up to this one, among the elements of its identifier.
-    station.reprise = 0;
-    for (int i : m_carnet.SameMat(stationIndex)) {
-        if (m_carnet.GetType(i) == kKindStation) ++station.reprise;
-        if (i == stationIndex) break;
-    }
-    if (station.reprise == 0) station.reprise = 1;
-    Of(stationIndex, station.x, station.y, station.z);
-    station.hi = m_carnet.hiAt(stationIndex);
-    if (IsKnown(station.hi)) station.hi += m_carnet.findEV(stationIndex, -1);
-    station.v0 = m_carnet.v0At(stationIndex);
-    return station;
+    double x, y, z;
+    Of(stationIndex, x, y, z);
+    return StationPlaceAt(m_carnet, stationIndex, x, y, z);
 }
 
 std::vector<int> OfferedReferences(const CCarnet& carnet, int stationIndex) {
@@ -137,7 +128,7 @@ V0Reference PrepareReference(PointPlaces& places, const StationPlace& station, i
     // A distance and a zenith angle give the horizontal distance to check against the coordinates.
     if (IsKnown(reduced.dh)) {
         ref.measuredDistance = reduced.dh;
-        CheckReference(station, ref, reduced.av, reduced.hp, settings, warnings);
+        CheckReference(station, ref, reduced, settings, warnings);
     }
 
     if (IsKnown(reduced.ah))

@@ -33,11 +33,17 @@ bool PointPlace(const CCarnet& carnet, std::string_view mat, double& x, double& 
 }
 
 StationPlace StationPlaceAt(const CCarnet& carnet, int stationIndex) {
+    double x, y, z;
+    PointPlaceOf(carnet, stationIndex, x, y, z);
+    return StationPlaceAt(carnet, stationIndex, x, y, z);
+}
+
+StationPlace StationPlaceAt(const CCarnet& carnet, int stationIndex, double x, double y, double z) {
     StationPlace station;
     station.index = stationIndex;
     station.name = carnet.matAt(stationIndex);
     station.reprise = carnet.RepriseAt(stationIndex);
-    PointPlace(carnet, station.name, station.x, station.y, station.z);
+    station.x = x, station.y = y, station.z = z;
     station.hi = carnet.hiAt(stationIndex);
     if (IsKnown(station.hi)) station.hi += carnet.findEV(stationIndex, -1);
     station.v0 = carnet.v0At(stationIndex);
@@ -70,8 +76,9 @@ InstrumentOptions DefaultInstrument(std::string_view paramPath) {
 ReducedSighting ReduceSighting(const CCarnet& carnet, const StationPlace& station, int sighting,
                                const SightingReductionOptions& options) {
     ReducedSighting reduced;
-    const auto* visee = carnet.As<CVisee>(sighting);
-    if (!visee) return reduced;
+    // The store keeps each element under the kind of its class: a sighting's kind tells it is one.
+    if (!IsSightingKind(carnet.GetType(sighting))) return reduced;
+    const auto* visee = static_cast<const CVisee*>(carnet.GetAt(sighting));
     reduced.index = sighting;
     reduced.mat = visee->mat();
 
@@ -87,7 +94,8 @@ ReducedSighting ReduceSighting(const CCarnet& carnet, const StationPlace& statio
     reduced.ah = ah, reduced.av = av, reduced.di = di, reduced.hp = hp;
 
     if (di > 0.0 && IsKnown(av)) {
-        double dh = di * SinGrads(av);
+        SinCosGrads(av, reduced.sinAv, reduced.cosAv);
+        double dh = di * reduced.sinAv;
         if (dh > 0.0) {
             CorrectHorizontalDistance(dh, station.x, station.y, station.z, options.correction);
             reduced.dh = dh;
@@ -96,10 +104,14 @@ ReducedSighting ReduceSighting(const CCarnet& carnet, const StationPlace& statio
     return reduced;
 }
 
+double TrigonometricHeightDifference(double dh, double sinZ, double cosZ, double hi, double hp) {
+    return dh * cosZ / sinZ + hi - hp + CurvatureRefraction(dh);
+}
+
 double TrigonometricHeightDifference(double dh, double zenith, double hi, double hp) {
     double sinZ = 0.0, cosZ = 0.0;
     SinCosGrads(zenith, sinZ, cosZ);
-    return dh * cosZ / sinZ + hi - hp + CurvatureRefraction(dh);
+    return TrigonometricHeightDifference(dh, sinZ, cosZ, hi, hp);
 }
 
 } // namespace pyr

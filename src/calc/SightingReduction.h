@@ -35,6 +35,8 @@ struct StationPlace {
 
 // The station occurrence at that index, placed by the points of the GéoBase.
 StationPlace StationPlaceAt(const CCarnet& carnet, int stationIndex);
+// The same with the place of its point already found (as PointPlaceOf finds it, kept for many stations).
+StationPlace StationPlaceAt(const CCarnet& carnet, int stationIndex, double x, double y, double z);
 
 // The planimetry and altitude of a point, each from the first of its elements that holds it. False when
 // its planimetry is unknown (x and y are then kUndefined; z may still be known).
@@ -83,6 +85,10 @@ struct ReducedSighting {
     double av = kUndefined; // face left (< 200), with the collimation
     double di = kUndefined; // reduced slope distance, with the prism constant; not positive when unmeasured
     double dh = kUndefined; // di × sin(av) corrected for scale at the station, kUndefined without distance
+    // sin(av) and cos(av), for the height difference and its tolerance: known when di is positive and
+    // av known, that is whenever dh is known.
+    double sinAv = kUndefined;
+    double cosAv = kUndefined;
     bool faceRight = false; // it was read face right and turned
 };
 
@@ -96,5 +102,7 @@ ReducedSighting ReduceSighting(const CCarnet& carnet, const StationPlace& statio
 // The trigonometric height difference from the station's ground to the target's ground over a corrected
 // horizontal distance Dh and a zenith angle: Dh / tan(AV) + HI − HP + curvature and refraction.
 double TrigonometricHeightDifference(double dh, double zenith, double hi, double hp);
+// The same from the sine and cosine of the zenith angle (a reduced sighting's sinAv and cosAv).
+double TrigonometricHeightDifference(double dh, double sinZ, double cosZ, double hi, double hp);
 
 } // namespace pyr

@@ -29,12 +29,16 @@ double V0Tolerance(int referenceCount, double directionTolerance) {
     return std::sqrt((n - 1.0) / n) * directionTolerance;
 }
 
-double HeightDifferenceTolerance(double distance, double zenith, HeightToleranceTerms terms) {
+double HeightDifferenceTolerance(double distance, double sinZ, double cosZ, HeightToleranceTerms terms) {
     const double d = distance * 0.001;
-    const double s = SinGrads(zenith);
-    const double c = CosGrads(zenith);
-    return 0.01 * std::sqrt((d + 3.0) * (d + 3.0) * s * s + d * d * c * c * terms.c1 +
+    return 0.01 * std::sqrt((d + 3.0) * (d + 3.0) * sinZ * sinZ + d * d * cosZ * cosZ * terms.c1 +
                             d * d * d * d / terms.c2 + 4.0);
+}
+
+double HeightDifferenceTolerance(double distance, double zenith, HeightToleranceTerms terms) {
+    double s = 0.0, c = 0.0;
+    SinCosGrads(zenith, s, c);
+    return HeightDifferenceTolerance(distance, s, c, terms);
 }
 
 Tolerances Tolerances::FromOptions(std::string_view paramPath) {
@@ -65,6 +69,12 @@ double Tolerances::V0(int referenceCount) const {
 
 double Tolerances::HeightDifference(double distance, double zenith, HeightToleranceTerms terms) const {
     return mode == ToleranceMode::Custom ? customHeight : HeightDifferenceTolerance(distance, zenith, terms);
+}
+
+double Tolerances::HeightDifference(double distance, double sinZ, double cosZ,
+                                    HeightToleranceTerms terms) const {
+    return mode == ToleranceMode::Custom ? customHeight
+                                         : HeightDifferenceTolerance(distance, sinZ, cosZ, terms);
 }
 
 std::vector<std::string> Tolerances::Describe(HeightToleranceTerms terms) const {

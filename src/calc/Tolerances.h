@@ -40,6 +40,8 @@ double V0Tolerance(int referenceCount, double directionTolerance);
 // (grads): with d = D / 1000,
 // 0.01 x sqrt((d + 3)^2 sin^2 z + d^2 cos^2 z c1 + d^4 / c2 + 4) metres.
 double HeightDifferenceTolerance(double distance, double zenith, HeightToleranceTerms terms);
+// The same from the sine and cosine of z, when the sighting's reduction has them already.
+double HeightDifferenceTolerance(double distance, double sinZ, double cosZ, HeightToleranceTerms terms);
 
 // The tolerances as the options of section "Options_Tolerances" set them.
 struct Tolerances {
@@ -53,6 +55,7 @@ struct Tolerances {
     double Distance(double distance) const;
     double V0(int referenceCount) const;
     double HeightDifference(double distance, double zenith, HeightToleranceTerms terms) const;
+    double HeightDifference(double distance, double sinZ, double cosZ, HeightToleranceTerms terms) const;
 
     // The lines that describe them at the head of a listing.
     std::vector<std::string> Describe(HeightToleranceTerms terms) const;

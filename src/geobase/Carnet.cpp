@@ -466,13 +466,13 @@ bool CCarnet::extrStaRep(std::string_view text, std::string& name, int& reprise)
 
 int CCarnet::RepriseAt(int stationIndex) const {
     if (GetType(stationIndex) != kKindStation) return 0;
-    const std::vector<int>* list = Index().WithMat(matAt(stationIndex));
+    // The set-ups on the same point up to this one, among the elements of its identifier reached through
+    // the station's own rank, its name never read nor hashed.
     int rank = 0;
-    if (list)
-        for (int i : *list) {
-            if (m_kinds[static_cast<size_t>(i)] == kKindStation) ++rank;
-            if (i == stationIndex) return rank;
-        }
+    for (int i : SameMat(stationIndex)) {
+        if (m_kinds[static_cast<size_t>(i)] == kKindStation) ++rank;
+        if (i == stationIndex) return rank;
+    }
     return 1; // a station without a name is its own only reprise
 }
 

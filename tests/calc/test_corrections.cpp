@@ -129,6 +129,12 @@ TEST(Tolerances, TheModeOfTheOptionsChoosesTheFormulaOrTheCustomValues) {
             << c.file;
         EXPECT_NEAR(tolerances.HeightDifference(2000.0, 300.0, kHeightTermsPoints), c.heightAt2000, kTenthMm)
             << c.file;
+        // Given the sine and cosine of z, the same tolerance to the last bit, custom values included.
+        double s = 0.0, cz = 0.0;
+        SinCosGrads(123.4567, s, cz);
+        EXPECT_EQ(tolerances.HeightDifference(1234.5, s, cz, kHeightTermsV0),
+                  tolerances.HeightDifference(1234.5, 123.4567, kHeightTermsV0))
+            << c.file;
     }
 }
 

@@ -51,6 +51,9 @@ TEST(SightingReduction, InstrumentConstantsAreAddedOnlyWhenAskedAndBeforeTheFace
         EXPECT_NEAR(s.di, 150.03, 1e-9);
         EXPECT_NEAR(s.dh, 149.956117227, kTenthMm); // 150.03 × sin(98.002 gr)
         EXPECT_EQ(s.faceRight, i == 4);
+        // The sine and cosine carried are those of the zenith angle once corrected and turned.
+        EXPECT_EQ(s.sinAv, SinGrads(s.av));
+        EXPECT_EQ(s.cosAv, CosGrads(s.av));
     }
     EXPECT_NEAR(r.At(3).av, 98.0, 1e-12);
     EXPECT_NEAR(r.At(3).di, 150.0, 1e-12);

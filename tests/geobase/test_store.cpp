@@ -96,6 +96,12 @@ TEST(Store, ReprisesAreFoundByTheirNumber) {
     CCarnet c = SmallJob();
     EXPECT_EQ(c.findStaRep("S1", 2), 9);
     EXPECT_EQ(c.findStaRep("S1", 3), -1);
+    // The rank of a set-up among those on its point: the point and the sightings named S1 do not count.
+    for (auto [index, reprise] : {std::pair{3, 1}, {9, 2}, {6, 1}, {4, 0}, {1, 0}})
+        EXPECT_EQ(c.RepriseAt(index), reprise) << index;
+    EXPECT_EQ(c.StationDesignation(9), "S1(2)");
+    const int unnamed = c.Add(std::make_unique<CStation>("", 1.5), kKindStation);
+    EXPECT_EQ(c.RepriseAt(unnamed), 1);
 
     // "S1(2)", or a bare name for its first set-up; the reprise counts from 1.
     auto split = [](const char* text) {
