@@ -1,5 +1,6 @@
 // Reading and writing GéoBase files. A GéoBase is never half written (see core/SafeFile.h), never written
 // over a file that is not a GéoBase or that its owner protected, and the loader never drops a line.
+#include "core/FileLines.h"
 #include "core/Files.h"
 #include "core/Lines.h"
 #include "core/SafeFile.h"
@@ -21,6 +22,7 @@
 #include <fcntl.h>
 #include <functional>
 #include <mutex>
+#include <optional>
 #include <system_error>
 #include <thread>
 #include <unistd.h>
@@ -221,6 +223,25 @@ bool WriteStore(const ElementArray& elements, const std::vector<int>& kinds, boo
 
 } // namespace
 
+namespace {
+
+// After this many lines of a file, the count of its elements is guessed.
+constexpr int kLinesBeforeEstimate = 4096;
+
+// After `elements` were read from the first `bytesRead` bytes of a file of `fileBytes`, makes the memory of
+// the elements still to come ready in `preparation`, by another thread while the rest is read. The
+// elements of a big job take nearly a hundred bytes each; nine tenths of the guess is asked, so that what
+// is made ready is used.
+void PrepareForTheRest(std::optional<ElementPool::Preparation>& preparation, int elements,
+                       std::uint64_t bytesRead, std::uint64_t fileBytes) {
+    constexpr std::uint64_t kElementBytes = 96;
+    if (bytesRead == 0 || fileBytes <= bytesRead || elements <= 0) return;
+    const std::uint64_t rest = static_cast<std::uint64_t>(elements) * (fileBytes - bytesRead) / bytesRead;
+    if (rest > 0) preparation.emplace(static_cast<std::size_t>(rest * kElementBytes * 9 / 10));
+}
+
+} // namespace
+
 int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& configuration, int report,
                   ui::FrontEnd* parent) {
     RemoveAll();
@@ -230,32 +251,22 @@ int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& c
     m_knownPath.clear();
     m_knownForeign = false;
 
-    std::string bytes;
-    if (!ReadWholeFile(path, bytes)) {
-        std::string why = SystemErrorText(errno);
-        Tell(parent, Sprintf(msg::kCannotOpen, path.c_str(), why.c_str()), ui::kIconWarning);
-        return 0;
-    }
-    std::string_view text(bytes);
-    if (text.substr(0, 3) == "\xEF\xBB\xBF") text.remove_prefix(3);
-    if (!IsValidUtf8(text)) {
-        bytes = Windows1252ToUtf8(text);
-        text = bytes;
-        if (txt) txt->Print(msg::kReadAsWindows1252, path.c_str());
-    }
-
-    const size_t lineCount = static_cast<size_t>(std::count(text.begin(), text.end(), '\n')) + 1;
-    m_elements.reserve(lineCount);
-    m_kinds.reserve(lineCount);
-    // The memory of the elements made ready while the lines are read: most elements take a little more
-    // than this, so that what is made ready is used.
-    constexpr size_t kElementBytes = 128;
-    ElementPool::Preparation preparation(lineCount * kElementBytes);
-
+    // The file is read by chunks, never whole, and its lines become elements as they come.
+    FileLines file;
+    std::optional<ElementPool::Preparation> preparation;
     bool lenient = false;
     std::string error;
     GeoFileCensus census;
-    ForEachLine(text, [&](std::string_view line, int number) {
+    const auto readLine = [&](const FileLines::Line& read) {
+        const std::string_view line = read.text;
+        const int number = read.number;
+        if (number == kLinesBeforeEstimate) {
+            PrepareForTheRest(preparation, GetSize(), read.end, file.Size());
+            const auto more =
+                static_cast<std::size_t>(GetSize()) * file.Size() / std::max<std::uint64_t>(read.end, 1);
+            m_elements.reserve(more);
+            m_kinds.reserve(more);
+        }
         if (int version = GeoHeaderVersion(line)) {
             if (number == 1 && version > kGeoFormatVersion) {
                 lenient = true;
@@ -276,7 +287,15 @@ int CCarnet::Load(CPyrTxtWnd* txt, const std::string& path, const std::string& c
         // Kept word for word, so that the next save writes it back.
         AddChecked(std::make_unique<CComment>(std::string(line)), kKindComment);
         if (txt) txt->Print(msg::kLineKept, number, error.c_str());
-    });
+    };
+    if (!file.Open(path) || !file.ForEach(readLine, [&] {
+            if (txt) txt->Print(msg::kReadAsWindows1252, path.c_str());
+        })) {
+        const std::string why = SystemErrorText(errno);
+        RemoveAll();
+        Tell(parent, Sprintf(msg::kCannotOpen, path.c_str(), why.c_str()), ui::kIconWarning);
+        return 0;
+    }
     m_knownPath = path;
     m_knownForeign = census.IsForeign();
     if (txt && m_knownForeign) txt->Print(msg::kOpenedForeign, path.c_str(), census.unreadable, census.lines);
