@@ -1,5 +1,6 @@
 #include "FileLines.h"
 
+#include "core/Files.h"
 #include "core/TextEncoding.h"
 
 #include <algorithm>
@@ -15,19 +16,6 @@
 namespace pyr {
 
 namespace {
-
-// Reads up to `size` bytes; fewer only at the end of the file or on an error.
-ssize_t ReadFully(int fd, char* data, std::size_t size) {
-    std::size_t done = 0;
-    while (done < size) {
-        const ssize_t n = read(fd, data + done, size - done);
-        if (n < 0 && errno == EINTR) continue;
-        if (n < 0) return -1;
-        if (n == 0) break;
-        done += static_cast<std::size_t>(n);
-    }
-    return static_cast<ssize_t>(done);
-}
 
 // How many bytes at the end of `bytes` begin a UTF-8 sequence that goes on beyond it (0 to 3).
 std::size_t UnfinishedSequence(std::string_view bytes) {

@@ -33,7 +33,8 @@ void PrepareForWriting(char* data, size_t size) {
 #endif
 }
 
-// Reads up to `size` bytes; fewer only at the end of the file or on an error.
+} // namespace
+
 ssize_t ReadFully(int fd, char* data, size_t size) {
     size_t done = 0;
     while (done < size) {
@@ -45,8 +46,6 @@ ssize_t ReadFully(int fd, char* data, size_t size) {
     }
     return static_cast<ssize_t>(done);
 }
-
-} // namespace
 
 bool ReadWholeFile(const std::string& path, std::string& bytes) {
     int fd = open(path.c_str(), O_RDONLY | O_CLOEXEC);

@@ -1,8 +1,14 @@
 #pragma once
 
+#include <cstddef>
 #include <string>
+#include <sys/types.h>
 
 namespace pyr {
+
+// Reads up to `size` bytes from `fd`, going on after an interrupted read; fewer only at the end of the
+// file or on an error (-1, errno telling why).
+ssize_t ReadFully(int fd, char* data, std::size_t size);
 
 // Reads the whole file into `bytes`. Returns false, with errno telling why, when it cannot be read.
 bool ReadWholeFile(const std::string& path, std::string& bytes);
