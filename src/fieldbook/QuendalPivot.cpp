@@ -47,6 +47,8 @@ public:
                 bytes.remove_prefix(static_cast<std::size_t>(n));
         }
     }
+    // 0 while every byte was written, or the system error that stopped the writing.
+    int Error() const { return m_error; }
     // 0 once the whole file is written, or the system error that stopped it.
     int Close() {
         if (m_fd >= 0 && close(m_fd) != 0 && m_error == 0) m_error = errno;
@@ -70,7 +72,13 @@ bool CQuendalPivot::Read(const std::string& path, CCarnet& result) {
     // records are ever held whole beside the GéoBase made of them.
     const std::string temporary = TemporaryBesideCarnet(path);
     PivotFile pivot(temporary);
+    const auto cannotWrite = [&](int error) {
+        (Parent() ? *Parent() : ui::ApplicationFrontEnd()).ReportFailure(FileWriteFailure(temporary, error));
+        return false;
+    };
+    // A file that cannot be made is said before the book is read for nothing.
     pivot.Write(CDlgConfigQdl::Text(CCarnet(), {}, true));
+    if (pivot.Error() != 0) return cannotWrite(pivot.Error());
     const auto drain = [&](CCarnet& records) {
         pivot.Write(CDlgConfigQdl::Text(records, {}, false));
         records.RemoveAll();
@@ -78,10 +86,7 @@ bool CQuendalPivot::Read(const std::string& path, CCarnet& result) {
     CCarnet records;
     if (!m_importer(*Driver(), path, records, TextWindow(), Parent(), drain)) return false;
     drain(records);
-    if (const int error = pivot.Close(); error != 0) {
-        (Parent() ? *Parent() : ui::ApplicationFrontEnd()).ReportFailure(FileWriteFailure(temporary, error));
-        return false;
-    }
+    if (const int error = pivot.Close(); error != 0) return cannotWrite(error);
 
     CQuendalReader quendal;
     quendal.SetChoices(Choices());
